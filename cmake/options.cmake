@@ -1,0 +1,10 @@
+# What every target of this project is compiled and linked with.
+add_library(dpxlsx_options INTERFACE)
+target_compile_options(dpxlsx_options INTERFACE
+    -Wall -Wextra -Wpedantic -Wshadow -Wconversion
+    $<$<BOOL:${DPXLSX_WERROR}>:-Werror>)
+if(DPXLSX_SANITIZE)
+    target_compile_options(dpxlsx_options INTERFACE
+        -fsanitize=${DPXLSX_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+    target_link_options(dpxlsx_options INTERFACE -fsanitize=${DPXLSX_SANITIZE})
+endif()

@@ -1,0 +1,19 @@
+#pragma once
+
+#include "model/host/export.h"
+
+namespace dp {
+
+// An object whose life is counted. Counts are plain integers that start at 0: whoever receives the
+// object takes the first reference with AddRef. Not safe from two threads.
+class DPXLSX_API IResource {
+  public:
+    virtual ~IResource() = default;
+
+    // Takes a reference; returns the new count.
+    virtual unsigned AddRef() = 0;
+    // Gives a reference back; the object is deleted when the count comes to 0.
+    virtual void Release() = 0;
+};
+
+}  // namespace dp
