@@ -1,0 +1,55 @@
+#pragma once
+
+#include <string>
+
+#include <unicode/uversion.h>
+
+#include "model/host/export.h"
+#include "model/host/i_variable_format.h"
+#include "model/string.h"
+
+U_NAMESPACE_BEGIN
+class DateFormat;
+U_NAMESPACE_END
+
+namespace dp {
+
+// Display of serial day numbers by an ICU date pattern, in US English and without time zone. All
+// instances share the buffers in which they render: calls must not run at the same time.
+class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
+  public:
+    // ICU's medium date style.
+    DateTimeVariableFormat();
+    // `pattern` is UTF-8; the empty pattern stands for ICU's medium date style.
+    explicit DateTimeVariableFormat(const std::string& pattern);
+    DateTimeVariableFormat(const DateTimeVariableFormat&) = delete;
+    DateTimeVariableFormat& operator=(const DateTimeVariableFormat&) = delete;
+    ~DateTimeVariableFormat() override;
+
+    FormatType GetType() const override;
+    bool GetAuto() const override;
+    // A new string. The days 60 (which never was) and 61 both show as 1 March 1900.
+    IString* FormatValue(double value, bool fullPrecision) const override;
+    void GetDateTimeParameters(unsigned* p1, unsigned* p2, unsigned* p3,
+                               unsigned* p4) const override;
+    void SetDateTimeParameters(const IDateTimeVariableFormat* other) override;
+    const IString* GetFormatString() const override;
+
+    // Neutral answers: conversions are the business of the host's own implementation.
+    bool ConvertToDatetime(const IString* format, IString* text, double& value) const override;
+    double GenerateTime(int year, int month, int day, int hour, int minute, int second,
+                        int millisecond) const override;
+    void SetGlobalDateTimeFormat(IString* format) override;
+    IString* CovertVextralDateTimeToString(double value) const override;
+    bool ValidVextralTime(double value) const override;
+    double GetCurrentVextralTime() const override;
+
+    bool autoFormat = true;
+    unsigned dateTimeParameters[4] = {};
+    String pattern;
+    // Owned; null until the first value is rendered. Making one costs a hundred times what the
+    // rest of the object does, and most formats never render.
+    mutable icu::DateFormat* formatter = nullptr;
+};
+
+}  // namespace dp

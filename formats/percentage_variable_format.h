@@ -1,0 +1,36 @@
+#pragma once
+
+#include "model/host/export.h"
+#include "model/host/i_variable_format.h"
+
+namespace dp {
+
+// Display of numbers as percentages: 0.1234 as "12.34%". Immutable once its maker has set the
+// fields; rendering may run on any thread.
+class DPXLSX_API PercentageVariableFormat : public IPercentageVariableFormat {
+  public:
+    PercentageVariableFormat();
+    ~PercentageVariableFormat() override;
+
+    FormatType GetType() const override;
+    bool GetAuto() const override;
+    // The percentage in fixed notation, or with `significantDigits` digits when full precision is
+    // asked for or shown always; a new string.
+    IString* FormatValue(double value, bool fullPrecision) const override;
+    NumericSubtype GetNumericSubtype() const override;
+    void GetDecimalPlaces(int* places, int* digits) const override;
+    void GetValueRange(double* low, double* high) const override;
+    bool ShowFullPrecision() const override;
+    int GetDecimalPlaces() const override;
+
+    bool autoFormat = false;
+    int decimalPlaces = 0;
+    int significantDigits = 0;
+    double rangeLow = 0;
+    double rangeHigh = 0;
+    int percentDecimalPlaces = 0;
+    bool showsFullPrecision = false;
+    NumericSubtype numericSubtype = NumericSubtype::Percentage;
+};
+
+}  // namespace dp

@@ -1,0 +1,72 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "formats/style.h"
+#include "model/host/export.h"
+#include "model/host/i_variable_format.h"
+
+// What the readers do with their style tables: classify the number-format codes, replace names and
+// locale-dependent codes by concrete ones, and build the format objects of columns.
+namespace dp {
+
+// True for the date, time and date-time types.
+bool isDateTimeType(EXCEL_FORMAT_TYPE type) noexcept;
+
+// Sets the type of one style: a date-time type, whose code is then replaced by its cleaned first
+// section, or EXCEL_FORMAT_NONE.
+void setFormatType(xStyle& style);
+
+// The codes that stand for the descriptive format names that do not imply one code.
+struct NamedFormats {
+    std::string_view shortDate;
+    std::string_view percent;
+    std::string_view currency;
+    std::string_view scientific;
+    std::string_view fixed;
+};
+
+// Replaces descriptive names ("Short Date", "Percent" ...) in the table by code and type.
+void replaceDescriptiveNames(std::vector<xStyle>& styles, const NamedFormats& formats);
+
+// The parts of a default date-time code, to be combined.
+enum DateTimePart : unsigned { DATE_PART = 1, TIME_PART = 2, SECONDS_PART = 4, AMPM_PART = 8 };
+
+// Where the masks of a locale come from. Each source is asked only when a code needs its mask.
+struct DateTimeMasks {
+    using Source = std::function<const std::string&()>;
+
+    Source time;       // hours and minutes, "hh:mm"
+    Source separator;  // before the seconds, ":"
+    Source ampm;       // "AM/PM"
+};
+
+// Composes the default code for the parts `flags` into `code`; without date and time part `code`
+// stays as it is.
+void composeDateTimeCode(std::string& code, unsigned flags, const DateTimeMasks& masks);
+
+// Gives the first style of each locale-dependent built-in id ("14", "18" to "22") its default
+// code; types are left alone.
+void updateFormatsForLocale(std::vector<xStyle>& styles, const DateTimeMasks& masks);
+
+// True for a style whose id equals the bound text.
+class DPXLSX_API DateTimeFormatEqualCode {
+  public:
+    explicit DateTimeFormatEqualCode(std::string styleId);
+
+    bool operator()(const xStyle& style) const;
+
+  private:
+    std::string styleId_;
+};
+
+// A new format for the style at `styleIndex`, owned by the caller; the automatic numeric format
+// when the index is outside the table or the code has no recognised shape. `isDateTime` says how
+// the reader counts the style; then its code loses its backslashes in the table.
+IVariableFormat* createStyleFormat(std::vector<xStyle>& styles, int styleIndex, bool isDateTime);
+
+}  // namespace dp

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "model/host/export.h"
+#include "model/host/i_variable_format.h"
+
+namespace dp {
+
+// The format of text columns. Text values are shown as they are, so a number has no display.
+class DPXLSX_API TextVariableFormat : public ITextVariableFormat {
+  public:
+    TextVariableFormat();
+    ~TextVariableFormat() override;
+
+    FormatType GetType() const override;
+    bool GetAuto() const override;
+    // A new, empty string.
+    IString* FormatValue(double value, bool fullPrecision) const override;
+    int GetCharacterCount() const override;
+
+    bool autoFormat = false;
+    int characterCount = 0;  // bytes
+};
+
+}  // namespace dp
