@@ -1,0 +1,49 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+
+#include "model/columns.h"
+#include "store/conversion.h"
+#include "store/read_options.h"
+#include "store/row_layout.h"
+
+// Columns built from stored cells, in one pass in row order.
+namespace dp {
+
+// Who a column is towards the host.
+struct ColumnIdentity {
+    std::string name;
+    int key;
+    std::uint32_t position;  // 0-based
+};
+
+// How a column is to be read. Everything is borrowed for the duration of a load.
+struct LoadSettings {
+    const ConversionSettings& conversion;
+    const RowLayout& layout;
+    std::uint32_t rowCount;  // rows that the column gets
+    bool previewing;
+    const CellFormats& formats;
+    std::string_view missingTextFrom;
+    std::string_view missingTextTo;
+};
+
+// Whether the rows of a gap between cells receive the host's replacement of missing numbers.
+bool replacesMissingNumbers(const ConversionSettings& settings);
+
+// A new numeric or date-time column. `requested` is the kind that a column option asks for;
+// `firstCellType` tells how the first data cell is shown.
+std::unique_ptr<NumericColumn> loadNumericColumn(const CellColumn& cells,
+                                                 const ColumnIdentity& identity,
+                                                 const LoadSettings& settings,
+                                                 IVariable::BasicDataType requested,
+                                                 IVariableFormat::FormatType firstCellType);
+
+// A new text column.
+std::unique_ptr<TextColumn> loadTextColumn(const CellColumn& cells, const ColumnIdentity& identity,
+                                           const LoadSettings& settings);
+
+}  // namespace dp

@@ -1,0 +1,174 @@
+#include "store/conversion.h"
+
+#include <cstdio>
+
+#include "model/string.h"
+#include "store/number_recognition.h"
+#include "store/text_cleaning.h"
+
+namespace dp {
+
+namespace {
+
+// The value of a number or date-time cell, missing when it is wanted as a date-time that the host
+// cannot show.
+double checkedNumber(double value, bool asDateTime, const ConversionSettings& settings,
+                     bool& converted) {
+    const IDateTimeVariableFormat* helper = settings.dateTimeHelper;
+    if (!asDateTime || !helper || helper->ValidVextralTime(value)) return value;
+    converted = true;
+    return settings.missingValue;
+}
+
+double textToNumber(std::string_view text, bool asDateTime, const IString* dateTimeFormat,
+                    const ConversionSettings& settings, bool& converted) {
+    double value = settings.missingValue;
+    if (asDateTime) {
+        String wrapped{std::string(text)};
+        double time = 0.0;
+        converted = !settings.dateTimeHelper ||
+                    !IsDateTime(settings.dateTimeHelper, dateTimeFormat, &wrapped, time);
+        return converted ? value : time;
+    }
+    converted =
+        !recogniseNumber(std::string(text), settings.inputDecimal, settings.missingValue, &value);
+    return value;
+}
+
+double rawNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
+                 const ConversionSettings& settings, bool& converted) {
+    switch (cell.type) {
+        case CELL_INTEGER:
+            return cell.intValue;
+        case CELL_NUMBER:
+            return checkedNumber(cell.numValue, asDateTime, settings, converted);
+        case CELL_TEXT:
+            return textToNumber(cell.textValue, asDateTime, dateTimeFormat, settings, converted);
+        case CELL_BOOLEAN:
+            return cell.boolValue;
+        case CELL_DATETIME:
+            if (!settings.convertDateTimeToText)
+                return checkedNumber(cell.numValue, asDateTime, settings, converted);
+            converted = true;
+            return settings.missingValue;
+        default:
+            return settings.missingValue;
+    }
+}
+
+double mapMissing(double value, const CellContent& cell, const ConversionSettings& settings) {
+    const bool missing = settings.alphaMissingNumericSet
+                             ? cell.textValue == settings.alphaMissingNumericFrom
+                             : value == settings.missingNumericFrom;
+    return missing ? settings.missingNumericTo : value;
+}
+
+std::string integerText(std::int32_t value) {
+    // Right-aligned in 12 characters, one more than the longest 32-bit integer has.
+    char text[16];
+    const int length = std::snprintf(text, sizeof text, "%12d", static_cast<int>(value));
+    return std::string(text, static_cast<std::size_t>(length));
+}
+
+}  // namespace
+
+bool IsDateTime(const IDateTimeVariableFormat* helper, const IString* format, IString* text,
+                double& value) {
+    return helper->ConvertToDatetime(format, text, value);
+}
+
+CellContent::CellContent(const ExternalDataRecordCell& cell)
+    : type(cell.type),
+      intValue(cell.intValue),
+      boolValue(cell.boolValue),
+      numValue(cell.numValue),
+      textValue(cell.textValue),
+      formatIndex(cell.formatIndex) {}
+
+CellContent::CellContent(const CellView& cell)
+    : type(cell.type()),
+      intValue(cell.intValue()),
+      boolValue(cell.boolValue()),
+      numValue(cell.numValue()),
+      textValue(cell.textValue()),
+      formatIndex(cell.formatIndex()) {}
+
+ExternalDataRecordCell CellContent::toCell() const {
+    ExternalDataRecordCell cell;
+    cell.type = type;
+    cell.intValue = intValue;
+    cell.boolValue = boolValue;
+    cell.numValue = numValue;
+    cell.textValue = textValue;
+    cell.formatIndex = formatIndex;
+    return cell;
+}
+
+const IVariableFormat& FormatCache::formatOf(const CellContent& cell) {
+    if (!recent_ || cell.formatIndex != recentIndex_) {
+        std::unique_ptr<IVariableFormat>& format = formats_[cell.formatIndex];
+        if (!format) format = source_.create(cell);
+        recent_ = format.get();
+        recentIndex_ = cell.formatIndex;
+    }
+    return *recent_;
+}
+
+double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
+                    const ConversionSettings& settings, bool& converted) {
+    converted = false;
+    double value = rawNumber(cell, asDateTime, dateTimeFormat, settings, converted);
+    value = mapMissing(value, cell, settings);
+    // Written so that a value that is not a number fails the test too.
+    if (!(value >= settings.minNumericValue && value <= settings.maxNumericValue)) {
+        value = settings.missingValue;
+        converted = true;
+    }
+    return value;
+}
+
+std::string numericCellToText(const CellContent& cell, const ConversionSettings& settings,
+                              FormatCache& formats) {
+    const IVariableFormat& format = formats.formatOf(cell);
+    if (cell.numValue == settings.missingValue) return std::string(settings.missingValueText);
+
+    const IVariableFormat* shown = &format;
+    if (cell.type == CELL_DATETIME && settings.dateTimeHelper &&
+        format.GetType() == IVariableFormat::FormatType::DateTime) {
+        settings.dateTimeHelper->SetDateTimeParameters(
+            static_cast<const IDateTimeVariableFormat*>(&format));
+        shown = settings.dateTimeHelper;
+    }
+    const std::unique_ptr<IString> text(shown->FormatValue(cell.numValue, false));
+    return text ? std::string(text->database_str()) : std::string();
+}
+
+void cellToText(const CellContent& cell, const ConversionSettings& settings, FormatCache& formats,
+                std::string& text) {
+    switch (cell.type) {
+        case CELL_INTEGER:
+            text = integerText(cell.intValue);
+            break;
+        case CELL_NUMBER:
+        case CELL_DATETIME:
+            text = numericCellToText(cell, settings, formats);
+            break;
+        case CELL_TEXT:
+            text = cell.textValue;
+            break;
+        case CELL_BOOLEAN:
+            text = cell.boolValue != 0 ? settings.trueValue : settings.falseValue;
+            break;
+        default:
+            text.clear();
+            break;
+    }
+    if (settings.cleanTextValues) CleanText(text);
+}
+
+void cutToBytes(std::string& text, std::int32_t maxLength) {
+    if (maxLength >= 0 && text.size() > static_cast<std::size_t>(maxLength))
+        text.resize(static_cast<std::size_t>(maxLength));
+}
+
+}  // namespace dp

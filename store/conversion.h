@@ -1,0 +1,97 @@
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <string>
+#include <string_view>
+
+#include "model/host/i_string.h"
+#include "model/host/i_variable_format.h"
+#include "store/cell_column.h"
+#include "store/external_data_record.h"
+
+namespace dp {
+
+// True when the helper reads `text` by `format` (null: no pattern known) as a date-time; `value` is
+// then its serial day number.
+DPXLSX_API bool IsDateTime(const IDateTimeVariableFormat* helper, const IString* format,
+                           IString* text, double& value);
+
+// The host's settings that decide how cells become values. Texts are borrowed.
+struct ConversionSettings {
+    double missingValue;
+    double minNumericValue;  // inclusive, like the maximum
+    double maxNumericValue;
+    std::int32_t maxTextLength;  // bytes
+    char inputDecimal;
+    std::string_view missingValueText;
+    std::string_view trueValue;
+    std::string_view falseValue;
+    double missingNumericFrom;
+    double missingNumericTo;
+    bool alphaMissingNumericSet;
+    std::string_view alphaMissingNumericFrom;
+    bool cleanTextValues;
+    bool convertDateTimeToText;
+    IDateTimeVariableFormat* dateTimeHelper;  // null when the host gave none
+};
+
+// A cell to convert, wherever it is kept. The text is borrowed.
+struct CellContent {
+    explicit CellContent(const ExternalDataRecordCell& cell);
+    explicit CellContent(const CellView& cell);
+
+    ExternalDataRecordCell toCell() const;
+
+    ExternalCellType type;
+    std::int32_t intValue;
+    std::int32_t boolValue;
+    double numValue;
+    std::string_view textValue;
+    std::int32_t formatIndex;
+};
+
+// Where the formats of cell styles come from.
+class CellFormats {
+  public:
+    virtual ~CellFormats() = default;
+
+    // A new format for the cell's style, never null.
+    virtual std::unique_ptr<IVariableFormat> create(const CellContent& cell) const = 0;
+};
+
+// The formats of one load, made once per style: making a date-time format costs fifty times what
+// rendering with it does.
+class FormatCache {
+  public:
+    explicit FormatCache(const CellFormats& source) : source_(source) {}
+
+    // Valid as long as the cache.
+    const IVariableFormat& formatOf(const CellContent& cell);
+
+  private:
+    const CellFormats& source_;
+    std::map<std::int32_t, std::unique_ptr<IVariableFormat>> formats_;
+    std::int32_t recentIndex_ = 0;
+    const IVariableFormat* recent_ = nullptr;
+};
+
+// The cell as number. `converted` is set when it had content that is no number, or one out of
+// range; the result is then the missing value. `dateTimeFormat` is the pattern by which texts are
+// read as date-times, null when none is known.
+double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
+                    const ConversionSettings& settings, bool& converted);
+
+// The cell as text, not cut; `text` is replaced.
+void cellToText(const CellContent& cell, const ConversionSettings& settings, FormatCache& formats,
+                std::string& text);
+
+// A number or date-time cell as its style shows it.
+std::string numericCellToText(const CellContent& cell, const ConversionSettings& settings,
+                              FormatCache& formats);
+
+// Keeps the first `maxLength` bytes; a negative length sets no limit.
+void cutToBytes(std::string& text, std::int32_t maxLength);
+
+}  // namespace dp

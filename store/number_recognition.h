@@ -1,0 +1,17 @@
+#pragma once
+
+#include <string>
+
+#include "model/host/export.h"
+
+namespace dp {
+
+// Whether `text`, without white space at its ends, is a number written with `decimal` as decimal
+// symbol; "(12.5)" is -12.5, and D marks an exponent as E does. `*value` receives the number, or
+// the missing value. The process's locale plays no part.
+DPXLSX_API bool IsNumber(const std::string& text, char decimal, double* value);
+
+// The same with `missing` as the value of a text that is no number.
+bool recogniseNumber(const std::string& text, char decimal, double missing, double* value);
+
+}  // namespace dp

@@ -1,0 +1,154 @@
+#include <algorithm>
+
+#include "formats/date_time_variable_format.h"
+#include "formats/numeric_variable_format.h"
+#include "store/column_loading.h"
+
+namespace dp {
+
+namespace {
+
+using BasicDataType = IVariable::BasicDataType;
+using FormatType = IVariableFormat::FormatType;
+
+// A preview converts the values up to this slot, 101 of them, and fills the rest with the initial
+// missing value, whatever the host has made of that setting since.
+constexpr std::uint32_t kLastPreviewSlot = 100;
+constexpr double kPreviewFiller = 1.23456e30;
+
+std::unique_ptr<IVariableFormat> automaticNumericFormat() {
+    auto format = std::make_unique<NumericVariableFormat>();
+    format->autoFormat = true;
+    return format;
+}
+
+std::unique_ptr<IVariableFormat> automaticDateTimeFormat() {
+    auto format = std::make_unique<DateTimeVariableFormat>();
+    format->autoFormat = true;
+    return format;
+}
+
+// The format of a column by the first cell that has a value.
+std::unique_ptr<IVariableFormat> inferFormat(const CellContent& cell, BasicDataType requested,
+                                             const CellFormats& formats) {
+    if (requested == BasicDataType::Numeric) {
+        if (cell.formatIndex >= 0)
+            if (auto format = formats.create(cell); format->GetType() == FormatType::Numeric)
+                return format;
+        return automaticNumericFormat();
+    }
+    if (requested == BasicDataType::DateTime) {
+        if (cell.formatIndex != -1)
+            if (auto format = formats.create(cell); format->GetType() == FormatType::DateTime)
+                return format;
+        return automaticDateTimeFormat();
+    }
+    return formats.create(cell);
+}
+
+// The pattern by which further texts are read as date-times; null unless the format has one.
+const IString* patternOf(const IVariableFormat& format) {
+    if (format.GetType() != FormatType::DateTime) return nullptr;
+    return static_cast<const IDateTimeVariableFormat&>(format).GetFormatString();
+}
+
+class NumericLoad {
+  public:
+    NumericLoad(NumericColumn& column, const LoadSettings& settings, BasicDataType requested,
+                FormatType firstCellType)
+        : column_(column),
+          settings_(settings),
+          requested_(requested),
+          asDateTime_(requested == BasicDataType::DateTime ||
+                      firstCellType == FormatType::DateTime),
+          replacesMissing_(replacesMissingNumbers(settings.conversion)) {}
+
+    // Whether any cell was handled.
+    bool run(const CellColumn& cells) {
+        const std::uint32_t firstRow = settings_.layout.firstDataRow;
+        std::uint32_t expectedRow = firstRow;
+        std::uint32_t slot = 0;
+        bool handled = false;
+        const auto end = cells.end();
+        for (auto cell = cells.lower_bound(firstRow); cell != end && slot < settings_.rowCount;
+             ++cell) {
+            slot += passGap(expectedRow, cell->first);
+            if (slot >= settings_.rowCount) break;
+            expectedRow = cell->first + 1;
+            handled = true;
+            store(CellContent(cell->second), slot);
+            ++slot;
+        }
+        return handled;
+    }
+
+  private:
+    std::uint32_t passGap(std::uint32_t expectedRow, std::uint32_t row) {
+        const Gap gap = gapBefore(settings_.layout, expectedRow, row);
+        if (replacesMissing_)
+            fillGap(gap, settings_.rowCount, [&](std::size_t slot) {
+                column_.values[slot] = settings_.conversion.missingNumericTo;
+            });
+        return gap.slots;
+    }
+
+    void store(const CellContent& cell, std::uint32_t slot) {
+        double value = kPreviewFiller;
+        if (!settings_.previewing || slot <= kLastPreviewSlot) {
+            bool converted = false;
+            value = cellToNumber(cell, asDateTime_, pattern_, settings_.conversion, converted);
+            if (converted) ++column_.convertedMissingCount;
+        }
+        column_.values[slot] = value;
+        if (value == settings_.conversion.missingValue) return;
+        --column_.missingCount;
+        if (!column_.format) {
+            column_.format = inferFormat(cell, requested_, settings_.formats);
+            pattern_ = patternOf(*column_.format);
+        }
+    }
+
+    NumericColumn& column_;
+    const LoadSettings& settings_;
+    const BasicDataType requested_;
+    const bool asDateTime_;
+    const bool replacesMissing_;
+    const IString* pattern_ = nullptr;
+};
+
+}  // namespace
+
+bool replacesMissingNumbers(const ConversionSettings& settings) {
+    return settings.missingNumericFrom == settings.missingValue && !settings.alphaMissingNumericSet;
+}
+
+std::unique_ptr<NumericColumn> loadNumericColumn(const CellColumn& cells,
+                                                 const ColumnIdentity& identity,
+                                                 const LoadSettings& settings,
+                                                 BasicDataType requested,
+                                                 FormatType firstCellType) {
+    auto column = std::make_unique<NumericColumn>();
+    column->name = identity.name;
+    column->primeKey = column->variableBodyPrimeKey = identity.key;
+    column->useDefaultVariableBody = identity.key == 0;
+    column->position = static_cast<std::int32_t>(identity.position + 1);
+    column->dataType =
+        requested == BasicDataType::DateTime ? NumericColumn::kDateTimes : NumericColumn::kNumbers;
+    column->formatDirty = true;
+    column->rowCount = column->missingCount = static_cast<std::int32_t>(settings.rowCount);
+    column->values.reset(new double[settings.rowCount]);
+    std::fill_n(column->values.get(), settings.rowCount, settings.conversion.missingValue);
+
+    NumericLoad load(*column, settings, requested, firstCellType);
+    const bool handled = load.run(cells);
+
+    if (!column->format)
+        column->format = column->dataType == NumericColumn::kDateTimes ? automaticDateTimeFormat()
+                                                                       : automaticNumericFormat();
+    if (column->format->GetType() == FormatType::DateTime)
+        column->dataType = NumericColumn::kDateTimes;
+    if (identity.name.empty() && !handled) column->rowCount = column->missingCount = 0;
+    return column;
+}
+
+}  // namespace dp

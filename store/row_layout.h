@@ -1,0 +1,58 @@
+#pragma once
+
+#include <cstdint>
+
+#include "store/blank_rows.h"
+#include "store/read_options.h"
+#include "store/worksheet_cells.h"
+
+// From the host's row options to concrete rows, and from rows to the value slots of a column. All
+// rows are 0-based here unless said otherwise; arithmetic on rows is that of unsigned 32-bit
+// numbers.
+namespace dp {
+
+// Turns the host's 1-based rows 0-based, once.
+void makeRowsZeroBased(SheetReadOptions& options);
+
+// Fills in the rows that the host did not give, for a worksheet whose setting is not VNR_INFER. A
+// setting without a meaning counts as VNR_NONE.
+void placeRows(SheetReadOptions& options);
+
+// Decides from row 0 whether the worksheet has a row of variable names, and records the answer.
+void inferRows(SheetReadOptions& options, const WorksheetCells& cells);
+
+// The largest row that holds a cell; 0 for a worksheet without cells.
+std::uint32_t lastRow(const WorksheetCells& cells);
+
+// The rows that a load reads, and the rows among them that it passes over.
+struct RowLayout {
+    std::uint32_t firstDataRow = kNotSet;
+    std::uint32_t dataRowCount = kNotSet;  // at most so many rows
+    const BlankRows* blankRows = nullptr;  // null when blank rows are kept
+};
+
+// Rows of a column whose data ends in row `last`.
+std::uint32_t rowCountUpTo(const RowLayout& layout, std::uint32_t last);
+
+// Rows of a column that ends with its own last cell.
+std::uint32_t unpaddedRowCount(const RowLayout& layout, const CellColumn& column);
+
+// The value slots between two handled cells.
+struct Gap {
+    std::uint32_t slots = 0;      // to be passed over
+    std::uint32_t firstSlot = 0;  // slot of the first row of the gap
+    std::uint32_t emptyRows = 0;  // rows of the gap that are not blank
+};
+
+// The gap between `expectedRow`, the row after the cell handled last, and `cellRow`.
+Gap gapBefore(const RowLayout& layout, std::uint32_t expectedRow, std::uint32_t cellRow);
+
+// Calls `fill(slot)` for the slots of the gap's empty rows that lie below `rowCount`.
+template <class Fill>
+void fillGap(const Gap& gap, std::uint32_t rowCount, Fill fill) {
+    const std::uint64_t end =
+        std::min(std::uint64_t{gap.firstSlot} + gap.emptyRows, std::uint64_t{rowCount});
+    for (std::uint64_t slot = gap.firstSlot; slot < end; ++slot) fill(slot);
+}
+
+}  // namespace dp

@@ -1,0 +1,89 @@
+#include <algorithm>
+
+#include "formats/text_variable_format.h"
+#include "store/column_loading.h"
+#include "store/text_cleaning.h"
+
+namespace dp {
+
+namespace {
+
+// A preview renders the texts up to this slot, 101 of them.
+constexpr std::uint32_t kLastPreviewSlot = 100;
+
+class TextLoad {
+  public:
+    TextLoad(TextColumn& column, TextVariableFormat& format, const LoadSettings& settings)
+        : column_(column), format_(format), settings_(settings), formats_(settings.formats) {}
+
+    // Whether any cell was handled.
+    bool run(const CellColumn& cells) {
+        const std::uint32_t firstRow = settings_.layout.firstDataRow;
+        std::uint32_t expectedRow = firstRow;
+        std::uint32_t slot = 0;
+        const auto end = cells.end();
+        for (auto cell = cells.lower_bound(firstRow); cell != end && slot < settings_.rowCount;
+             ++cell) {
+            slot += passGap(expectedRow, cell->first);
+            if (slot >= settings_.rowCount) break;
+            expectedRow = cell->first + 1;
+            store(cell->second, slot);
+            ++slot;
+        }
+        return expectedRow != firstRow;
+    }
+
+  private:
+    std::string& textAt(std::size_t slot) { return column_.textValues.items[slot].text(); }
+
+    std::uint32_t passGap(std::uint32_t expectedRow, std::uint32_t row) {
+        const Gap gap = gapBefore(settings_.layout, expectedRow, row);
+        if (settings_.missingTextFrom.empty() && !settings_.missingTextTo.empty())
+            fillGap(gap, settings_.rowCount,
+                    [&](std::size_t slot) { textAt(slot) = settings_.missingTextTo; });
+        return gap.slots;
+    }
+
+    void store(const CellView& cell, std::uint32_t slot) {
+        std::string& text = textAt(slot);
+        if (!settings_.previewing || slot <= kLastPreviewSlot)
+            cellToText(CellContent(cell), settings_.conversion, formats_, text);
+        if (isAllSpaces(text)) text.clear();
+        if (text == settings_.missingTextFrom) text = settings_.missingTextTo;
+        cutToBytes(text, settings_.conversion.maxTextLength);
+        if (!text.empty()) --column_.missingCount;
+        format_.characterCount =
+            std::max(format_.characterCount, static_cast<std::int32_t>(text.size()));
+    }
+
+    TextColumn& column_;
+    TextVariableFormat& format_;
+    const LoadSettings& settings_;
+    FormatCache formats_;
+};
+
+}  // namespace
+
+std::unique_ptr<TextColumn> loadTextColumn(const CellColumn& cells, const ColumnIdentity& identity,
+                                           const LoadSettings& settings) {
+    auto column = std::make_unique<TextColumn>();
+    column->name = identity.name;
+    column->primeKey = column->variableBodyPrimeKey = identity.key;
+    column->useDefaultVariableBody = identity.key == 0;
+    column->position = static_cast<std::int32_t>(identity.position + 1);
+    column->formatDirty = true;
+    auto format = std::make_unique<TextVariableFormat>();
+    format->characterCount = 1;
+    column->rowCount = column->missingCount = static_cast<std::int32_t>(settings.rowCount);
+    column->textValues.items.resize(settings.rowCount);
+
+    TextLoad load(*column, *format, settings);
+    if (!load.run(cells)) {
+        column->rowCount = column->missingCount = 0;
+        column->textValues.items.clear();
+    }
+    column->format = std::move(format);
+    return column;
+}
+
+}  // namespace dp

@@ -1,0 +1,76 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <vector>
+
+#include "model/host/export.h"
+#include "store/cell_column.h"
+#include "store/external_data_record.h"
+#include "store/text_pool.h"
+
+namespace dp {
+
+// The cells of one worksheet, an ordered map from column (0-based) to CellColumn. Not to be
+// changed while another thread uses it; after settle() reads change nothing.
+class DPXLSX_API WorksheetCells {
+    using Columns = std::map<unsigned, CellColumn>;
+
+  public:
+    using value_type = Columns::value_type;
+    using const_iterator = Columns::const_iterator;
+    using const_reverse_iterator = Columns::const_reverse_iterator;
+
+    // All columns keep their texts in `texts`, or in one pool made for them when that is null.
+    explicit WorksheetCells(std::shared_ptr<TextPool> texts = nullptr);
+    WorksheetCells(WorksheetCells&& other) noexcept;
+    WorksheetCells& operator=(WorksheetCells&& other) noexcept;
+    ~WorksheetCells();
+
+    // Files one cell at its row and column, replacing the one that is there. Throws std::bad_alloc
+    // and the cells are then as before. Consecutive calls for a column, the next one to the right
+    // or the leftmost one need no search.
+    void add(const ExternalDataRecord& record);
+    // Files a cell of type CELL_TEXT without a look at the text, which is of this worksheet's pool.
+    void addText(unsigned row, unsigned column, PooledText text, std::int32_t formatIndex);
+    // The cells of `column`, an empty CellColumn if there were none.
+    CellColumn& operator[](unsigned column);
+    void clear() noexcept;
+
+    // The pool that keeps this worksheet's texts, made if there is none yet.
+    const std::shared_ptr<TextPool>& texts();
+
+    std::size_t size() const { return columns_.size(); }
+    bool empty() const { return columns_.empty(); }
+    const_iterator begin() const { return columns_.begin(); }
+    const_iterator end() const { return columns_.end(); }
+    const_reverse_iterator rbegin() const { return columns_.rbegin(); }
+    const_reverse_iterator rend() const { return columns_.rend(); }
+    const_iterator find(unsigned column) const { return columns_.find(column); }
+    const_iterator lower_bound(unsigned column) const { return columns_.lower_bound(column); }
+    const_iterator upper_bound(unsigned column) const { return columns_.upper_bound(column); }
+    std::size_t count(unsigned column) const { return columns_.count(column); }
+
+    // The column number and cells of the `position`-th column (0-based) in ascending order;
+    // `position` is below size().
+    const value_type& nth(std::size_t position) const;
+    // The largest row of all columns plus one, 0 without cells.
+    unsigned rowCount() const;
+    // Puts cells that came out of order in their places.
+    void settle() const;
+
+  private:
+    CellColumn* known(unsigned column);
+    template <typename File>
+    void file(unsigned column, const File& fileIn);
+    const std::vector<const value_type*>& inOrder() const;
+
+    std::shared_ptr<TextPool> texts_;
+    Columns columns_;
+    Columns::iterator recent_;                        // the last column filed in, if any
+    mutable std::vector<const value_type*> inOrder_;  // made when first needed
+};
+
+}  // namespace dp
