@@ -1,0 +1,67 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "readers/excel_xml_reader.h"
+#include "readers/relationships.h"
+
+namespace dp {
+
+// What a number cell is by its style.
+struct NumberKind {
+    ExternalCellType type = CELL_NUMBER;
+    int formatIndex = -1;
+};
+
+// Reads an unpacked .xlsx package: styles, shared strings, relationships, then the worksheets of
+// the workbook's list in order.
+class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
+  public:
+    // `dir` is the directory of the unpacked package. Throws CmXmlException when its workbook part
+    // cannot be opened.
+    ExcelXLSXReader(const std::string& dir, bool hasSharedStrings, std::string shortDateFormat,
+                    double missingValue, IExcelDataProvider* provider,
+                    IDateTimeVariableFormat* dateTimeHelper);
+    ~ExcelXLSXReader() override;
+
+    void mReadExcelWorkbook() override;
+
+    void mReadSharedStrings();
+    void mReadExcel2007Styles();
+    void mAddPredefined2007Styles();
+    // Delivers the cells of the worksheet part that the relationship target names.
+    void mReadExcel2007Worksheet(const std::string& target);
+    // Copies the target of the first relationship called `id`; leaves `target` alone without one.
+    void mSearchWorkbookRelationships(const std::string& id, std::string& target);
+    // Decodes the escapes by which a package writes control characters, in place.
+    static void mParseCharString(std::string& text);
+
+  private:
+    friend class WorksheetPass;
+
+    void readSheets();
+    void readSheet(std::vector<unsigned>& emptySheets);
+    void resolveNumberKinds();
+
+    bool hasSharedStrings;
+    std::string xlDir;
+    std::vector<std::string> relationshipIds;
+    std::vector<std::string> relationshipTargets;
+    std::vector<std::string> sharedStrings;  // raw; escapes are decoded when a cell uses them
+    std::vector<std::string> cellXfNumFmtIds;
+
+    std::string packageDir;
+    RelationshipIndex relationshipIndex;
+    std::vector<NumberKind> numberKinds;  // by position in cellXfNumFmtIds
+};
+
+namespace excel_xlsx {
+
+// The names of an unpacked package's worksheets in workbook order, empty worksheets included.
+// Throws CmXmlException.
+DPXLSX_API void GetWorksheets(const std::string& dir, std::vector<std::string>& names);
+
+}  // namespace excel_xlsx
+
+}  // namespace dp

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace dp {
+
+// Reads the workbook's relationships to worksheets, ids and targets at the same index. Both lists
+// grow from 10 entries by doubling and keep their empty ends. Throws CmXmlException.
+void mReadWorkbookRelationships(const std::string& xlDir, std::vector<std::string>& ids,
+                                std::vector<std::string>& targets);
+
+// Finds the first entry of a list of ids. The list must not change meanwhile.
+class RelationshipIndex {
+  public:
+    RelationshipIndex() = default;
+    explicit RelationshipIndex(const std::vector<std::string>& ids);
+
+    // The entry's index, or -1.
+    std::ptrdiff_t find(const std::string& id) const;
+
+  private:
+    std::unordered_map<std::string_view, std::size_t> firstById_;
+};
+
+// The path of the part that the workbook's relationship target names, "." and ".." resolved within
+// the package directory `dir`; a target that starts with a slash is taken from the package's root,
+// others from its xl folder. Throws CmXmlException for a target that leaves the package.
+std::string resolveTarget(const std::string& dir, const std::string& target);
+
+}  // namespace dp

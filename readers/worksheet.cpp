@@ -1,0 +1,227 @@
+#include <algorithm>
+#include <string>
+#include <string_view>
+
+#include <libxml/xmlreader.h>
+
+#include "readers/cell_reference.h"
+#include "readers/cm_xml_cast.h"
+#include "readers/excel_xlsx_reader.h"
+
+// The cells of one worksheet part, in a single forward pass.
+namespace dp {
+
+namespace {
+
+enum class CellKind { Number, SharedString, Text, InlineText, Error };
+
+CellKind kindOf(std::string_view type) {
+    if (type == "s") return CellKind::SharedString;
+    if (type == "str") return CellKind::Text;
+    if (type == "inlineStr") return CellKind::InlineText;
+    if (type == "e") return CellKind::Error;
+    return CellKind::Number;  // Booleans and ISO dates included
+}
+
+// The names that the pass looks for, as the document's own table has them: one pointer comparison
+// tells whether a node has such a name.
+struct Names {
+    explicit Names(xmlTextReaderPtr reader)
+        : row(intern(reader, "row")),
+          c(intern(reader, "c")),
+          v(intern(reader, "v")),
+          t(intern(reader, "t")),
+          r(intern(reader, "r")),
+          s(intern(reader, "s")) {}
+
+    static const xmlChar* intern(xmlTextReaderPtr reader, const char* name) {
+        return xmlTextReaderConstString(reader, reinterpret_cast<const xmlChar*>(name));
+    }
+
+    const xmlChar* row;
+    const xmlChar* c;
+    const xmlChar* v;
+    const xmlChar* t;
+    const xmlChar* r;
+    const xmlChar* s;
+};
+
+// The text of an attribute whose value is plain text; null when it holds references.
+const char* plainValue(const xmlAttr* attribute) {
+    const xmlNode* value = attribute->children;
+    if (!value) return "";
+    if (value->type != XML_TEXT_NODE || value->next) return nullptr;
+    return reinterpret_cast<const char*>(value->content);
+}
+
+// Where a shared-string cell points to: the optional sign and digits of `text`, or -1 for a number
+// beyond any table. Throws CmXmlException for anything else.
+long sharedStringIndex(const char* text) {
+    constexpr long kBeyond = 0x7FFFFFFF;
+    const bool negative = *text == '-';
+    if (*text == '-' || *text == '+') ++text;
+    if (*text == '\0') throw CmXmlException(kXmlError);
+    long index = 0;
+    for (; *text != '\0'; ++text) {
+        if (*text < '0' || *text > '9') throw CmXmlException(kXmlError);
+        index = std::min(index * 10 + (*text - '0'), kBeyond);
+    }
+    return index == kBeyond || (negative && index != 0) ? -1 : index;
+}
+
+}  // namespace
+
+// The state of one pass over a worksheet part.
+class WorksheetPass {
+  public:
+    WorksheetPass(ExcelXLSXReader& owner, const std::string& path) : owner_(owner) {
+        reader_.mInitialize(path);
+    }
+
+    void run() {
+        const Names names(reader_.textReader);
+        if (reader_.nodeType() != XML_READER_TYPE_ELEMENT && !reader_.readToElement()) return;
+        bool onElement = true;
+        while (onElement) {
+            onElement = false;  // until a handler stops on an element that it did not handle
+            const xmlChar* name = xmlTextReaderConstName(reader_.textReader);
+            if (name == names.c)
+                beginCell(names);
+            else if (name == names.v)
+                onElement = readValue();
+            else if (name == names.row)
+                beginRow();
+            else if (name == names.t && kind_ == CellKind::InlineText)
+                onElement = readInlineText();
+            if (!onElement) onElement = reader_.readToElement();
+        }
+    }
+
+  private:
+    void beginRow() {
+        // Not a number: as if there were none.
+        constexpr int kNone = -0x7FFFFFFF - 1;
+        int number = kNone;
+        reader_.mReadAttribute_NotSafe(number, "r");
+        place_.beginRow(number == kNone ? nullptr : &number);
+    }
+
+    void beginCell(const Names& names) {
+        kind_ = CellKind::Number;
+        style_ = -1;
+        const char* reference = nullptr;
+        const xmlNode* cell = xmlTextReaderCurrentNode(reader_.textReader);
+        for (const xmlAttr* a = cell->properties; a; a = a->next) {
+            if (a->ns || (a->name != names.r && a->name != names.t && a->name != names.s)) continue;
+            const char* value = plainValue(a);
+            if (!value) value = expandedValue(a);
+            if (a->name == names.r)
+                reference = value;
+            else if (a->name == names.t)
+                kind_ = kindOf(value);
+            else
+                CmXmlCast::instance().mCast(style_, value);
+        }
+        place_.beginCell(reference);
+    }
+
+    // The text of an attribute with references in it; valid until the next call.
+    const char* expandedValue(const xmlAttr* attribute) {
+        expanded_ = reader_.attributeText(reinterpret_cast<const char*>(attribute->name));
+        xmlTextReaderMoveToElement(reader_.textReader);
+        return expanded_.c_str();
+    }
+
+    // Moves to the text of the current element; null when it has none. Comments are no text.
+    // Throws CmXmlException when the document ends.
+    const char* readText() {
+        if (xmlTextReaderIsEmptyElement(reader_.textReader) == 1) return nullptr;
+        int type = XML_READER_TYPE_COMMENT;
+        while (type == XML_READER_TYPE_COMMENT || type == XML_READER_TYPE_PROCESSING_INSTRUCTION) {
+            if (!reader_.readNode()) throw CmXmlException(kXmlError);
+            type = reader_.nodeType();
+        }
+        const char* text = reader_.nodeValue();
+        return text && *text != '\0' ? text : nullptr;
+    }
+
+    // True when the reader stands on an element that is still to be visited.
+    bool readValue() {
+        const bool empty = xmlTextReaderIsEmptyElement(reader_.textReader) == 1;
+        const char* text = readText();
+        if (text) deliver(text);
+        kind_ = CellKind::Number;
+        style_ = -1;
+        return !empty && !text && reader_.nodeType() == XML_READER_TYPE_ELEMENT;
+    }
+
+    bool readInlineText() {
+        const bool empty = xmlTextReaderIsEmptyElement(reader_.textReader) == 1;
+        const char* text = readText();
+        if (text) deliverText(text);
+        return !empty && !text && reader_.nodeType() == XML_READER_TYPE_ELEMENT;
+    }
+
+    void deliver(const char* text) {
+        switch (kind_) {
+            case CellKind::Number:
+                deliverNumber(text);
+                break;
+            case CellKind::SharedString:
+                deliverSharedString(sharedStringIndex(text));
+                break;
+            case CellKind::Text:
+            case CellKind::InlineText:
+                deliverText(text);
+                break;
+            case CellKind::Error:
+                break;
+        }
+    }
+
+    void deliverNumber(const char* text) {
+        NumberKind kind;
+        if (style_ >= 0 && static_cast<std::size_t>(style_) < owner_.numberKinds.size())
+            kind = owner_.numberKinds[static_cast<std::size_t>(style_)];
+        number_.cell.type = kind.type;
+        number_.cell.formatIndex = kind.formatIndex;
+        CmXmlCast::instance().mCast(number_.cell.numValue, text);
+        deliverAt(number_);
+    }
+
+    void deliverSharedString(long index) {
+        if (index < 0 || static_cast<std::size_t>(index) >= owner_.sharedStrings.size()) return;
+        deliverText(owner_.sharedStrings[static_cast<std::size_t>(index)]);
+    }
+
+    template <class Text>
+    void deliverText(const Text& text) {
+        std::string& value = text_.cell.textValue;
+        value = text;
+        if (ExcelXmlReader::IsStringAllBlank(value)) return;
+        ExcelXLSXReader::mParseCharString(value);
+        text_.cell.type = CELL_TEXT;
+        deliverAt(text_);
+    }
+
+    void deliverAt(ExternalDataRecord& record) {
+        record.row = place_.row();
+        record.column = place_.column();
+        owner_.deliver(record);
+    }
+
+    ExcelXLSXReader& owner_;
+    XmlReader reader_;
+    CellPlace place_;
+    CellKind kind_ = CellKind::Number;
+    int style_ = -1;
+    std::string expanded_;
+    ExternalDataRecord number_{0, 0, 0, 0};
+    ExternalDataRecord text_{0, 0, 0, 0};
+};
+
+void ExcelXLSXReader::mReadExcel2007Worksheet(const std::string& target) {
+    WorksheetPass(*this, resolveTarget(packageDir, target)).run();
+}
+
+}  // namespace dp

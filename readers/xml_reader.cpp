@@ -1,0 +1,144 @@
+#include "readers/xml_reader.h"
+
+#include <algorithm>
+#include <cstring>
+
+#include <boost/filesystem.hpp>
+#include <libxml/xmlreader.h>
+
+#include "readers/cm_xml_cast.h"
+
+namespace {
+
+namespace fs = boost::filesystem;
+
+// Errors are told by the result of a call, never by a message. The options alone do not keep
+// libxml2 quiet: it still prints a line for a text of over 10 MB.
+void ignoreError(void*, xmlErrorPtr) {}
+
+// libxml2 reports a file that it cannot open through the thread's own channel, which may be the
+// host's: silenced for one call, then put back.
+class SilentThread {
+  public:
+    SilentThread() : handler_(xmlStructuredError), context_(xmlStructuredErrorContext) {
+        xmlSetStructuredErrorFunc(nullptr, ignoreError);
+    }
+    ~SilentThread() { xmlSetStructuredErrorFunc(context_, handler_); }
+    SilentThread(const SilentThread&) = delete;
+    SilentThread& operator=(const SilentThread&) = delete;
+
+  private:
+    xmlStructuredErrorFunc handler_;
+    void* context_;
+};
+
+xmlTextReaderPtr openFile(const std::string& path) {
+    const SilentThread silent;
+    xmlTextReaderPtr reader =
+        xmlReaderForFile(path.c_str(), nullptr, XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
+    if (reader) xmlTextReaderSetStructuredErrorHandler(reader, ignoreError, nullptr);
+    return reader;
+}
+
+// The path of a private copy of `path`; empty when it could not be made. Throws the file system's
+// error when there is no temporary directory.
+std::string copyToTemporary(const std::string& path) {
+    boost::system::error_code error;
+    const fs::path model = fs::temp_directory_path() / "%%%%-%%%%";
+    const fs::path copy = fs::unique_path(model, error);
+    if (error) return {};
+    fs::copy_file(path, copy, fs::copy_option::fail_if_exists, error);
+    return error ? std::string() : copy.string();
+}
+
+}  // namespace
+
+XmlReader::~XmlReader() {
+    if (textReader) xmlFreeTextReader(textReader);
+    textReader = nullptr;
+    boost::system::error_code ignored;
+    if (tempCopy) fs::remove(tempPath, ignored);
+}
+
+void XmlReader::mInitialize(const std::string& path) {
+    textReader = openFile(path);
+    if (!textReader) {
+        tempPath = copyToTemporary(path);
+        tempCopy = !tempPath.empty();
+        if (tempCopy) textReader = openFile(tempPath);
+    }
+    if (!textReader || !readNode()) throw CmXmlException(kXmlError);
+}
+
+bool XmlReader::readNode() {
+    const int result = xmlTextReaderRead(textReader);
+    endOfFile = result == 0;
+    if (result == -1) throw CmXmlException(kXmlError);
+    return !endOfFile;
+}
+
+bool XmlReader::readToElement() {
+    while (readNode())
+        if (nodeType() == XML_READER_TYPE_ELEMENT) return true;
+    return false;
+}
+
+bool XmlReader::mGotoElement(const char* name) {
+    const auto isWanted = [this, name] {
+        const char* current = nodeName();
+        return current && std::strcmp(current, name) == 0;
+    };
+    while (!isWanted())
+        if (!readToElement()) return false;
+    return true;
+}
+
+bool XmlReader::moveToAttribute(const char* name) {
+    const int result =
+        xmlTextReaderMoveToAttribute(textReader, reinterpret_cast<const xmlChar*>(name));
+    if (result == -1) throw CmXmlException(kXmlError);
+    return result != 0;
+}
+
+template <class T>
+bool XmlReader::mReadAttribute(T& value, const char* name) {
+    if (!moveToAttribute(name)) return false;
+    if (const char* text = nodeValue()) CmXmlCast::instance().mCast(value, text);
+    return true;
+}
+
+template bool XmlReader::mReadAttribute<int>(int&, const char*);
+template bool XmlReader::mReadAttribute<unsigned>(unsigned&, const char*);
+
+bool XmlReader::mReadAttribute_NotSafe(int& value, const char* name) {
+    return mReadAttribute(value, name);
+}
+
+std::string XmlReader::attributeText(const char* name) {
+    const char* text = moveToAttribute(name) ? nodeValue() : nullptr;
+    return text ? std::string(text) : std::string();
+}
+
+int XmlReader::nodeType() const { return xmlTextReaderNodeType(textReader); }
+
+const char* XmlReader::nodeName() const {
+    return reinterpret_cast<const char*>(xmlTextReaderConstName(textReader));
+}
+
+const char* XmlReader::nodeValue() const {
+    return reinterpret_cast<const char*>(xmlTextReaderConstValue(textReader));
+}
+
+namespace dp::xml {
+
+int mReadForElements(XmlReader& reader, const std::vector<std::string>& names) {
+    if (names.empty()) return -1;
+    bool onElement = reader.nodeType() == XML_READER_TYPE_ELEMENT || reader.readToElement();
+    for (; onElement; onElement = reader.readToElement()) {
+        const auto found = std::find(names.begin(), names.end(), reader.nodeName());
+        if (found != names.end()) return static_cast<int>(found - names.begin());
+    }
+    return -1;
+}
+
+}  // namespace dp::xml

@@ -1,0 +1,80 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "model/host/export.h"
+
+struct _xmlTextReader;
+
+// The one exception of the readers: an XML part that cannot be opened, read or understood. Carries
+// no text; what failed is in the package, and the host shows its own message.
+class DPXLSX_API CmXmlException {
+  public:
+    explicit CmXmlException(int code) : code_(code) {}
+
+    int code() const { return code_; }
+
+  private:
+    int code_;
+};
+
+// The code of every CmXmlException that the readers throw.
+inline constexpr int kXmlError = 13;
+
+// Reads one XML document forward, node by node. There is no way back: what must be read twice is
+// opened twice. The network, external entities and entity substitution stay off.
+class DPXLSX_API XmlReader {
+  public:
+    XmlReader() = default;
+    XmlReader(const XmlReader&) = delete;
+    XmlReader& operator=(const XmlReader&) = delete;
+    ~XmlReader();
+
+    // Opens the document and moves to its first node; to be called before anything else. A file
+    // that libxml2 cannot open under its own name is read from a private copy. Throws
+    // CmXmlException when the file cannot be opened, is empty, or begins with an error.
+    void mInitialize(const std::string& path);
+
+    // Moves forward to the next node called `name`, staying where it is when the current node has
+    // that name, an end tag included. False at the end of the document. Throws CmXmlException.
+    bool mGotoElement(const char* name);
+
+    // Reads an integer attribute of the current element; T is int or unsigned. True when the
+    // attribute exists; text that does not start with a number leaves `value` as it was, and a
+    // number too large for T becomes the largest one. Leaves the cursor on the attribute, from
+    // where the next read goes on behind the element. Throws CmXmlException.
+    template <class T>
+    bool mReadAttribute(T& value, const char* name);
+    bool mReadAttribute_NotSafe(int& value, const char* name);
+
+    // Moves to the next node; false at the end of the document. Throws CmXmlException.
+    bool readNode();
+    // Moves to the next element; false at the end of the document. Throws CmXmlException.
+    bool readToElement();
+    // The text of an attribute of the current element, empty when it has none. Moves the cursor as
+    // mReadAttribute does. Throws CmXmlException.
+    std::string attributeText(const char* name);
+    // The current node's type and name as libxml2 gives them; the name may be null.
+    int nodeType() const;
+    const char* nodeName() const;
+    // The current node's value, null when its kind has none. Valid until the next read.
+    const char* nodeValue() const;
+
+    bool tempCopy = false;   // the document is a private copy that goes with the reader
+    bool endOfFile = false;  // the last forward read came to the end of the document
+    std::string tempPath;
+    _xmlTextReader* textReader = nullptr;
+
+  private:
+    bool moveToAttribute(const char* name);
+};
+
+namespace dp::xml {
+
+// Moves to the next element whose name is in `names` and returns the name's index; stays where it
+// is when the current element is one. -1 at the end of the document and for an empty list. Throws
+// CmXmlException.
+DPXLSX_API int mReadForElements(XmlReader& reader, const std::vector<std::string>& names);
+
+}  // namespace dp::xml
