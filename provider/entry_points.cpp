@@ -1,0 +1,51 @@
+#include "model/host/entry_points.h"
+
+#include <algorithm>
+#include <cctype>
+#include <cstring>
+#include <string>
+
+#include <boost/filesystem/path.hpp>
+
+#include "model/string.h"
+#include "provider/file_type.h"
+#include "provider/xlsx_data_provider.h"
+
+namespace dp {
+
+namespace {
+
+constexpr char kTypeName[] = "xlsx";
+
+}  // namespace
+
+bool hasXlsxExtension(const std::string& path) {
+    std::string extension = boost::filesystem::path(path).extension().string();
+    std::transform(extension.begin(), extension.end(), extension.begin(),
+                   [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
+    return extension == ".xlsx";
+}
+
+bool IsMicrosoftXLSXFile(const char* fileName) { return hasXlsxExtension(textOrEmpty(fileName)); }
+
+const char* GetDataProviderFiletype(const char* fileName) {
+    static char fileType[sizeof kTypeName];
+    std::strcpy(fileType, IsMicrosoftXLSXFile(fileName) ? kTypeName : "");
+    return fileType;
+}
+
+long CreateDataProvider(const char* typeName, IDataProvider** provider) {
+    constexpr long kFailed = -1;
+    constexpr long kUnknownType = -22;
+    if (!provider) return kFailed;
+    *provider = nullptr;
+    if (std::strcmp(textOrEmpty(typeName), kTypeName) != 0) return kUnknownType;
+    try {
+        *provider = new xlsxDataProvider;
+    } catch (...) {
+        return kFailed;
+    }
+    return 0;
+}
+
+}  // namespace dp

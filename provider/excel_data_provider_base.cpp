@@ -1,0 +1,61 @@
+#include "provider/excel_data_provider_base.h"
+
+#include "model/reference_count.h"
+
+// The provider's life.
+namespace dp {
+
+namespace {
+
+// What missing numbers are replaced from and to until the host says otherwise: the initial missing
+// value, whatever SetMissingValue has made of it since.
+constexpr double kInitialMissingNumeric = 1.23456e30;
+
+}  // namespace
+
+ExcelDataProviderBase::ExcelDataProviderBase() { ResetInternalData(); }
+
+ExcelDataProviderBase::~ExcelDataProviderBase() = default;
+
+unsigned ExcelDataProviderBase::AddRef() { return ++_refCount; }
+
+void ExcelDataProviderBase::Release() {
+    if (releaseReference(_refCount)) delete this;
+}
+
+void ExcelDataProviderBase::ClearWorksheets() { ResetInternalData(); }
+
+void ExcelDataProviderBase::ResetInternalData() {
+    _previewing = false;
+    _worksheetIndex = -1;
+    _worksheetColumns.clear();
+    _worksheetNames.clear();
+    _cells.clear();
+    _texts.reset();
+    _columnKeys.items.clear();
+    _allWorksheetKeys.items.clear();
+    _worksheetKeys.items.clear();
+    _writeVariableNames = true;
+    _missingNumericFrom = kInitialMissingNumeric;
+    _missingNumericTo = kInitialMissingNumeric;
+    _alphaMissingNumericSet = false;
+    _sheetReadOptions.clear();
+    _ignoreBlankRows = false;
+    _blankRows.clear();
+    _padColumnsWithMissing = false;
+    _lastRows.clear();
+    _cleanTextValues = false;
+    _cleanWorksheetNames = false;
+    _convertDateTimeToText = false;
+    _columnReadOptions.clear();
+    _maxVariableNameLength = kNotSet;
+    _error = 0;
+    _defaultVariableNameRowSetting = EVariableNameRowSetting{kNotSet};
+}
+
+IWorksheetFinder* ExcelDataProviderBase::GetWorksheetFinder() { return this; }
+IVariableFinder* ExcelDataProviderBase::GetVariableFinder() { return this; }
+std::string ExcelDataProviderBase::GetTempDirectoryPath() const { return {}; }
+std::string ExcelDataProviderBase::GetFileName() const { return _fileName; }
+
+}  // namespace dp

@@ -1,0 +1,57 @@
+#include "provider/package.h"
+
+#include <exception>
+
+#include <boost/filesystem.hpp>
+
+#include "readers/xml_reader.h"
+
+namespace dp {
+
+namespace {
+
+// Whether libxml2 can read the workbook part as far as its sheet list. The elements on the way need
+// not be there: only an error counts.
+bool isReadable(const std::string& workbookPart) {
+    try {
+        XmlReader reader;
+        reader.mInitialize(workbookPart);
+        for (const char* element : {"workbook", "bookViews", "sheets"})
+            if (!reader.mGotoElement(element)) break;
+        return true;
+    } catch (const CmXmlException&) {
+        return false;
+    } catch (const std::exception&) {
+        return false;
+    }
+}
+
+}  // namespace
+
+long resultCode(PackageStatus status) {
+    switch (status) {
+        case PackageStatus::Success:
+            return 0;
+        case PackageStatus::SourceMissing:
+            return -17;
+        case PackageStatus::DirectoryUnusable:
+            return -18;
+        case PackageStatus::NotAPackage:
+            return -22;
+        case PackageStatus::NotAWorkbook:
+            return -25;
+        case PackageStatus::EntryError:
+        case PackageStatus::ArchiveNotClosed:
+            return -1;
+    }
+    return -1;
+}
+
+PackageStatus checkWorkbook(const std::string& directory) {
+    const std::string workbook = directory + "/xl/workbook.xml";
+    const bool complete = boost::filesystem::exists(directory + "/xl/styles.xml") &&
+                          boost::filesystem::exists(workbook) && isReadable(workbook);
+    return complete ? PackageStatus::Success : PackageStatus::NotAWorkbook;
+}
+
+}  // namespace dp

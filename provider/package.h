@@ -1,0 +1,31 @@
+#pragma once
+
+#include <string>
+
+// Unpacking of .xlsx packages.
+namespace dp {
+
+// How a step of opening ended.
+enum class PackageStatus : int {
+    Success = 0,
+    SourceMissing = 3,      // no such file, or not a regular one
+    EntryError = 5,         // an entry cannot be read, written or checked
+    NotAPackage = 7,        // another extension, or not a ZIP archive
+    DirectoryUnusable = 9,  // the temporary directory, or the copy in it, cannot be made
+    ArchiveNotClosed = 10,
+    NotAWorkbook = 13  // no style sheet or workbook part, or the latter is not XML
+};
+
+// The code by which the host learns of it.
+long resultCode(PackageStatus status);
+
+// Unpacks the archive at `archive` into `directory`, an absolute path that exists. Entries are
+// streamed; nothing outside the directory is written, and the archive itself is not overwritten.
+// What was written stays there after a failure.
+PackageStatus unpackArchive(const std::string& archive, const std::string& directory);
+
+// Whether the unpacked package in `directory` is a workbook. Throws the file system's error when
+// its parts cannot be looked up.
+PackageStatus checkWorkbook(const std::string& directory);
+
+}  // namespace dp

@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string>
+
+#include "model/host/export.h"
+
+namespace dp {
+
+// Makes a directory of its own under the system's temporary directory, readable by its owner only
+// whatever the umask. Returns its absolute path, empty when it cannot be made. Throws the file
+// system's error when there is no temporary directory.
+std::string makePrivateDirectory();
+
+// Removes a directory with everything below it; a path that names no directory is left alone, and
+// what cannot be removed stays.
+DPXLSX_API void removeDirectoryAndContents(const std::string& path);
+
+}  // namespace dp

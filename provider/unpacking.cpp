@@ -1,0 +1,139 @@
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <memory>
+#include <sys/stat.h>
+#include <utility>
+
+#include <boost/filesystem.hpp>
+#include <minizip/unzip.h>
+
+#include "provider/entry_name.h"
+#include "provider/package.h"
+
+// The archive's entries, one after the other, into the private directory.
+namespace dp {
+
+namespace {
+
+namespace fs = boost::filesystem;
+
+constexpr std::size_t kBufferSize = 8192;  // bytes
+constexpr std::size_t kLongestName = 255;  // bytes; longer names are cut
+constexpr int kEntryFailed = UNZ_INTERNALERROR;
+
+// A file being written; closes with it.
+class OutputFile {
+  public:
+    // Never through a link: nothing in the private directory is one unless somebody else put it
+    // there.
+    explicit OutputFile(const std::string& path)
+        : descriptor_(::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOFOLLOW | O_CLOEXEC,
+                             S_IRUSR | S_IWUSR)) {}
+    ~OutputFile() {
+        if (isOpen()) ::close(descriptor_);
+    }
+    OutputFile(const OutputFile&) = delete;
+    OutputFile& operator=(const OutputFile&) = delete;
+
+    bool isOpen() const { return descriptor_ >= 0; }
+
+    bool write(const char* bytes, std::size_t size) {
+        while (size > 0) {
+            const ssize_t written = ::write(descriptor_, bytes, size);
+            if (written < 0 && errno == EINTR) continue;
+            if (written <= 0) return false;
+            bytes += written;
+            size -= static_cast<std::size_t>(written);
+        }
+        return true;
+    }
+
+    // False when the file system reports only now that something was not written.
+    bool close() { return ::close(std::exchange(descriptor_, -1)) == 0; }
+
+  private:
+    int descriptor_;
+};
+
+class Unpacking {
+  public:
+    Unpacking(unzFile archive, const std::string& archivePath, const std::string& directory)
+        : archive_(archive), archivePath_(archivePath), directory_(directory) {}
+
+    PackageStatus run() {
+        int result = unzGoToFirstFile(archive_);
+        while (result == UNZ_OK) {
+            result = unpackEntry();
+            if (result == UNZ_OK) result = unzGoToNextFile(archive_);
+        }
+        return result == UNZ_END_OF_LIST_OF_FILE ? PackageStatus::Success
+                                                 : PackageStatus::EntryError;
+    }
+
+  private:
+    int unpackEntry() {
+        std::array<char, kLongestName + 1> name{};
+        const int result = unzGetCurrentFileInfo64(archive_, nullptr, name.data(), kLongestName,
+                                                   nullptr, 0, nullptr, 0);
+        if (result != UNZ_OK) return result;
+        EntryName entry;
+        if (!parseEntryName(name.data(), entry)) return kEntryFailed;
+        const fs::path parent = fs::path(directory_) / entry.directory;
+        if (!makeDirectory(parent)) return kEntryFailed;
+        return entry.file.empty() ? UNZ_OK : unpackFile((parent / entry.file).string());
+    }
+
+    // True when `path`, in the private directory, is a directory now; links do not count as one.
+    bool makeDirectory(const fs::path& path) const {
+        boost::system::error_code error;
+        fs::create_directories(path, error);
+        if (error) return false;
+        for (fs::path part = path; part != directory_; part = part.parent_path())
+            if (!fs::is_directory(fs::symlink_status(part, error)) || error) return false;
+        return true;
+    }
+
+    int unpackFile(const std::string& path) {
+        boost::system::error_code error;
+        if (fs::equivalent(path, archivePath_, error)) return kEntryFailed;
+        int result = unzOpenCurrentFile(archive_);
+        if (result != UNZ_OK) return result;
+        result = copyCurrentFile(path);
+        const int closed = unzCloseCurrentFile(archive_);
+        return result != UNZ_OK ? result : closed;
+    }
+
+    // The last read result: 0 at the entry's end, negative on an error.
+    int copyCurrentFile(const std::string& path) {
+        OutputFile file(path);
+        if (!file.isOpen()) return kEntryFailed;
+        std::array<char, kBufferSize> buffer;
+        int size = 0;
+        while ((size = unzReadCurrentFile(archive_, buffer.data(), kBufferSize)) > 0)
+            if (!file.write(buffer.data(), static_cast<std::size_t>(size))) return kEntryFailed;
+        if (!file.close()) return kEntryFailed;
+        return size;
+    }
+
+    unzFile archive_;
+    const std::string& archivePath_;
+    const std::string& directory_;
+};
+
+}  // namespace
+
+PackageStatus unpackArchive(const std::string& archivePath, const std::string& directory) {
+    const unzFile archive = unzOpen64(archivePath.c_str());
+    if (!archive) return PackageStatus::NotAPackage;
+    // Closed when an allocation fails on the way.
+    std::unique_ptr<void, int (*)(unzFile)> owner(archive, unzClose);
+    const PackageStatus status = Unpacking(archive, archivePath, directory).run();
+    const int closed = unzClose(owner.release());
+    return status == PackageStatus::Success && closed != UNZ_OK ? PackageStatus::ArchiveNotClosed
+                                                                : status;
+}
+
+}  // namespace dp

@@ -1,0 +1,96 @@
+#include "provider/xlsx_data_provider.h"
+
+#include <algorithm>
+#include <cctype>
+
+#include <boost/filesystem.hpp>
+
+#include "formats/format_codes.h"
+#include "formats/numeric_variable_format.h"
+#include "model/string.h"
+#include "provider/file_type.h"
+#include "provider/temporary_directory.h"
+
+namespace dp {
+
+namespace fs = boost::filesystem;
+
+xlsxDataProvider::xlsxDataProvider() = default;
+
+xlsxDataProvider::~xlsxDataProvider() {
+    _reader.reset();
+    removeDirectoryAndContents(_tempDirectory);
+}
+
+PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
+    removeDirectoryAndContents(_tempDirectory);
+    fs::path source(textOrEmpty(fileName));
+    if (!source.has_root_directory()) source = fs::current_path() / source;
+    if (!fs::is_regular_file(source)) return PackageStatus::SourceMissing;
+    if (!hasXlsxExtension(source.string())) return PackageStatus::NotAPackage;
+
+    std::string directory = makePrivateDirectory();
+    if (directory.empty()) return PackageStatus::DirectoryUnusable;
+    _tempDirectory = std::move(directory);
+    const fs::path copy = fs::path(_tempDirectory) / source.filename();
+    boost::system::error_code error;
+    fs::copy_file(source, copy, fs::copy_option::fail_if_exists, error);
+    if (error) {
+        removeDirectoryAndContents(_tempDirectory);
+        return PackageStatus::DirectoryUnusable;
+    }
+    const PackageStatus status = unpackArchive(copy.string(), _tempDirectory);
+    return status == PackageStatus::Success ? checkWorkbook(_tempDirectory) : status;
+}
+
+void xlsxDataProvider::removeUnpackedFile() {
+    removeDirectoryAndContents(_tempDirectory);
+    _tempDirectory.clear();
+}
+
+long xlsxDataProvider::OpenFile(const char* fileName, FileAccess access) {
+    if (access != FileAccess::Read) return -1;
+    const PackageStatus status = unzipFile(fileName);
+    if (status != PackageStatus::Success) return resultCode(status);
+    const bool hasSharedStrings = fs::exists(_tempDirectory + "/xl/sharedStrings.xml");
+    _reader = std::make_shared<ExcelXLSXReader>(_tempDirectory, hasSharedStrings,
+                                                GetShortDateMask(), GetMissingValue(), this,
+                                                GetDateTimeVariableFormatHelper());
+    _reader->startAtWorksheet(static_cast<int>(_worksheetNames.size()));
+    _reader->mReadExcelWorkbook();
+    return resultCode(status);
+}
+
+long xlsxDataProvider::GetWorksheets(const char* fileName, std::vector<std::string>& names) {
+    PackageStatus status = unzipFile(fileName);
+    if (status != PackageStatus::Success) return resultCode(status);
+    try {
+        excel_xlsx::GetWorksheets(_tempDirectory, names);
+    } catch (const CmXmlException&) {
+        status = PackageStatus::NotAWorkbook;
+    }
+    removeUnpackedFile();
+    return resultCode(status);
+}
+
+long xlsxDataProvider::CloseFile() {
+    _reader.reset();
+    removeUnpackedFile();
+    return 0;
+}
+
+std::string xlsxDataProvider::GetTempDirectoryPath() const { return _tempDirectory; }
+
+IVariableFormat* xlsxDataProvider::CreateVextralNumericFormat(
+    const ExternalDataRecordCell& cell) const {
+    if (_reader) return _reader->createVextralNumericFormat(cell.formatIndex);
+    auto format = std::make_unique<NumericVariableFormat>();
+    format->autoFormat = true;
+    return format.release();
+}
+
+bool xlsxDataProvider::IsDateTimeFormatType(const ExternalDataRecordCell& cell) const {
+    return _reader && _reader->IsDateTimeFormatType(_reader->GetExcelFormatType(cell.formatIndex));
+}
+
+}  // namespace dp
