@@ -61,6 +61,7 @@ PooledText TextPool::following() const {
 
 PooledText TextPool::find(std::string_view text, std::uint64_t hash) const {
     const std::size_t mask = table_.tags.size() - 1;
+    __builtin_prefetch(&table_.slots[hash & mask]);  // comes in while the tag is waited for
     for (std::size_t index = hash & mask; table_.tags[index] != 0; index = (index + 1) & mask) {
         if (table_.tags[index] != tagOf(hash)) continue;
         const Slot& slot = table_.slots[index];

@@ -83,7 +83,6 @@ void WorksheetCells::file(unsigned column, const File& fileIn) {
     CellColumn cells(texts());
     fileIn(cells);
     recent_ = columns_.emplace(column, std::move(cells)).first;
-    inOrder_.clear();
 }
 
 const std::vector<const WorksheetCells::value_type*>& WorksheetCells::inOrder() const {

@@ -70,7 +70,7 @@ class DPXLSX_API WorksheetCells {
     std::shared_ptr<TextPool> texts_;
     Columns columns_;
     Columns::iterator recent_;                        // the last column filed in, if any
-    mutable std::vector<const value_type*> inOrder_;  // made when first needed
+    mutable std::vector<const value_type*> inOrder_;  // outdated while of another size
 };
 
 }  // namespace dp
