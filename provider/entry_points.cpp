@@ -30,7 +30,9 @@ bool IsMicrosoftXLSXFile(const char* fileName) { return hasXlsxExtension(textOrE
 
 const char* GetDataProviderFiletype(const char* fileName) {
     static char fileType[sizeof kTypeName];
-    std::strcpy(fileType, IsMicrosoftXLSXFile(fileName) ? kTypeName : "");
+    // One byte for the empty text, all of the name otherwise.
+    std::memcpy(fileType, kTypeName, sizeof kTypeName);
+    if (!IsMicrosoftXLSXFile(fileName)) fileType[0] = '\0';
     return fileType;
 }
 

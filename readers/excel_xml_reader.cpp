@@ -28,6 +28,8 @@ const std::string& orDefault(std::string& mask, const char* usual) {
 
 }  // namespace
 
+// The contract takes its texts by value.
+// NOLINTNEXTLINE(performance-unnecessary-value-param)
 ExcelXmlReader::ExcelXmlReader(std::string path, std::string shortDate, double missing,
                                IExcelDataProvider* receiver, IDateTimeVariableFormat* helper)
     : shortDateFormat(std::move(shortDate)),

@@ -5,7 +5,7 @@
 
 #include "model/host/export.h"
 
-struct _xmlTextReader;
+struct _xmlTextReader;  // libxml2's own name; NOLINT(bugprone-reserved-identifier)
 
 // The one exception of the readers: an XML part that cannot be opened, read or understood. Carries
 // no text; what failed is in the package, and the host shows its own message.

@@ -300,7 +300,7 @@ inline CellBlocks::Place CellBlocks::placeOf(std::size_t index) {
         const std::size_t beyond = index - kGrowing;
         return {kDoublings + 1 + beyond / kLargest, beyond % kLargest};
     }
-    const auto block = static_cast<std::size_t>(std::bit_width(index / kFirst + 1)) - 1;
+    const auto block = static_cast<std::size_t>(std::bit_width((index / kFirst + 1) / 2));
     return {block, index + kFirst - (kFirst << block)};
 }
 

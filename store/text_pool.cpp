@@ -12,7 +12,7 @@ namespace {
 
 constexpr std::size_t kFirstSlots = 16;
 constexpr std::size_t kFirstBlock = 512;
-constexpr std::size_t kLargestBlock = 64 * 1024;
+constexpr std::size_t kLargestBlock = std::size_t{64} * 1024;
 // Longer texts get a block of their own, so that a new shared block leaves little unused.
 constexpr std::size_t kLongestShared = kLargestBlock / 8;
 __extension__ using Product = unsigned __int128;
