@@ -1,0 +1,206 @@
+#include "bench/workbooks.h"
+
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+#include <fstream>
+#include <string_view>
+
+#include <minizip/zip.h>
+
+namespace bench {
+
+namespace {
+
+constexpr std::string_view kHead =
+    "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"yes\"?>\n";
+constexpr std::string_view kMain =
+    "xmlns=\"http://schemas.openxmlformats.org/spreadsheetml/2006/main\"";
+
+// A small generator with a fixed seed: the same workbook on every machine.
+class Random {
+  public:
+    std::uint32_t next() {
+        state_ = state_ * 6364136223846793005ULL + 1442695040888963407ULL;
+        return static_cast<std::uint32_t>(state_ >> 33);
+    }
+
+  private:
+    std::uint64_t state_ = 42;
+};
+
+std::string columnName(unsigned column) {
+    std::string name;
+    for (unsigned n = column + 1; n > 0; n = (n - 1) / 26)
+        name.insert(name.begin(), static_cast<char>('A' + (n - 1) % 26));
+    return name;
+}
+
+std::string number(std::uint32_t random) {
+    char text[32];
+    std::snprintf(text, sizeof text, "%u.%03u", random % 100000, random / 7 % 1000);
+    return text;
+}
+
+// 26 bytes.
+std::string textOf(unsigned index) {
+    char text[32];
+    std::snprintf(text, sizeof text, "value number %07u of all", index);
+    return text;
+}
+
+class Package {
+  public:
+    explicit Package(const std::string& path)
+        : zip_(zipOpen64(path.c_str(), APPEND_STATUS_CREATE)) {
+        if (!zip_) std::abort();
+    }
+    ~Package() { zipClose(zip_, nullptr); }
+    Package(const Package&) = delete;
+    Package& operator=(const Package&) = delete;
+
+    void begin(const std::string& name) {
+        zip_fileinfo info{};
+        if (zipOpenNewFileInZip(zip_, name.c_str(), &info, nullptr, 0, nullptr, 0, nullptr,
+                                Z_DEFLATED, Z_BEST_SPEED) != ZIP_OK)
+            std::abort();
+    }
+    void write(std::string_view text) {
+        buffer_ += text;
+        if (buffer_.size() > 1 << 20) flush();
+    }
+    void end() {
+        flush();
+        zipCloseFileInZip(zip_);
+    }
+    void add(const std::string& name, std::string_view text) {
+        begin(name);
+        write(text);
+        end();
+    }
+
+  private:
+    void flush() {
+        zipWriteInFileInZip(zip_, buffer_.data(), static_cast<unsigned>(buffer_.size()));
+        buffer_.clear();
+    }
+
+    zipFile zip_;
+    std::string buffer_;
+};
+
+void addStyles(Package& package) {
+    std::string styles(kHead);
+    styles.append("<styleSheet ").append(kMain).append(">");
+    styles += "<numFmts count=\"1\"><numFmt numFmtId=\"164\" formatCode=\"#,##0.000\"/></numFmts>";
+    styles += "<cellXfs count=\"4\"><xf numFmtId=\"0\"/><xf numFmtId=\"2\"/><xf numFmtId=\"14\"/>";
+    styles += "<xf numFmtId=\"164\"/></cellXfs></styleSheet>";
+    package.add("xl/styles.xml", styles);
+}
+
+void addWorkbook(Package& package, unsigned sheets) {
+    std::string workbook(kHead);
+    std::string relations(kHead);
+    workbook.append("<workbook ").append(kMain);
+    workbook += " xmlns:r=\"http://schemas.openxmlformats.org/officeDocument/2006/relationships\">";
+    workbook += "<bookViews><workbookView/></bookViews><sheets>";
+    relations +=
+        "<Relationships xmlns=\"http://schemas.openxmlformats.org/package/2006/relationships\">";
+    for (unsigned i = 1; i <= sheets; ++i) {
+        const std::string n = std::to_string(i);
+        workbook += "<sheet name=\"Sheet" + n + "\" sheetId=\"" + n + "\" r:id=\"rId" + n + "\"/>";
+        relations += "<Relationship Id=\"rId" + n +
+                     "\" Type=\"http://schemas.openxmlformats.org/officeDocument/2006/"
+                     "relationships/worksheet\" Target=\"worksheets/sheet" +
+                     n + ".xml\"/>";
+    }
+    package.add("xl/workbook.xml", workbook + "</sheets></workbook>");
+    package.add("xl/_rels/workbook.xml.rels", relations + "</Relationships>");
+}
+
+void addSharedStrings(Package& package, unsigned count) {
+    const std::string n = std::to_string(count);
+    package.begin("xl/sharedStrings.xml");
+    package.write(std::string(kHead).append("<sst ").append(kMain).append(
+        " count=\"" + n + "\" uniqueCount=\"" + n + "\">"));
+    for (unsigned i = 0; i < count; ++i) package.write("<si><t>" + textOf(i) + "</t></si>");
+    package.write("</sst>");
+    package.end();
+}
+
+// A cell behind its opening `<c r="..."`.
+std::string cellRest(Content content, unsigned column, std::uint32_t random, unsigned strings) {
+    const auto shared = [&] {
+        return " t=\"s\"><v>" + std::to_string(random % strings) + "</v></c>";
+    };
+    if (content == Content::Texts) return shared();
+    if (content == Content::Numbers) return "><v>" + number(random) + "</v></c>";
+    switch (column % 5) {
+        case 0:
+            return " s=\"1\"><v>" + number(random) + "</v></c>";
+        case 1:
+            return shared();
+        case 2:
+            return " s=\"2\"><v>" + std::to_string(40000 + random % 5000) + "</v></c>";
+        case 3:
+            return " t=\"b\"><v>" + std::to_string(random % 2) + "</v></c>";
+        default:
+            return " s=\"3\"><f>A1*2</f><v>" + number(random) + "</v></c>";
+    }
+}
+
+void addWorksheet(Package& package, unsigned sheet, const Workload& workload, unsigned strings,
+                  Random& random) {
+    package.begin("xl/worksheets/sheet" + std::to_string(sheet) + ".xml");
+    package.write(std::string(kHead).append("<worksheet ").append(kMain).append("><sheetData>"));
+    for (unsigned row = 1; row <= workload.rows; ++row) {
+        const std::string r = std::to_string(row);
+        package.write("<row r=\"" + r + "\">");
+        for (unsigned column = 0; column < workload.columns; ++column)
+            package.write("<c r=\"" + columnName(column) + r + "\"" +
+                          cellRest(workload.content, column, random.next(), strings));
+        package.write("</row>");
+    }
+    package.write("</sheetData></worksheet>");
+    package.end();
+}
+
+}  // namespace
+
+void writeWorkbook(const std::string& path, const Workload& workload) {
+    Package package(path);
+    Random random;
+    const auto strings = static_cast<unsigned>(workload.cells() / 2 + 1);
+    package.add("[Content_Types].xml", std::string(kHead) + "<Types/>");
+    addStyles(package);
+    addWorkbook(package, workload.sheets);
+    if (workload.content != Content::Numbers) addSharedStrings(package, strings);
+    for (unsigned sheet = 1; sheet <= workload.sheets; ++sheet)
+        addWorksheet(package, sheet, workload, strings, random);
+}
+
+void writeSpreadsheet2003(const std::string& path, unsigned rows, unsigned columns) {
+    std::ofstream file(path);
+    file << kHead << "<Workbook xmlns=\"urn:schemas-microsoft-com:office:spreadsheet\" "
+         << "xmlns:ss=\"urn:schemas-microsoft-com:office:spreadsheet\"><Styles>"
+         << "<Style ss:ID=\"s1\"><NumberFormat ss:Format=\"0.00\"/></Style></Styles>"
+         << "<Worksheet ss:Name=\"Sheet1\"><Table ss:ExpandedColumnCount=\"" << columns
+         << "\" ss:ExpandedRowCount=\"" << rows << "\">\n";
+    Random random;
+    for (unsigned row = 0; row < rows; ++row) {
+        file << "<Row>";
+        for (unsigned column = 0; column < columns; ++column) {
+            const std::uint32_t value = random.next();
+            if (column % 2 == 0)
+                file << "<Cell ss:StyleID=\"s1\"><Data ss:Type=\"Number\">" << number(value)
+                     << "</Data></Cell>";
+            else
+                file << "<Cell><Data ss:Type=\"String\">" << textOf(value % (rows * columns))
+                     << "</Data></Cell>";
+        }
+        file << "</Row>\n";
+    }
+    file << "</Table><WorksheetOptions/></Worksheet></Workbook>\n";
+}
+
+}  // namespace bench

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <string>
+
+// Workbooks to measure with, made on the spot and the same in every run.
+namespace bench {
+
+enum class Content { Numbers, Texts, Mixed };
+
+struct Workload {
+    const char* name;
+    Content content;
+    unsigned sheets;
+    unsigned rows;
+    unsigned columns;
+
+    unsigned long cells() const { return 1UL * sheets * rows * columns; }
+};
+
+// Writes a package of that shape.
+void writeWorkbook(const std::string& path, const Workload& workload);
+
+// Writes an XML Spreadsheet 2003 document of one mixed worksheet.
+void writeSpreadsheet2003(const std::string& path, unsigned rows, unsigned columns);
+
+}  // namespace bench
