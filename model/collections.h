@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cassert>
-#include <utility>
 #include <vector>
 
 #include "model/host/i_read_only_collection.h"
@@ -16,13 +14,11 @@ class ReadOnlyCollection;
 template <>
 class DPXLSX_API ReadOnlyCollection<int> : public IReadOnlyCollection<int> {
   public:
-    ReadOnlyCollection() = default;
+    ReadOnlyCollection();
+    ~ReadOnlyCollection() override;
 
-    unsigned long Count() const override { return items.size(); }
-    int Item(unsigned long index) const override {
-        assert(index < items.size());
-        return items[index];
-    }
+    unsigned long Count() const override;
+    int Item(unsigned long index) const override;
 
     std::vector<int> items;
 };
@@ -34,13 +30,11 @@ class ReadOnlyStringCollection;
 template <>
 class DPXLSX_API ReadOnlyStringCollection<IString&> : public IReadOnlyCollection<IString&> {
   public:
-    ReadOnlyStringCollection() = default;
+    ReadOnlyStringCollection();
+    ~ReadOnlyStringCollection() override;
 
-    unsigned long Count() const override { return items.size(); }
-    IString& Item(unsigned long index) const override {
-        assert(index < items.size());
-        return items[index];
-    }
+    unsigned long Count() const override;
+    IString& Item(unsigned long index) const override;
 
     // The interface promises a modifiable string from a collection that is itself only read.
     mutable std::vector<String> items;

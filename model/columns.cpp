@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <locale>
+#include <stdexcept>
 #include <string>
 
 #include "model/reference_count.h"
@@ -10,11 +11,20 @@ namespace dp {
 
 namespace {
 
+// The environment may name a locale that the machine does not have.
+std::locale environmentLocale() {
+    try {
+        return std::locale("");
+    } catch (const std::runtime_error&) {
+        return std::locale::classic();
+    }
+}
+
 // The decimal point of the environment's locale, asked for once in the life of the process.
 char environmentDecimalPoint() {
     static std::string output_decimal;
     if (output_decimal.empty()) {
-        const std::locale environment("");
+        const std::locale environment = environmentLocale();
         output_decimal.assign(1, std::use_facet<std::numpunct<char>>(environment).decimal_point());
     }
     return output_decimal[0];
@@ -22,14 +32,52 @@ char environmentDecimalPoint() {
 
 }  // namespace
 
-NumericColumn::~NumericColumn() = default;
-TextColumn::~TextColumn() = default;
+ColumnView::ColumnView() = default;
+ColumnView::~ColumnView() = default;
 
-void NumericColumn::Release() {
-    if (releaseReference(refCount)) delete this;
+bool ColumnView::GetAutoWiden() const { return autoWiden; }
+bool ColumnView::GetWidthSet() const { return widthSet; }
+bool ColumnView::GetHidden() const { return hidden; }
+double ColumnView::GetWidth() const { return width; }
+
+ColumnOrdering::ColumnOrdering() = default;
+ColumnOrdering::~ColumnOrdering() = default;
+
+int ColumnOrdering::GetValueOrder() const { return valueOrder; }
+const IReadOnlyCollection<IString&>* ColumnOrdering::GetOrderedTextValues() const {
+    return &orderedTextValues;
 }
 
-void TextColumn::Release() {
+NumericColumn::NumericColumn() = default;
+NumericColumn::~NumericColumn() = default;
+
+unsigned NumericColumn::AddRef() { return ++refCount; }
+int NumericColumn::GetDataType() const { return dataType; }
+IVariable::StorageType NumericColumn::GetStorageType() const { return StorageType::Numeric; }
+const IString* NumericColumn::GetName() const { return &name; }
+const IString* NumericColumn::GetDescription() const { return &description; }
+int NumericColumn::GetLastModified() const { return lastModified; }
+int NumericColumn::GetMissingCount() const { return missingCount; }
+int NumericColumn::GetRowCount() const { return rowCount; }
+IVariableFormat* NumericColumn::GetFormat() const { return format.get(); }
+const IColumnView* NumericColumn::GetView() const { return &view; }
+bool NumericColumn::IsFormatDirty() const { return formatDirty; }
+const double* NumericColumn::GetValues() const { return values.get(); }
+int NumericColumn::GetConvertedMissingCount() const { return convertedMissingCount; }
+int NumericColumn::GetPrimeKey() const { return primeKey; }
+void NumericColumn::SetPrimeKey(int key) { primeKey = key; }
+int NumericColumn::GetVariableBodyPrimeKey() const { return variableBodyPrimeKey; }
+void NumericColumn::SetVariableBodyPrimeKey(int key) { variableBodyPrimeKey = key; }
+int NumericColumn::GetOriginalVariablePrimeKey() const { return originalVariablePrimeKey; }
+void NumericColumn::SetOriginalVariablePrimeKey(int key) { originalVariablePrimeKey = key; }
+bool NumericColumn::UseDefaultVariableBody() const { return useDefaultVariableBody; }
+int NumericColumn::GetType() const { return 3; }
+int NumericColumn::GetPosition() const { return position; }
+int NumericColumn::GetWorksheetId() const { return worksheetId; }
+bool NumericColumn::Attached() const { return attached; }
+bool NumericColumn::IsCopy() const { return isCopy; }
+
+void NumericColumn::Release() {
     if (releaseReference(refCount)) delete this;
 }
 
@@ -46,6 +94,39 @@ IString* NumericColumn::GetFormattedValue(double value, char decimal) const {
     std::string replaced = text->database_str();
     std::replace(replaced.begin(), replaced.end(), point, decimal);
     return new String(std::move(replaced));
+}
+
+TextColumn::TextColumn() = default;
+TextColumn::~TextColumn() = default;
+
+unsigned TextColumn::AddRef() { return ++refCount; }
+int TextColumn::GetDataType() const { return 4; }
+IVariable::StorageType TextColumn::GetStorageType() const { return StorageType::Text; }
+const IString* TextColumn::GetName() const { return &name; }
+const IString* TextColumn::GetDescription() const { return &description; }
+int TextColumn::GetLastModified() const { return lastModified; }
+int TextColumn::GetMissingCount() const { return missingCount; }
+int TextColumn::GetRowCount() const { return rowCount; }
+IVariableFormat* TextColumn::GetFormat() const { return format.get(); }
+const IColumnView* TextColumn::GetView() const { return &view; }
+bool TextColumn::IsFormatDirty() const { return formatDirty; }
+const IReadOnlyCollection<IString&>* TextColumn::GetTextValues() const { return &textValues; }
+const IColumnOrdering* TextColumn::GetOrdering() const { return &ordering; }
+int TextColumn::GetPrimeKey() const { return primeKey; }
+void TextColumn::SetPrimeKey(int key) { primeKey = key; }
+int TextColumn::GetVariableBodyPrimeKey() const { return variableBodyPrimeKey; }
+void TextColumn::SetVariableBodyPrimeKey(int key) { variableBodyPrimeKey = key; }
+int TextColumn::GetOriginalVariablePrimeKey() const { return originalVariablePrimeKey; }
+void TextColumn::SetOriginalVariablePrimeKey(int key) { originalVariablePrimeKey = key; }
+bool TextColumn::UseDefaultVariableBody() const { return useDefaultVariableBody; }
+int TextColumn::GetType() const { return 3; }
+int TextColumn::GetPosition() const { return position; }
+int TextColumn::GetWorksheetId() const { return worksheetId; }
+bool TextColumn::Attached() const { return attached; }
+bool TextColumn::IsCopy() const { return isCopy; }
+
+void TextColumn::Release() {
+    if (releaseReference(refCount)) delete this;
 }
 
 }  // namespace dp

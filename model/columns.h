@@ -14,12 +14,13 @@ namespace dp {
 
 class DPXLSX_API ColumnView : public IColumnView {
   public:
-    ColumnView() = default;
+    ColumnView();
+    ~ColumnView() override;
 
-    bool GetAutoWiden() const override { return autoWiden; }
-    bool GetWidthSet() const override { return widthSet; }
-    bool GetHidden() const override { return hidden; }
-    double GetWidth() const override { return width; }
+    bool GetAutoWiden() const override;
+    bool GetWidthSet() const override;
+    bool GetHidden() const override;
+    double GetWidth() const override;
 
     bool autoWiden = true;
     bool widthSet = false;
@@ -29,12 +30,11 @@ class DPXLSX_API ColumnView : public IColumnView {
 
 class DPXLSX_API ColumnOrdering : public IColumnOrdering {
   public:
-    ColumnOrdering() = default;
+    ColumnOrdering();
+    ~ColumnOrdering() override;
 
-    int GetValueOrder() const override { return valueOrder; }
-    const IReadOnlyCollection<IString&>* GetOrderedTextValues() const override {
-        return &orderedTextValues;
-    }
+    int GetValueOrder() const override;
+    const IReadOnlyCollection<IString&>* GetOrderedTextValues() const override;
 
     std::int32_t valueOrder = 0;
     ReadOnlyStringCollection<IString&> orderedTextValues;
@@ -45,41 +45,41 @@ class DPXLSX_API NumericColumn : public INumericColumn {
     static constexpr int kNumbers = 0;    // values of dataType
     static constexpr int kDateTimes = 2;  // serial day numbers
 
-    NumericColumn() = default;
+    NumericColumn();
     NumericColumn(const NumericColumn&) = delete;
     NumericColumn& operator=(const NumericColumn&) = delete;
     ~NumericColumn() override;
 
-    unsigned AddRef() override { return ++refCount; }
+    unsigned AddRef() override;
     void Release() override;
 
-    int GetDataType() const override { return dataType; }
-    StorageType GetStorageType() const override { return StorageType::Numeric; }
-    const IString* GetName() const override { return &name; }
-    const IString* GetDescription() const override { return &description; }
-    int GetLastModified() const override { return lastModified; }
-    int GetMissingCount() const override { return missingCount; }
-    int GetRowCount() const override { return rowCount; }
-    IVariableFormat* GetFormat() const override { return format.get(); }
-    const IColumnView* GetView() const override { return &view; }
-    bool IsFormatDirty() const override { return formatDirty; }
+    int GetDataType() const override;
+    StorageType GetStorageType() const override;
+    const IString* GetName() const override;
+    const IString* GetDescription() const override;
+    int GetLastModified() const override;
+    int GetMissingCount() const override;
+    int GetRowCount() const override;
+    IVariableFormat* GetFormat() const override;
+    const IColumnView* GetView() const override;
+    bool IsFormatDirty() const override;
 
-    const double* GetValues() const override { return values.get(); }
-    int GetConvertedMissingCount() const override { return convertedMissingCount; }
+    const double* GetValues() const override;
+    int GetConvertedMissingCount() const override;
     IString* GetFormattedValue(double value, char decimal) const override;
 
-    int GetPrimeKey() const override { return primeKey; }
-    void SetPrimeKey(int key) override { primeKey = key; }
-    int GetVariableBodyPrimeKey() const override { return variableBodyPrimeKey; }
-    void SetVariableBodyPrimeKey(int key) override { variableBodyPrimeKey = key; }
-    int GetOriginalVariablePrimeKey() const override { return originalVariablePrimeKey; }
-    void SetOriginalVariablePrimeKey(int key) override { originalVariablePrimeKey = key; }
-    bool UseDefaultVariableBody() const override { return useDefaultVariableBody; }
-    int GetType() const override { return 3; }
-    int GetPosition() const override { return position; }
-    int GetWorksheetId() const override { return worksheetId; }
-    bool Attached() const override { return attached; }
-    bool IsCopy() const override { return isCopy; }
+    int GetPrimeKey() const override;
+    void SetPrimeKey(int key) override;
+    int GetVariableBodyPrimeKey() const override;
+    void SetVariableBodyPrimeKey(int key) override;
+    int GetOriginalVariablePrimeKey() const override;
+    void SetOriginalVariablePrimeKey(int key) override;
+    bool UseDefaultVariableBody() const override;
+    int GetType() const override;
+    int GetPosition() const override;
+    int GetWorksheetId() const override;
+    bool Attached() const override;
+    bool IsCopy() const override;
 
     String name;
     String description;  // never filled
@@ -105,40 +105,40 @@ class DPXLSX_API NumericColumn : public INumericColumn {
 
 class DPXLSX_API TextColumn : public ITextColumn {
   public:
-    TextColumn() = default;
+    TextColumn();
     TextColumn(const TextColumn&) = delete;
     TextColumn& operator=(const TextColumn&) = delete;
     ~TextColumn() override;
 
-    unsigned AddRef() override { return ++refCount; }
+    unsigned AddRef() override;
     void Release() override;
 
-    int GetDataType() const override { return 4; }
-    StorageType GetStorageType() const override { return StorageType::Text; }
-    const IString* GetName() const override { return &name; }
-    const IString* GetDescription() const override { return &description; }
-    int GetLastModified() const override { return lastModified; }
-    int GetMissingCount() const override { return missingCount; }
-    int GetRowCount() const override { return rowCount; }
-    IVariableFormat* GetFormat() const override { return format.get(); }
-    const IColumnView* GetView() const override { return &view; }
-    bool IsFormatDirty() const override { return formatDirty; }
+    int GetDataType() const override;
+    StorageType GetStorageType() const override;
+    const IString* GetName() const override;
+    const IString* GetDescription() const override;
+    int GetLastModified() const override;
+    int GetMissingCount() const override;
+    int GetRowCount() const override;
+    IVariableFormat* GetFormat() const override;
+    const IColumnView* GetView() const override;
+    bool IsFormatDirty() const override;
 
-    const IReadOnlyCollection<IString&>* GetTextValues() const override { return &textValues; }
-    const IColumnOrdering* GetOrdering() const override { return &ordering; }
+    const IReadOnlyCollection<IString&>* GetTextValues() const override;
+    const IColumnOrdering* GetOrdering() const override;
 
-    int GetPrimeKey() const override { return primeKey; }
-    void SetPrimeKey(int key) override { primeKey = key; }
-    int GetVariableBodyPrimeKey() const override { return variableBodyPrimeKey; }
-    void SetVariableBodyPrimeKey(int key) override { variableBodyPrimeKey = key; }
-    int GetOriginalVariablePrimeKey() const override { return originalVariablePrimeKey; }
-    void SetOriginalVariablePrimeKey(int key) override { originalVariablePrimeKey = key; }
-    bool UseDefaultVariableBody() const override { return useDefaultVariableBody; }
-    int GetType() const override { return 3; }
-    int GetPosition() const override { return position; }
-    int GetWorksheetId() const override { return worksheetId; }
-    bool Attached() const override { return attached; }
-    bool IsCopy() const override { return isCopy; }
+    int GetPrimeKey() const override;
+    void SetPrimeKey(int key) override;
+    int GetVariableBodyPrimeKey() const override;
+    void SetVariableBodyPrimeKey(int key) override;
+    int GetOriginalVariablePrimeKey() const override;
+    void SetOriginalVariablePrimeKey(int key) override;
+    bool UseDefaultVariableBody() const override;
+    int GetType() const override;
+    int GetPosition() const override;
+    int GetWorksheetId() const override;
+    bool Attached() const override;
+    bool IsCopy() const override;
 
     String name;
     String description;  // never filled

@@ -13,16 +13,17 @@ namespace dp {
 
 class DPXLSX_API ExpressionError : public IExpressionError {
   public:
-    ExpressionError() = default;
-    ExpressionError(const ExpressionError&) = default;
-    ExpressionError& operator=(const ExpressionError&) = default;
+    ExpressionError();
+    ExpressionError(const ExpressionError& other);
+    ExpressionError& operator=(const ExpressionError& other);
+    ~ExpressionError() override;
 
-    int GetCode() const override { return code; }
-    int GetPosition() const override { return position; }
-    int GetLine() const override { return line; }
-    int GetRepeatCount() const override { return repeatCount; }
-    int GetLetter() const override { return letter; }
-    int GetArgumentCount() const override { return argumentCount; }
+    int GetCode() const override;
+    int GetPosition() const override;
+    int GetLine() const override;
+    int GetRepeatCount() const override;
+    int GetLetter() const override;
+    int GetArgumentCount() const override;
 
     int code = 0;
     int argumentCount = 0;
@@ -35,17 +36,22 @@ class DPXLSX_API ExpressionError : public IExpressionError {
 // What all nodes share. Parents and children are borrowed: a node's copy points to the same ones.
 class DPXLSX_API FormulaNode : public IFormulaNode {
   public:
-    int GetPrimeKey() const override { return primeKey; }
-    void SetPrimeKey(int key) override { primeKey = key; }
-    bool GetDirty() const override { return dirty; }
-    int GetState() const override { return state; }
-    int GetParentNodeCount() const override { return static_cast<int>(parentNodes.size()); }
-    int GetChildNodeCount() const override { return static_cast<int>(childNodes.size()); }
+    FormulaNode();
+    FormulaNode(const FormulaNode& other);
+    FormulaNode& operator=(const FormulaNode& other);
+    ~FormulaNode() override;
+
+    int GetPrimeKey() const override;
+    void SetPrimeKey(int key) override;
+    bool GetDirty() const override;
+    int GetState() const override;
+    int GetParentNodeCount() const override;
+    int GetChildNodeCount() const override;
     IFormulaNode* GetParentNode(int index) const override;
     IFormulaNode* GetChildNode(int index) const override;
 
-    virtual void SetParentNode(IFormulaNode* node) { parentNodes.push_back(node); }
-    virtual void SetChildNode(IFormulaNode* node) { childNodes.push_back(node); }
+    virtual void SetParentNode(IFormulaNode* node);
+    virtual void SetChildNode(IFormulaNode* node);
     // This node through the interface of its own kind.
     virtual IFormulaNode* GetFormulaNodeInterface() = 0;
 
@@ -77,17 +83,22 @@ class DPXLSX_API FormulaNodeOf : public FormulaNode, public Interface {
     IFormulaNode* GetFormulaNodeInterface() override { return static_cast<Interface*>(this); }
 };
 
+extern template class FormulaNodeOf<IFormulaVariableNode, 0>;
+extern template class FormulaNodeOf<IFormulaModelNode, 1>;
+extern template class FormulaNodeOf<IFormulaModelVariableNode, 2>;
+
 class DPXLSX_API FormulaVariableNode : public FormulaNodeOf<IFormulaVariableNode, 0> {
   public:
-    int GetVariablePrimeKey() const override { return variablePrimeKey; }
-    int GetVariablePositionCount() const override {
-        return static_cast<int>(variablePositions.size());
-    }
+    FormulaVariableNode();
+    FormulaVariableNode(const FormulaVariableNode& other);
+    FormulaVariableNode& operator=(const FormulaVariableNode& other);
+    ~FormulaVariableNode() override;
+
+    int GetVariablePrimeKey() const override;
+    int GetVariablePositionCount() const override;
     void GetVariablePosition(int index, int* value, int* key) const override;
-    const char* GetFormula() const override { return formula.database_str(); }
-    int GetExpressionErrorCount() const override {
-        return static_cast<int>(expressionErrors.size());
-    }
+    const char* GetFormula() const override;
+    int GetExpressionErrorCount() const override;
     const IExpressionError* GetExpressionError(int index) const override;
 
     std::map<int, int> variablePositions;
@@ -98,10 +109,15 @@ class DPXLSX_API FormulaVariableNode : public FormulaNodeOf<IFormulaVariableNode
 
 class DPXLSX_API FormulaModelNode : public FormulaNodeOf<IFormulaModelNode, 1> {
   public:
-    int GetModelPrimeKey() const override { return modelPrimeKey; }
-    int GetVariablePrimeKey() const override { return variablePrimeKey; }
-    const char* GetTerms() const override { return terms.database_str(); }
-    int GetModelType() const override { return modelType; }
+    FormulaModelNode();
+    FormulaModelNode(const FormulaModelNode& other);
+    FormulaModelNode& operator=(const FormulaModelNode& other);
+    ~FormulaModelNode() override;
+
+    int GetModelPrimeKey() const override;
+    int GetVariablePrimeKey() const override;
+    const char* GetTerms() const override;
+    int GetModelType() const override;
 
     int variablePrimeKey = 0;
     int modelPrimeKey = 0;
@@ -111,24 +127,29 @@ class DPXLSX_API FormulaModelNode : public FormulaNodeOf<IFormulaModelNode, 1> {
 
 class DPXLSX_API FormulaModelVariableNode : public FormulaNodeOf<IFormulaModelVariableNode, 2> {
   public:
-    int GetVariablePrimeKey() const override { return variablePrimeKey; }
+    FormulaModelVariableNode();
+    FormulaModelVariableNode(const FormulaModelVariableNode& other);
+    FormulaModelVariableNode& operator=(const FormulaModelVariableNode& other);
+    ~FormulaModelVariableNode() override;
+
+    int GetVariablePrimeKey() const override;
 
     int variablePrimeKey = 0;
 };
 
 class DPXLSX_API FormulaManager : public IFormulaManager {
   public:
-    FormulaManager() = default;
+    FormulaManager();
     FormulaManager(const FormulaManager&) = delete;
     FormulaManager& operator=(const FormulaManager&) = delete;
     ~FormulaManager() override;
 
-    bool GetUpdateAutomatically() const override { return updateAutomatically; }
-    bool GetRecalculate() const override { return recalculate; }
-    bool GetStatusUpdateRequired() const override { return statusUpdateRequired; }
-    const char* GetListSeparator() const override { return listSeparator.database_str(); }
-    const char* GetDecimalSymbol() const override { return decimalSymbol.database_str(); }
-    int GetFormulaNodeCount() const override { return static_cast<int>(formulaNodes.size()); }
+    bool GetUpdateAutomatically() const override;
+    bool GetRecalculate() const override;
+    bool GetStatusUpdateRequired() const override;
+    const char* GetListSeparator() const override;
+    const char* GetDecimalSymbol() const override;
+    int GetFormulaNodeCount() const override;
     IFormulaNode* GetFormulaNode(int index) const override;
 
     bool updateAutomatically = false;

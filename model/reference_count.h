@@ -5,8 +5,8 @@
 namespace dp {
 
 // Lowers `count`; true when the object is to be deleted now. A Release without its AddRef is a
-// mistake of the host: asserted in debug builds, ignored in release builds rather than deleting
-// the object a second time.
+// mistake of the host: asserted in debug builds, ignored in release builds where the
+// object was never taken.
 template <class Count>
 bool releaseReference(Count& count) {
     assert(count != 0 && "Release without AddRef");

@@ -10,15 +10,15 @@ namespace dp {
 // A selection of rows for the host's use; no import makes one.
 class DPXLSX_API CRows : public IRows {
   public:
-    CRows() = default;
+    CRows();
+    CRows(const CRows& other);
+    CRows& operator=(const CRows& other);
+    ~CRows() override;
 
-    bool UseAllRows() const override { return useAllRows; }
-    int GetRowCount() const override { return rowCount; }
+    bool UseAllRows() const override;
+    int GetRowCount() const override;
     // Counts the listed rows, whatever GetRowCount() says.
-    void GetRows(int* count, const int** listed) const override {
-        if (count) *count = static_cast<int>(rows.size());
-        if (listed) *listed = rows.data();
-    }
+    void GetRows(int* count, const int** listed) const override;
 
     bool useAllRows = false;
     std::int32_t rowCount = 0;

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <string>
-#include <utility>
 
 #include "model/host/i_string.h"
 
@@ -10,12 +9,17 @@ namespace dp {
 // The text type of all host interfaces. Storage and display form are the same UTF-8 text.
 class DPXLSX_API String : public IString {
   public:
-    String() = default;
-    explicit String(std::string text) : text_(std::move(text)) {}
+    String();
+    explicit String(std::string text);
+    String(const String& other);
+    String(String&& other) noexcept;
+    String& operator=(const String& other);
+    String& operator=(String&& other) noexcept;
+    ~String() override;
 
-    const char* database_str() const override { return text_.c_str(); }
-    const char* application_str() const override { return text_.c_str(); }
-    std::string& operator=(const std::string& text) override { return text_ = text; }
+    const char* database_str() const override;
+    const char* application_str() const override;
+    std::string& operator=(const std::string& text) override;
 
     // The text itself, for those who fill or read it in place.
     std::string& text() { return text_; }

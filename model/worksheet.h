@@ -11,27 +11,28 @@ namespace dp {
 
 class DPXLSX_API WorksheetView : public IWorksheetView {
   public:
-    WorksheetView() = default;
+    WorksheetView();
+    ~WorksheetView() override;
 
-    bool GetAllColumns() const override { return allColumns; }
-    bool GetHorizontalEntry() const override { return horizontalEntry; }
-    bool GetPrintGrid() const override { return printGrid; }
-    bool GetPrintColumnNames() const override { return printColumnNames; }
-    bool GetPrintColumnLabels() const override { return printColumnLabels; }
-    bool GetPrintRowLabels() const override { return printRowLabels; }
-    int GetActiveRow() const override { return activeRow; }
-    int GetActiveColumn() const override { return activeColumn; }
-    int GetLeftmostVisibleColumn() const override { return leftmostVisibleColumn; }
-    int GetTopVisibleRow() const override { return topVisibleRow; }
-    double GetStandardColumnWidth() const override { return standardColumnWidth; }
-    int GetDataFontStyle() const override { return dataFontStyle; }
-    int GetLabelFontStyle() const override { return labelFontStyle; }
-    int GetDataFontPointSize() const override { return dataFontPointSize; }
-    int GetLabelFontPointSize() const override { return labelFontPointSize; }
-    int GetPrintJustification() const override { return printJustification; }
-    const IString* GetDataFontFaceName() const override { return &dataFontFaceName; }
-    const IString* GetLabelFontFaceName() const override { return &labelFontFaceName; }
-    const IString* GetMissingValue() const override { return &missingValue; }
+    bool GetAllColumns() const override;
+    bool GetHorizontalEntry() const override;
+    bool GetPrintGrid() const override;
+    bool GetPrintColumnNames() const override;
+    bool GetPrintColumnLabels() const override;
+    bool GetPrintRowLabels() const override;
+    int GetActiveRow() const override;
+    int GetActiveColumn() const override;
+    int GetLeftmostVisibleColumn() const override;
+    int GetTopVisibleRow() const override;
+    double GetStandardColumnWidth() const override;
+    int GetDataFontStyle() const override;
+    int GetLabelFontStyle() const override;
+    int GetDataFontPointSize() const override;
+    int GetLabelFontPointSize() const override;
+    int GetPrintJustification() const override;
+    const IString* GetDataFontFaceName() const override;
+    const IString* GetLabelFontFaceName() const override;
+    const IString* GetMissingValue() const override;
 
     bool allColumns = true;
     bool horizontalEntry = true;
@@ -56,31 +57,31 @@ class DPXLSX_API WorksheetView : public IWorksheetView {
 
 class DPXLSX_API Worksheet : public IWorksheet {
   public:
-    Worksheet() = default;
+    Worksheet();
     Worksheet(const Worksheet&) = delete;
     Worksheet& operator=(const Worksheet&) = delete;
     ~Worksheet() override;
 
-    unsigned AddRef() override { return static_cast<unsigned>(++refCount); }
+    unsigned AddRef() override;
     void Release() override;
 
-    int GetPrimeKey() const override { return primeKey; }
-    void SetPrimeKey(int key) override { primeKey = key; }
-    const std::string& GetTitle() const override { return title; }
-    bool GetHiddenColumnsUsed() const override { return hiddenColumnsUsed; }
-    double GetVersion() const override { return version; }
-    const std::string& GetCreator() const override { return creator; }
-    const std::string& GetCreationDates() const override { return creationDates; }
-    const std::string& GetComments() const override { return comments; }
-    int GetOSVersion() const override { return osVersion; }
-    const IWorksheetView* GetView() const override { return &view; }
-    int GetDDELinkCount() const override { return 0; }
-    const IFormulaManager* GetFormulaManager() const override { return &formulaManager; }
-    IDesign* GetDesign() const override { return nullptr; }
-    IAnalysis* GetAnalysis() const override { return nullptr; }
-    IResponseModels* GetResponseModels() const override { return nullptr; }
-    IWorksheetView* GetView() override { return &view; }
-    IFormulaManager* GetFormulaManager() override { return &formulaManager; }
+    int GetPrimeKey() const override;
+    void SetPrimeKey(int key) override;
+    const std::string& GetTitle() const override;
+    bool GetHiddenColumnsUsed() const override;
+    double GetVersion() const override;
+    const std::string& GetCreator() const override;
+    const std::string& GetCreationDates() const override;
+    const std::string& GetComments() const override;
+    int GetOSVersion() const override;
+    const IWorksheetView* GetView() const override;
+    int GetDDELinkCount() const override;
+    const IFormulaManager* GetFormulaManager() const override;
+    IDesign* GetDesign() const override;
+    IAnalysis* GetAnalysis() const override;
+    IResponseModels* GetResponseModels() const override;
+    IWorksheetView* GetView() override;
+    IFormulaManager* GetFormulaManager() override;
 
     int primeKey = 0;
     std::string title;

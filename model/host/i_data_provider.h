@@ -94,7 +94,7 @@ class DPXLSX_API IDataProvider : public IResource {
     // Null: an import has no designs.
     virtual IDOEReader* GetDOEReader() = 0;
 
-    // --- 31-43: settings; the first nine but one are shared by all providers of the process ---
+    // --- 31-43: settings; the first nine are shared by all providers of the process ---
     // The number that marks a missing value in every column.
     virtual void SetMissingValue(double value) = 0;
     virtual void SetMissingValueTextRepresentation(const char* text) = 0;
@@ -112,7 +112,8 @@ class DPXLSX_API IDataProvider : public IResource {
     virtual void SetMissingText(const char* from, const char* to) = 0;
     // Numbers equal to `from` become `to`.
     virtual void SetMissingNumeric(double from, double to) = 0;
-    // In numeric columns, cells with the text `from` become `to`; an empty text switches this off.
+    // In numeric columns, cells with the text `from` become `to`, in place of what SetMissingNumeric
+    // asks for; an empty text switches this off. `to` replaces that of SetMissingNumeric.
     virtual void SetAlphaMissingNumeric(const char* from, double to) = 0;
 
     // --- 44-46: accepted and ignored ---
@@ -146,9 +147,11 @@ class DPXLSX_API IDataProvider : public IResource {
     virtual void ClearReadColumnOptions() = 0;
 
     // --- 62-67: the provider as a whole ---
-    // Forgets worksheets, cells, options and most settings.
+    // Forgets worksheets, cells, options and the error, and puts the provider's own settings back.
+    // Kept are the texts of SetMissingText and SetAlphaMissingNumeric (the latter switched off), the
+    // helper, and what all providers share.
     virtual void ClearWorksheets() = 0;
-    // Characters; 0xFFFFFFFF for no limit.
+    // Characters, of which the low 16 bits count: 0xFFFFFFFF, the default, is 65,535; 0 is no limit.
     virtual void SetMaxVariableNameLength(unsigned length) = 0;
     // The provider takes the helper over and deletes it.
     virtual void SetDateTimeVariableFormatHelper(IDateTimeVariableFormat* helper) = 0;

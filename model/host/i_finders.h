@@ -6,7 +6,8 @@
 #include "model/host/i_variable_format.h"
 
 // The two interfaces through which a host finds what a provider holds. Key collections belong to
-// the provider and are valid until the next query of the same kind. A finder that finds nothing
+// the provider and are valid until the next query of the same kind or ClearWorksheets; constants,
+// matrices and models share that of the columns. A finder that finds nothing
 // answers false; objects found are new, with a reference count of 0, and owned by the caller.
 namespace dp {
 
@@ -45,10 +46,11 @@ class DPXLSX_API IVariableFinder {
     virtual IReadOnlyCollection<int>* GetMatrixPrimeKeys(int worksheetKey) const = 0;
     virtual IReadOnlyCollection<int>* GetModelPrimeKeys(IModel::ModelSubtype subtype,
                                                         int worksheetKey) const = 0;
-    // Loads a column in the kind of its first data cell. `*column` is null when the key is unknown
+    // Loads a column in the kind of its first data cell, or in that of its column option. `*column` is null when the key is unknown
     // or the column is excluded and `ignoreExclusion` is false.
     virtual bool FindColumn(int key, IColumn** column, bool ignoreExclusion) const = 0;
-    // Loads a column in the given kind; `*formatType` becomes the kind of its first data cell.
+    // Loads a column in the given kind unless a column option asks for another. `*formatType` becomes
+    // the kind of its first data cell, or that of the option; it stays as it was for an unknown key.
     virtual bool FindColumn(int key, IColumn** column, IVariable::StorageType storage,
                             IVariableFormat::FormatType* formatType,
                             bool ignoreExclusion) const = 0;
