@@ -46,7 +46,7 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
 
     bool autoFormat = true;
     unsigned dateTimeParameters[4] = {};
-    String pattern;
+    String pattern;  // set once, by the constructor
     // Owned; null until the first value is rendered. Making one costs a hundred times what the
     // rest of the object does, and most formats never render.
     mutable icu::DateFormat* formatter = nullptr;

@@ -29,16 +29,18 @@ DPXLSX_API bool parseDecimalFormat(const std::string& code);
 // A fixed-decimal code followed by "%".
 DPXLSX_API bool parsePercentageFormat(const std::string& code);
 
-// A fixed-decimal code followed by "E+0" or "E+00", with or without a leading "##".
+// A fixed-decimal code that is not empty, followed by "E+0" or "E+00", with or without a leading
+// "##".
 DPXLSX_API bool parseScientficFormat(const std::string& code);
 
 // A code whose first section groups thousands and carries a currency tag or a quoted text.
 DPXLSX_API bool parseCurrencyFormat(const std::string& code);
 
 // A code with date or time letters. Accepted: `cleaned` is the first section without backslashes
-// and locale tag, its point before fractional seconds replaced by the input decimal symbol, and
-// `type` one of the three date-time types. Rejected: `cleaned` is the whole code without
-// backslashes and locale tag, and `type` is left alone. `cleaned` may be `code` itself.
+// and without the locale tag and what stands before it, and `type` one of the three date-time
+// types; behind a bracketed part, the point after seconds becomes the input decimal symbol and up
+// to three zeros behind it become "s". Rejected: `cleaned` is the whole code without backslashes,
+// the tag and what stands before it, and `type` is left alone. `cleaned` may be `code` itself.
 DPXLSX_API bool parseDateTimeFormat(const std::string& code, std::string& cleaned,
                                     EXCEL_FORMAT_TYPE& type);
 

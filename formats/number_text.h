@@ -2,7 +2,8 @@
 
 #include <string>
 
-// Numbers as the classic locale's output streams write them, whatever locale the process has set.
+// Numbers as the classic locale's output streams write them in the default rounding mode, whatever
+// locale the process has set.
 // A negative count of decimals or digits means 6, as it does for a stream.
 namespace dp {
 

@@ -64,9 +64,11 @@ class DPXLSX_API DateTimeFormatEqualCode {
     std::string styleId_;
 };
 
-// A new format for the style at `styleIndex`, owned by the caller; the automatic numeric format
-// when the index is outside the table or the code has no recognised shape. `isDateTime` says how
-// the reader counts the style; then its code loses its backslashes in the table.
+// A new format for the style at `styleIndex`, owned by the caller. `isDateTime` says how the reader
+// counts the style: its code then loses its backslashes in the table and shows by its ICU pattern,
+// or in ICU's medium date style without one. Other codes show as decimals, percentage or in
+// scientific notation; the automatic numeric format stands for the rest, currency codes and an
+// index outside the table included.
 IVariableFormat* createStyleFormat(std::vector<xStyle>& styles, int styleIndex, bool isDateTime);
 
 }  // namespace dp

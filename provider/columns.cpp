@@ -94,8 +94,9 @@ ColumnAddress decodeKey(const std::vector<WorksheetCells>& worksheets, int key) 
 IReadOnlyCollection<int>* ExcelDataProviderBase::GetColumnPrimeKeys(int worksheetKey) const {
     std::vector<int>& keys = _columnKeys.items;
     keys.clear();
+    if (worksheetKey <= 0 || !worksheetExists(static_cast<unsigned>(worksheetKey)))
+        return &_columnKeys;
     const unsigned position = GetWorksheetPosition(static_cast<unsigned>(worksheetKey));
-    if (worksheetKey <= 0 || position >= _cells.size()) return &_columnKeys;
     std::size_t base = 1;
     for (unsigned before = 0; before < position; ++before) base += _cells[before].size();
     keys.resize(_cells[position].size());

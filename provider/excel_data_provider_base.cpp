@@ -31,7 +31,6 @@ void ExcelDataProviderBase::ResetInternalData() {
     _worksheetColumns.clear();
     _worksheetNames.clear();
     _cells.clear();
-    _texts.reset();
     _columnKeys.items.clear();
     _allWorksheetKeys.items.clear();
     _worksheetKeys.items.clear();

@@ -172,9 +172,10 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     // --- 103-108: the date-time helper, columns and conversion ---
     // The host's helper, owned by the provider; null when none was set.
     virtual IDateTimeVariableFormat* GetDateTimeVariableFormatHelper() const;
-    // Loads the column `key` in the kind `requested`; `*formatType` becomes the kind of its first
-    // data cell. Both out-pointers may be null. False, and a null `*column`, for an unknown key and
-    // for an excluded column unless `ignoreExclusion`.
+    // Loads the column `key` in the kind `requested` unless a column option asks for another;
+    // `*formatType` becomes the kind of its first data cell or that of the option. Both
+    // out-pointers may be null. False, and a null `*column`, for an unknown key and for an excluded
+    // column unless `ignoreExclusion`.
     virtual bool FindColumn(int key, IColumn** column, ColumnType requested,
                             IVariableFormat::FormatType* formatType, bool ignoreExclusion) const;
     // The cell as text, cut to GetMaximumTextLength() bytes when `truncate`.
@@ -194,7 +195,7 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     double ConvertCellToReal(const ExternalDataRecordCell& cell, bool asDateTime,
                              const IString* dateTimeFormat, bool& converted) const;
 
-    // --- Row layout; keys that name no worksheet find nothing ---
+    // --- Row layout; a key that names no worksheet finds no rows, but options are made for it ---
     // Makes the worksheet's name row and first data row concrete.
     void CalculateRowOffsets(unsigned key) const;
     // Decides from the first row whether the worksheet has a row of variable names.
@@ -304,8 +305,6 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     IVariableFormat::FormatType firstDataType(unsigned worksheetKey, const CellColumn& cells,
                                               ColumnType requested) const;
     IReadOnlyCollection<int>* noKeys() const;
-
-    std::shared_ptr<TextPool> _texts;  // equal texts of all worksheets, once
 };
 
 }  // namespace dp

@@ -1,3 +1,6 @@
+#include <string>
+#include <utility>
+
 #include "model/string.h"
 #include "provider/excel_data_provider_base.h"
 
@@ -7,8 +10,11 @@ namespace dp {
 void ExcelDataProviderBase::SetWriteOptionVariableNames(bool write) { _writeVariableNames = write; }
 
 void ExcelDataProviderBase::SetMissingText(const char* from, const char* to) {
-    _missingTextFrom = textOrEmpty(from);
-    _missingTextTo = textOrEmpty(to);
+    // The arguments may be what the getters answered.
+    std::string newFrom = textOrEmpty(from);
+    std::string newTo = textOrEmpty(to);
+    _missingTextFrom = std::move(newFrom);
+    _missingTextTo = std::move(newTo);
 }
 
 void ExcelDataProviderBase::SetMissingNumeric(double from, double to) {

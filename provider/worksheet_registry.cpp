@@ -43,14 +43,20 @@ void ExcelDataProviderBase::AddWorksheet(const char* name) {
     makeRoomForOne(_worksheetNames);
     makeRoomForOne(_cells);
     makeRoomForOne(keys);
-    if (!_texts) _texts = std::make_shared<TextPool>();
+    // Equal texts of all worksheets are kept once.
+    const std::shared_ptr<TextPool> texts =
+        _cells.empty() ? std::make_shared<TextPool>() : _cells.back().texts();
     _worksheetNames.push_back(std::move(title));
-    _cells.emplace_back(_texts);
+    _cells.emplace_back(texts);
     keys.push_back(key);
 }
 
 void ExcelDataProviderBase::RemoveWorksheet(int position) {
     if (!isPosition(position, _worksheetNames)) return;
+    // The key may be given out again, to a worksheet with other rows.
+    const auto key = static_cast<unsigned>(GetWorksheetPrimeKey(static_cast<unsigned>(position)));
+    _lastRows.erase(key);
+    _blankRows.erase(key);
     eraseAt(_worksheetNames, position);
     eraseAt(_cells, position);
     eraseAt(_allWorksheetKeys.items, position);
@@ -131,8 +137,7 @@ bool ExcelDataProviderBase::worksheetExists(unsigned key) const {
 
 const WorksheetCells& ExcelDataProviderBase::cellsOf(unsigned key) const {
     static const WorksheetCells none;
-    const unsigned position = GetWorksheetPosition(key);
-    return position < _cells.size() ? _cells[position] : none;
+    return worksheetExists(key) ? _cells[GetWorksheetPosition(key)] : none;
 }
 
 }  // namespace dp

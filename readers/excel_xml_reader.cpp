@@ -52,13 +52,19 @@ void ExcelXmlReader::mInitialize() {
 }
 
 IVariableFormat* ExcelXmlReader::createVextralNumericFormat(int styleIndex) {
-    return createStyleFormat(styles, styleIndex,
-                             IsDateTimeFormatType(GetExcelFormatType(styleIndex)));
+    const bool isDateTime = isInTable(styleIndex) && IsDateTimeFormatType(typeAt(styleIndex));
+    return createStyleFormat(styles, styleIndex, isDateTime);
 }
 
 EXCEL_FORMAT_TYPE ExcelXmlReader::GetExcelFormatType(int styleIndex) const {
-    if (styleIndex < 0 || static_cast<std::size_t>(styleIndex) >= styles.size())
-        return EXCEL_FORMAT_NONE;
+    return isInTable(styleIndex) ? typeAt(styleIndex) : EXCEL_FORMAT_NONE;
+}
+
+bool ExcelXmlReader::isInTable(int styleIndex) const {
+    return styleIndex >= 0 && static_cast<std::size_t>(styleIndex) < styles.size();
+}
+
+EXCEL_FORMAT_TYPE ExcelXmlReader::typeAt(int styleIndex) const {
     return static_cast<EXCEL_FORMAT_TYPE>(styles[static_cast<std::size_t>(styleIndex)].formatType);
 }
 
@@ -129,7 +135,8 @@ double ExcelXmlReader::mFormatExcelDateTime(const std::string& text) {
     const int minute = dateField(text, 14, 2);
     const int second = dateField(text, 17, 2);
     const int millisecond = dateField(text, 20, 3);
-    // A time without a date is written on this day; serial day 0 is the one before it.
+    // A time without a date is written on 1899-12-31; the day handed on is the one from which the
+    // host counts serial days.
     if (year == 1899 && month == 12 && day == 31) day = 30;
     if (!dateTimeHelper) return missingValue;
     return dateTimeHelper->GenerateTime(year, month, day, hour, minute, second, millisecond);

@@ -59,8 +59,9 @@ class DPXLSX_API ExcelXmlReader {
     // The first style called `id` and its index; null and -1 when there is none.
     bool mSearchStyleIndexForFormat(const std::string& id, xStyle*& style, int& index);
     // The serial day number of a text such as "2010-01-05T10:30:00.000", as the date-time helper
-    // gives it. Throws std::out_of_range for a text that is too short and boost::bad_lexical_cast
-    // for one with a field that is no number. The missing value when there is no helper.
+    // gives it. Throws std::out_of_range for a text that ends before a field and
+    // boost::bad_lexical_cast for one with a field that is no number. The missing value when there
+    // is no helper.
     double mFormatExcelDateTime(const std::string& text);
 
     // --- XML Spreadsheet 2003 ---
@@ -78,6 +79,8 @@ class DPXLSX_API ExcelXmlReader {
 
   protected:
     DateTimeMasks masks();
+    bool isInTable(int styleIndex) const;
+    EXCEL_FORMAT_TYPE typeAt(int styleIndex) const;
     // Delivers a record and notes that the worksheet is not empty.
     void deliver(const ExternalDataRecord& record);
     bool isOnElement(const char* name) const;
