@@ -266,15 +266,19 @@ int main(int argc, char** argv) {
         printRow(name.c_str(), medians, goal.ratio, goal.bytesPerCell > 0 ? bytes : 0,
                  goal.bytesPerCell);
     }
-    if (only.empty()) {
+    const std::string listing = "worksheet names, mixed";
+    if (listing.find(only) != listing.npos) {
         bench::writeWorkbook(book, kGoals[2].workload);
-        printRow("worksheet names, mixed",
+        printRow(listing.c_str(),
                  measure(
                      runs, [&] { listOurs(book); }, [&] { listFloor(book); }),
                  1.1, 0, 0);
+    }
+    const std::string older = "XML 2003, 100,000 x 10";
+    if (older.find(only) != older.npos) {
         const std::string document = (directory / "book.xml").string();
         bench::writeSpreadsheet2003(document, 100000, 10);
-        printRow("XML 2003, 100,000 x 10",
+        printRow(older.c_str(),
                  measure(
                      runs, [&] { readOurs2003(document); }, [&] { passFloor2003(document); }),
                  1.5, 0, 0);

@@ -5,6 +5,7 @@
 
 #include <libxml/xmlreader.h>
 
+#include "readers/attributes.h"
 #include "readers/cm_xml_cast.h"
 #include "readers/excel_xml_reader.h"
 
@@ -66,19 +67,28 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
 
 // Reads the attributes of a cell: its place, its style, and how many columns it covers.
 void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
+    Attributes attributes(xmlReader);
     unsigned index = 0;
-    if (xmlReader.mReadAttribute(index, "ss:Index") && index > column) column = index - 1;
-    currentStyleId = xmlReader.attributeText("ss:StyleID");
+    if (const char* text = attributes.find("Index", "ss")) CmXmlCast::instance().mCast(index, text);
+    if (index > column) column = index - 1;
+
+    currentStyleId.clear();
     currentStyle = nullptr;
-    int ignored = -1;
-    if (!currentStyleId.empty()) mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);
+    if (const char* id = attributes.find("StyleID", "ss"); id && *id != '\0') {
+        currentStyleId = id;
+        int ignored = -1;
+        mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);
+    }
+
     mergeAcross = 0;
-    xmlReader.mReadAttribute(mergeAcross, "ss:MergeAcross");
+    if (const char* text = attributes.find("MergeAcross", "ss"))
+        CmXmlCast::instance().mCast(mergeAcross, text);
 }
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    const std::string type = xmlReader.attributeText("ss:Type");
+    const char* typeName = Attributes(xmlReader).find("Type", "ss");
+    const std::string type = typeName ? typeName : "";
     xmlReader.readNode();
     if (!hasContent) return;
 

@@ -4,6 +4,7 @@
 
 #include <libxml/xmlreader.h>
 
+#include "readers/attributes.h"
 #include "readers/cell_reference.h"
 #include "readers/cm_xml_cast.h"
 #include "readers/excel_xlsx_reader.h"
@@ -45,14 +46,6 @@ struct Names {
     const xmlChar* r;
     const xmlChar* s;
 };
-
-// The text of an attribute whose value is plain text; null when it holds references.
-const char* plainValue(const xmlAttr* attribute) {
-    const xmlNode* value = attribute->children;
-    if (!value) return "";
-    if (value->type != XML_TEXT_NODE || value->next) return nullptr;
-    return reinterpret_cast<const char*>(value->content);
-}
 
 // Where a shared-string cell points to: the optional sign and digits of `text`, or -1 for a number
 // beyond any table. Throws CmXmlException for anything else.
@@ -109,27 +102,20 @@ class WorksheetPass {
     void beginCell(const Names& names) {
         kind_ = CellKind::Number;
         style_ = -1;
-        const char* reference = nullptr;
-        const xmlNode* cell = xmlTextReaderCurrentNode(reader_.textReader);
-        for (const xmlAttr* a = cell->properties; a; a = a->next) {
-            if (a->ns || (a->name != names.r && a->name != names.t && a->name != names.s)) continue;
-            const char* value = plainValue(a);
-            if (!value) value = expandedValue(a);
-            if (a->name == names.r)
-                reference = value;
-            else if (a->name == names.t)
-                kind_ = kindOf(value);
-            else
-                CmXmlCast::instance().mCast(style_, value);
+        Attributes attributes(reader_);
+        bool placed = false;
+        for (const xmlAttr* a = attributes.first(); a; a = a->next) {
+            if (a->ns) continue;
+            if (a->name == names.r) {
+                place_.beginCell(attributes.valueOf(a));
+                placed = true;
+            } else if (a->name == names.t) {
+                kind_ = kindOf(attributes.valueOf(a));
+            } else if (a->name == names.s) {
+                CmXmlCast::instance().mCast(style_, attributes.valueOf(a));
+            }
         }
-        place_.beginCell(reference);
-    }
-
-    // The text of an attribute with references in it; valid until the next call.
-    const char* expandedValue(const xmlAttr* attribute) {
-        expanded_ = reader_.attributeText(reinterpret_cast<const char*>(attribute->name));
-        xmlTextReaderMoveToElement(reader_.textReader);
-        return expanded_.c_str();
+        if (!placed) place_.beginCell(nullptr);
     }
 
     // Moves to the text of the current element; null when it has none. Comments are no text.
@@ -215,7 +201,6 @@ class WorksheetPass {
     CellPlace place_;
     CellKind kind_ = CellKind::Number;
     int style_ = -1;
-    std::string expanded_;
     ExternalDataRecord number_{0, 0, 0, 0};
     ExternalDataRecord text_{0, 0, 0, 0};
 };

@@ -1,0 +1,43 @@
+#include "readers/attributes.h"
+
+#include <libxml/xmlreader.h>
+
+#include "readers/xml_reader.h"
+
+namespace dp {
+
+namespace {
+
+bool equal(const xmlChar* name, const char* wanted) {
+    return xmlStrEqual(name, reinterpret_cast<const xmlChar*>(wanted)) == 1;
+}
+
+}  // namespace
+
+Attributes::Attributes(XmlReader& reader) : first_(nullptr) {
+    const xmlNode* element = xmlTextReaderCurrentNode(reader.textReader);
+    if (element && element->type == XML_ELEMENT_NODE) first_ = element->properties;
+}
+
+const char* Attributes::find(const char* name, const char* prefix) {
+    for (const xmlAttr* attribute = first_; attribute; attribute = attribute->next) {
+        const xmlChar* own = attribute->ns ? attribute->ns->prefix : nullptr;
+        const bool samePrefix = prefix ? own && equal(own, prefix) : !own;
+        if (samePrefix && equal(attribute->name, name)) return valueOf(attribute);
+    }
+    return nullptr;
+}
+
+const char* Attributes::valueOf(const xmlAttr* attribute) {
+    const xmlNode* value = attribute->children;
+    if (!value) return "";
+    if (value->type == XML_TEXT_NODE && !value->next)
+        return reinterpret_cast<const char*>(value->content);
+    // The value holds references.
+    xmlChar* text = xmlNodeListGetString(attribute->doc, value, 1);
+    expanded_ = text ? reinterpret_cast<const char*>(text) : "";
+    xmlFree(text);
+    return expanded_.c_str();
+}
+
+}  // namespace dp
