@@ -1,0 +1,48 @@
+#pragma once
+
+#include <cstdlib>
+#include <fstream>
+#include <string>
+
+#include <boost/filesystem.hpp>
+#include <gtest/gtest.h>
+
+// Tests that touch the disk do so in a directory of their own, which is also the process's
+// temporary directory meanwhile: whatever is left there was left by the library.
+class TemporaryFiles : public testing::Test {
+  protected:
+    void SetUp() override {
+        namespace fs = boost::filesystem;
+        root_ = fs::temp_directory_path() / fs::unique_path("dpxlsx-test-%%%%-%%%%");
+        fs::create_directories(temporary());
+        fs::create_directories(files());
+        if (const char* before = std::getenv("TMPDIR")) before_ = before;
+        ::setenv("TMPDIR", temporary().c_str(), 1);
+        workingDirectory_ = fs::current_path();
+    }
+
+    void TearDown() override {
+        namespace fs = boost::filesystem;
+        EXPECT_TRUE(fs::is_empty(temporary())) << "something was left in " << temporary();
+        EXPECT_EQ(fs::current_path(), workingDirectory_);
+        before_.empty() ? ::unsetenv("TMPDIR") : ::setenv("TMPDIR", before_.c_str(), 1);
+        fs::remove_all(root_);
+    }
+
+    boost::filesystem::path temporary() const { return root_ / "tmp"; }
+    boost::filesystem::path files() const { return root_ / "files"; }
+    const boost::filesystem::path& workingDirectory() const { return workingDirectory_; }
+    std::string file(const std::string& name) const { return (files() / name).string(); }
+
+    std::string write(const std::string& name, const std::string& content) const {
+        const auto path = files() / name;
+        boost::filesystem::create_directories(path.parent_path());
+        std::ofstream(path.string(), std::ios::binary) << content;
+        return path.string();
+    }
+
+  private:
+    boost::filesystem::path root_;
+    boost::filesystem::path workingDirectory_;
+    std::string before_;
+};

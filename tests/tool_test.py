@@ -1,0 +1,319 @@
+#!/usr/bin/env python3
+"""Runs the built dpxlsx as a user would. Usage: tool_test.py DPXLSX SOURCE_FOLDER [TEST...]"""
+
+import csv
+import fcntl
+import io
+import json
+import os
+import pathlib
+import pty
+import re
+import signal
+import shutil
+import struct
+import subprocess
+import sys
+import tempfile
+import termios
+import unittest
+import zipfile
+
+TOOL = sys.argv.pop(1)
+SOURCE = pathlib.Path(sys.argv.pop(1))
+SAMPLE = SOURCE / "samples" / "sample.xlsx"
+
+
+def repacked(target, change):
+    """Writes the sample to `target`, its parts passed through change(name, bytes) first."""
+    with zipfile.ZipFile(SAMPLE) as source, zipfile.ZipFile(target, "w") as made:
+        for name in source.namelist():
+            content = change(name, source.read(name))
+            if content is not None:
+                made.writestr(name, content)
+    return target
+
+
+class ToolTest(unittest.TestCase):
+    def setUp(self):
+        self.folder = pathlib.Path(tempfile.mkdtemp())
+        self.addCleanup(shutil.rmtree, self.folder)
+        self.temporary = self.folder / "temporary"
+        self.temporary.mkdir()
+
+    def tearDown(self):
+        self.assertEqual(list(self.temporary.iterdir()), [], "left in the temporary directory")
+
+    def environment(self, **more):
+        kept = {k: v for k, v in os.environ.items() if k not in ("COLUMNS", "DPXLSX_LIBRARY")}
+        return {**kept, "TMPDIR": str(self.temporary), **more}
+
+    def run_tool(self, *arguments, expected=0, **more):
+        done = subprocess.run([TOOL, *map(str, arguments)], capture_output=True, timeout=120,
+                              cwd=self.folder, env=self.environment(**more), check=False)
+        errors = done.stderr.decode()
+        self.assertEqual(done.returncode, expected, f"{arguments}: {errors}")
+        self.assertEqual(errors.count("\n"), 0 if expected == 0 else 1, errors)
+        return done.stdout.decode() if expected == 0 else errors
+
+    def read(self, *arguments):
+        return json.loads(self.run_tool(SAMPLE, "--json", *arguments))["worksheets"]
+
+    def columns(self, *arguments):
+        return {c["name"]: c for c in self.read(*arguments)[0]["columns"]}
+
+    def test_tables_show_layout_columns_and_values(self):
+        text = self.run_tool(SAMPLE)
+        for line in ("Worksheet 1: Measurements",
+                     "14 columns, 12 rows of data; variable names in row 1, data from row 2",
+                     "  9         9  Taken       date-time    12        2          0  "
+                     "date-time, M/d/yy H:mm",
+                     "and 2 more rows", "Worksheet 2: Readings 2024"):
+            self.assertIn(line, text)
+        city = [line for line in text.splitlines() if "東京" in line or "Zürich" in line]
+        # 東京 takes as many cells as four letters.
+        self.assertEqual(city[0].index("Zürich"), city[1].index("東京"))
+        self.assertEqual(city[0].index("first"), city[1].index("two") + 2)
+        self.assertIn("two␊lines", city[1])
+
+    def test_lines_are_cut_to_the_width(self):
+        for line in self.run_tool(SAMPLE, COLUMNS="50").splitlines():
+            self.assertLessEqual(len(line), 50)
+
+    def on_terminal(self, *arguments, size=(30, 60)):
+        """All that a terminal of this size would show, and the exit code."""
+        master, terminal = pty.openpty()
+        fcntl.ioctl(terminal, termios.TIOCSWINSZ, struct.pack("HHHH", *size, 0, 0))
+        child = subprocess.Popen([TOOL, *map(str, arguments)], stdout=terminal, stderr=terminal,
+                                 env=self.environment())
+        os.close(terminal)
+        shown = b""
+        try:
+            while block := os.read(master, 4096):
+                shown += block
+        except OSError:
+            pass
+        os.close(master)
+        return shown.decode(), child.wait()
+
+    def test_a_terminal_sees_progress_and_fitting_lines(self):
+        shown, code = self.on_terminal(SAMPLE)
+        self.assertEqual(code, 0)
+        self.assertTrue(shown.startswith("\r\x1b[KOpening "))
+        lines = re.sub("(\r\x1b\\[K[^\r\n]*)?\r\x1b\\[K", "", shown).replace("\r", "").splitlines()
+        self.assertIn("Worksheet 1: Measurements", lines)
+        plain = [line for line in lines if line.isascii() or line.endswith("…")]
+        self.assertLessEqual(max(map(len, plain)), 60)
+
+    def test_list(self):
+        self.assertEqual(self.run_tool(SAMPLE, "--list"), "Measurements\nReadings 2024\nEmpty\n")
+
+    def test_json_holds_values_in_full(self):
+        first, second = self.read()
+        self.assertEqual(first["layout"],
+                         {"nameRow": 1, "firstDataRow": 2, "rows": 12, "lastUsedRow": 13})
+        columns = {c["name"]: c for c in first["columns"]}
+        self.assertEqual(columns["General"]["values"][:4], 
+                         [0.1428571428571428, 0.2857142857142857, 0.4285714285714285, None])
+        self.assertEqual(columns["Percent"]["shown"][2], "12.5%")
+        self.assertEqual(columns["Taken"]["values"][0], 45348.28125)
+        self.assertEqual(columns["Taken"]["iso"][0], "2024-02-26T06:45:00")
+        self.assertEqual(columns["Taken"]["shown"][:2], ["2/26/24 6:45", None])
+        self.assertEqual(columns["City"]["values"][3:6], ["東京", "서울", "القاهرة"])
+        self.assertEqual(columns["Count"]["convertedMissing"], 1)
+        self.assertEqual(second["key"], 2)
+        for column in first["columns"] + second["columns"]:
+            self.assertEqual(column["values"].count(None), column["missing"], column["name"])
+
+    def test_csv(self):
+        rows = list(csv.reader(io.StringIO(self.run_tool("--csv", SAMPLE, "--sheet", "1"))))
+        self.assertEqual(len(rows), 13)
+        columns = self.columns()
+        self.assertEqual(rows[0], list(columns))
+        for name, column in columns.items():
+            texts = [row[rows[0].index(name)] for row in rows[1:]]
+            wanted = column.get("iso", column["values"])
+            for text, value in zip(texts, wanted):
+                same = float(text) == value if isinstance(value, (int, float)) else text == (
+                    value or "")
+                self.assertTrue(same, (name, text, value))
+        shown = self.run_tool(SAMPLE, "--csv", "--as-shown", "--sheet", "1", "--head", 1)
+        self.assertEqual(shown.splitlines()[1].split(",")[2:6],
+                         ["-3.00", "0.0%", "1.25E-04", "19.99"])
+        self.run_tool(SAMPLE, "--csv", "out/")
+        self.assertEqual(sorted(p.name for p in (self.folder / "out").iterdir()),
+                         ["Measurements.csv", "Readings 2024.csv"])
+        self.assertIn("choose one with --sheet",
+                      self.run_tool(SAMPLE, "--csv", "one.csv", expected=2))
+
+    def test_worksheet_titles_make_safe_file_names(self):
+        title = b"../../up"
+        book = repacked(self.folder / "evil.xlsx", lambda name, content: content.replace(
+            b"Measurements", title) if name == "xl/workbook.xml" else content)
+        self.run_tool(book, "--csv", "out/", "--sheet", "../../up")
+        self.assertEqual([p.name for p in (self.folder / "out").iterdir()], ["_.._.._up.csv"])
+
+    def test_options_change_results(self):
+        cases = [
+            (["--names", "none"], lambda c: c[""]["kind"] == "text"),
+            (["--names", "infer"], lambda c: c["Id"]["values"][0] == 1),
+            (["--name-row", "2", "--rows", "2"],
+             lambda c: c["Zürich"]["values"] == ["Αθήνα", "Київ"]),
+            (["--first-row", "5"], lambda c: c["Id"]["values"][0] == 4),
+            (["--head", "2"], lambda c: c["Id"]["values"] == [1, 2]),
+            (["--sheet", "Readings 2024", "--skip-blank-rows"],
+             lambda c: c[""]["rows"] == 5),
+            (["--pad"], lambda c: c["Sum"]["rows"] == 12),
+            (["--clean-text"], lambda c: c["Comment"]["values"][4] == "spaces around"),
+            (["--dates-as-text"], lambda c: c["Taken"]["values"][0] == "2/26/24 6:45"),
+            (["--decimal", ","], lambda c: c["Fixed"]["shown"][1] == "-0,50"),
+            (["--missing", "-3"], lambda c: c["Count"]["values"][4] is None),
+            (["--missing-number", "12=missing"], lambda c: c["Count"]["values"][0] is None),
+            (["--missing-word", "n/a=-1"], lambda c: c["Count"]["values"][2] == -1),
+            (["--missing-text", "NA=none"], lambda c: c["Comment"]["values"][6] == "none"),
+            (["--max-text", "3"], lambda c: c["Com"]["values"][0] == "fir"),
+            (["--max-name", "2"], lambda c: "Co" in c),
+            (["--range", "-1:10"], lambda c: c["Count"]["values"][:2] == [None, 7]),
+            (["--type", "A=text"], lambda c: c["Id"]["values"][0] == "1"),
+            (["--type", "1!2=datetime"], lambda c: c["General"]["iso"][6] == "1900-01-01"),
+            (["--exclude", "b"], lambda c: "General" not in c),
+            (["--exclude", "Measurements!B"], lambda c: "General" not in c),
+            (["--exclude-sheet", "1"], lambda c: len(c) == 1),
+            (["--rename", "Measurements!B=a=b!"], lambda c: "a=b!" in c),
+            (["--position", "C=40"], lambda c: c["Fixed"]["position"] == 40),
+            (["--true", "", "--false", "no", "--clean-sheet-names"], lambda c: "Passed" in c),
+        ]
+        for arguments, holds in cases:
+            with self.subTest(arguments):
+                self.assertTrue(holds(self.columns(*arguments)))
+
+    def test_a_preview_reads_101_rows(self):
+        book = json.loads(self.run_tool(self.many_rows(), "--json", "--preview"))
+        column = book["worksheets"][0]["columns"][0]
+        self.assertEqual((column["values"][0], len(column["values"]), column["rows"]),
+                         (2.5, 101, 59999))
+
+    def test_missing_values_show_as_wished(self):
+        text = self.run_tool(SAMPLE, "--missing-display", "n.a.", "--sheet", "2", "--head", 1)
+        self.assertIn("n.a.", text)
+
+    def test_blank_rows_are_found_without_the_excluded_columns(self):
+        sheet = self.read("--sheet", "2", "--names", "none", "--skip-blank-rows",
+                          "--exclude", "B", "--exclude", "C")[0]
+        self.assertEqual(sheet["columnsLeftOut"], 2)
+        self.assertEqual(sheet["columns"][0]["values"], ["sensor 0", "sensor 2", "sensor 4"])
+
+    def test_wrong_usage(self):
+        cases = [[], ["--no-such"], [SAMPLE, "--head", "x"], [SAMPLE, "--sheet", "Nowhere"],
+                 [SAMPLE, "--names", "none", "--name-row", "3"], [SAMPLE, "--type", "A=colour"],
+                 [SAMPLE, "--exclude", "XFE"], [SAMPLE, "--rename", "A"], [SAMPLE, "--range", "5"],
+                 [SAMPLE, "--range", "2:1"], [SAMPLE, "--decimal", "1"], [SAMPLE, "--list", "--csv"],
+                 [SAMPLE, "--csv", "--json"], [SAMPLE, "--rows", "0"], [SAMPLE, "--missing", "nan"],
+                 [SAMPLE, "--exclude", "Nowhere!A"], [SAMPLE, SAMPLE], [SAMPLE, "--as-shown"],
+                 [SAMPLE, "--missing-word", "a=1", "--missing-number", "1=2"],
+                 [SAMPLE, "--json", SAMPLE]]
+        for arguments in cases:
+            with self.subTest(arguments):
+                self.run_tool(*arguments, expected=2)
+
+    def damaged(self, name):
+        """A workbook for the row `name` of the table of failures."""
+        book = self.folder / f"{name}.xlsx"
+        drop = {"no styles": "xl/styles.xml", "no sheet": "xl/worksheets/sheet1.xml"}.get(name)
+        sheet = "xl/worksheets/sheet1.xml"
+        if name == "text":
+            book.write_text("no package")
+        elif name == "folder":
+            book.mkdir()
+        elif name == "checksum":
+            content = bytearray(repacked(book, lambda _, part: part).read_bytes())
+            content[content.index(b"<sheetData>") + 1] ^= 1
+            book.write_bytes(content)
+        elif name in ("cut part", "cell"):
+            change = (lambda part: part[:200]) if name == "cut part" else (
+                lambda part: part.replace(b'r="A2"', b'r="A"'))
+            repacked(book, lambda part, content: change(content) if part == sheet else content)
+        elif drop:
+            repacked(book, lambda part, content: None if part == drop else content)
+        return book
+
+    def test_failures_have_one_line_and_their_own_code(self):
+        cases = [("missing", 17), ("folder", 17), ("text", 22), ("no styles", 25),
+                 ("no sheet", 13), ("cut part", 13), ("cell", 13), ("checksum", 1)]
+        for name, code in cases:
+            with self.subTest(name):
+                book = self.damaged(name)
+                self.assertIn(f"{book}: ", self.run_tool(book, expected=code))
+        other = shutil.copy(SAMPLE, self.folder / "book.xlsm")
+        self.run_tool(other, expected=22)
+        self.run_tool(SAMPLE, expected=5, TMPDIR=str(self.folder / "none"))
+
+    def test_unreachable_library_and_output(self):
+        self.run_tool(SAMPLE, "--library", "none.so", expected=4)
+        self.run_tool(SAMPLE, expected=4, DPXLSX_LIBRARY=str(SAMPLE))
+        self.run_tool(SAMPLE, "--json", "/dev/full", expected=3)
+        self.run_tool(SAMPLE, "--json", "none/x.json", expected=3)
+        self.run_tool(SAMPLE, "--csv", f"{SAMPLE}/x/", expected=3)
+
+    def test_a_relative_name_and_any_letter_case_open(self):
+        shutil.copy(SAMPLE, self.folder / "BOOK.XLSX")
+        self.assertIn("Empty", self.run_tool("BOOK.XLSX", "--list"))
+        self.assertIn("Measurements", self.run_tool("BOOK.XLSX"))
+
+    def test_a_closed_pipe_is_no_error(self):
+        reader, writer = os.pipe()
+        os.close(reader)
+        done = subprocess.run([TOOL, str(SAMPLE)], stdout=writer, stderr=subprocess.PIPE,
+                              env=self.environment(), check=False)
+        os.close(writer)
+        self.assertEqual((done.returncode, done.stderr), (0, b""))
+
+    def test_an_interrupt_leaves_nothing_behind(self):
+        # The pipe is never read: the program waits in the middle of its output.
+        child = subprocess.Popen([TOOL, str(self.many_rows()), "--csv"], stdout=subprocess.PIPE,
+                                 env=self.environment())
+        child.stdout.read(1)
+        child.send_signal(signal.SIGTERM)
+        child.stdout.read()
+        child.stdout.close()
+        self.assertEqual(child.wait(), 128 + signal.SIGTERM)
+
+    def book_of(self, cells):
+        """A workbook whose first worksheet has these cells (attributes and content) in column A."""
+        rows = "".join(f'<row r="{r}"><c r="A{r}" {cell}</c></row>'
+                       for r, cell in enumerate(cells, start=1)).encode()
+        return repacked(self.folder / "made.xlsx", lambda name, content: re.sub(
+            b"<sheetData>.*</sheetData>", b"<sheetData>" + (
+                rows if name.endswith("sheet1.xml") else b"") + b"</sheetData>", content,
+            flags=re.S) if "worksheets/sheet" in name else content)
+
+    def many_rows(self):
+        return self.book_of(f"><v>{r}.5</v>" for r in range(1, 60001))
+
+    def test_date_times_are_read_and_shown_by_the_host(self):
+        cases = [("2024-01-05", "2024-01-05"), ("1/5/2024 13:45", "2024-01-05T13:45:00"),
+                 (" 5 Jan 2024 ", "2024-01-05"), ("13:45", "13:45:00"),
+                 ("2024-02-30", None), ("2024-01-05 or so", None), ("1/5/1820", None),
+                 (59, "1900-02-28"), (60, "1900-02-29"), (61, "1900-03-01"), (0.5, "12:00:00"),
+                 (2958465.5, "9999-12-31T12:00:00"), (2958466, None), (-1, None),
+                 ("1/1/1900", "1900-01-01"), ("2/28/1900", "1900-02-28"),
+                 ("12/31/9999", "9999-12-31")]
+        cells = [f't="inlineStr"><is><t xml:space="preserve">{given}</t></is>'
+                 if isinstance(given, str) else f"><v>{given}</v>" for given, _ in cases]
+        text = self.run_tool(self.book_of(cells), "--json", "--names", "none", "--type",
+                             "A=datetime")
+        column = json.loads(text)["worksheets"][0]["columns"][0]
+        self.assertEqual(column["iso"], [wanted for _, wanted in cases])
+
+    def test_the_help_fits_a_screen_and_the_manual_has_every_option(self):
+        text = self.run_tool("--help")
+        self.assertLessEqual(text.count("\n"), 50)
+        self.assertLessEqual(max(map(len, text.splitlines())), 100)
+        manual = (SOURCE / "docs" / "tool.md").read_text()
+        for option in re.findall(r"--[a-z-]+", text):
+            self.assertIn(f"`{option}", manual)
+        self.assertRegex(self.run_tool("--version"), r"^dpxlsx \d+\.\d+\.\d+\n$")
+
+
+if __name__ == "__main__":
+    unittest.main()

@@ -1,0 +1,237 @@
+#include "readers/xml_reader.h"
+
+#include <clocale>
+#include <cstdlib>
+#include <cstring>
+#include <random>
+
+#include <gmock/gmock.h>
+#include <libxml/xmlerror.h>
+#include <libxml/xmlreader.h>
+
+#include "readers/cm_xml_cast.h"
+#include "tests/temporary_files.h"
+
+namespace {
+
+class XmlReading : public TemporaryFiles {
+  protected:
+    void open(XmlReader& reader, const std::string& document) {
+        reader.mInitialize(write("part.xml", document));
+    }
+    // Reads the whole document; the code of the exception, or 0.
+    int codeOfReading(const std::string& document) {
+        try {
+            XmlReader reader;
+            open(reader, document);
+            while (reader.readNode()) {
+            }
+            return 0;
+        } catch (const CmXmlException& e) {
+            return e.code();
+        }
+    }
+};
+
+TEST_F(XmlReading, GoesToElements) {
+    XmlReader reader;
+    open(reader, "<a>text<b><sheets x='1'/></b><sheets></sheets><c/></a>");
+    EXPECT_FALSE(reader.endOfFile);
+    EXPECT_TRUE(reader.mGotoElement("a"));
+    EXPECT_TRUE(reader.mGotoElement("sheets")) << "at any depth";
+    int x = 0;
+    EXPECT_TRUE(reader.mReadAttribute(x, "x"));
+    EXPECT_EQ(x, 1);
+    xmlTextReaderMoveToElement(reader.textReader);
+    EXPECT_TRUE(reader.mGotoElement("sheets")) << "stays on the element";
+    EXPECT_EQ(xmlTextReaderHasAttributes(reader.textReader), 1);
+    reader.readToElement();
+    reader.readNode();
+    EXPECT_EQ(reader.nodeType(), XML_READER_TYPE_END_ELEMENT);
+    EXPECT_TRUE(reader.mGotoElement("sheets")) << "an end tag has the name as well";
+    EXPECT_FALSE(reader.mGotoElement("Sheets")) << "letter case counts";
+    EXPECT_TRUE(reader.endOfFile);
+}
+
+TEST_F(XmlReading, FindsElementsOfAList) {
+    XmlReader reader;
+    open(reader, "<a><Row/><x><Cell/></x>text</a>");
+    using dp::xml::mReadForElements;
+    EXPECT_EQ(mReadForElements(reader, {}), -1);
+    EXPECT_STREQ(reader.nodeName(), "a") << "did not move";
+    EXPECT_EQ(mReadForElements(reader, {"Row", "Cell"}), 0);
+    EXPECT_EQ(mReadForElements(reader, {"Cell", "Row"}), 1) << "stays where it is";
+    EXPECT_EQ(mReadForElements(reader, {"Cell"}), 0);
+    EXPECT_EQ(mReadForElements(reader, {"Row"}), -1);
+    EXPECT_TRUE(reader.endOfFile);
+}
+
+TEST_F(XmlReading, ReadsIntegerAttributes) {
+    XmlReader reader;
+    open(reader,
+         "<a blank=' 12abc' word='abc' minus='-7' plus='+7' empty='' big='99999999999' "
+         "low='-99999999999' entity='&#49;2'/>");
+    const struct {
+        const char* name;
+        bool found;
+        int value;
+        unsigned unsignedValue;
+    } cases[] = {{"blank", true, 12, 12},
+                 {"word", true, 5, 5},
+                 {"minus", true, -7, 4294967289},
+                 {"plus", true, 7, 7},
+                 {"empty", true, 5, 5},
+                 {"absent", false, 5, 5},
+                 {"big", true, 2147483647, 4294967295},
+                 {"low", true, -2147483647, 1},
+                 {"entity", true, 12, 12}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        int value = 5;
+        int again = 5;
+        unsigned unsignedValue = 5;
+        EXPECT_EQ(reader.mReadAttribute(value, c.name), c.found);
+        EXPECT_EQ(reader.mReadAttribute_NotSafe(again, c.name), c.found);
+        EXPECT_EQ(reader.mReadAttribute(unsignedValue, c.name), c.found);
+        EXPECT_EQ(value, c.value);
+        EXPECT_EQ(again, c.value);
+        EXPECT_EQ(unsignedValue, c.unsignedValue);
+    }
+}
+
+TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
+    std::string deep;
+    for (int i = 0; i < 300; ++i) deep += "<a>";
+    write("secret.txt", "secret");
+    const std::string external = "<!DOCTYPE a [<!ENTITY e SYSTEM \"secret.txt\">]><a>&e;</a>";
+    const std::string bomb =
+        "<!DOCTYPE a [<!ENTITY a \"ha\"><!ENTITY b \"&a;&a;&a;&a;&a;&a;&a;&a;\">"
+        "<!ENTITY c \"&b;&b;&b;&b;&b;&b;&b;&b;\"><!ENTITY d \"&c;&c;&c;&c;&c;&c;&c;&c;\">]>"
+        "<a>&d;&d;&d;&d;</a>";
+    const std::string huge = "<a>" + std::string(12'000'000, 'x') + "</a>";
+    const struct {
+        const char* name;
+        std::string document;
+        int code;
+    } cases[] = {{"empty", "", 13},
+                 {"no XML", "PK", 13},
+                 {"cut in half", "<a><b>text</b><b>te", 13},
+                 {"well-formed", "<a><b>text</b></a>", 0},
+                 {"deep", deep, 13},
+                 {"external entity", external, 0},
+                 {"nested entities", bomb, 13},
+                 {"12 MB of text", huge, 13}};
+    testing::internal::CaptureStderr();
+    for (const auto& c : cases) EXPECT_EQ(codeOfReading(c.document), c.code) << c.name;
+    EXPECT_THROW(XmlReader().mInitialize(file("nowhere.xml")), CmXmlException);
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "") << "nothing is printed";
+
+    XmlReader reader;
+    open(reader, external);
+    std::string text;
+    while (reader.readNode())
+        if (reader.nodeType() == XML_READER_TYPE_TEXT) text += reader.nodeValue();
+    EXPECT_EQ(text, "") << "external entities are not fetched";
+}
+
+int errorsSeen = 0;
+void countErrors(void*, xmlErrorPtr) { ++errorsSeen; }
+
+TEST_F(XmlReading, LeavesTheHandlersOfTheHostAlone) {
+    int context = 0;
+    xmlSetStructuredErrorFunc(&context, countErrors);
+    EXPECT_THROW(XmlReader().mInitialize(file("nowhere.xml")), CmXmlException);
+    EXPECT_EQ(codeOfReading("<a><b></a>"), 13);
+    EXPECT_EQ(errorsSeen, 0);
+    EXPECT_EQ(xmlStructuredError, &countErrors);
+    EXPECT_EQ(xmlStructuredErrorContext, &context);
+    xmlSetStructuredErrorFunc(nullptr, nullptr);
+}
+
+TEST_F(XmlReading, ReadsAPrivateCopyWhereLibxml2CannotOpenThePath) {
+    // To the file system a relative path, to libxml2 the address of another file.
+    const std::string path = "file:///nowhere/part.xml";
+    write(path, "<a><b/></a>");
+    boost::filesystem::current_path(files());
+    {
+        XmlReader reader;
+        reader.mInitialize(path);
+        EXPECT_TRUE(reader.tempCopy);
+        const boost::filesystem::path copy(reader.tempPath);
+        EXPECT_TRUE(boost::filesystem::exists(copy));
+        EXPECT_EQ(copy.parent_path(), temporary());
+        EXPECT_THAT(copy.filename().string(), testing::MatchesRegex("[0-9a-f]{4}-[0-9a-f]{4}"));
+        EXPECT_TRUE(reader.mGotoElement("b"));
+    }
+    EXPECT_TRUE(boost::filesystem::is_empty(temporary()));
+    boost::filesystem::current_path(workingDirectory());
+}
+
+// What the conversion is defined to yield under the process's locale.
+double castLiterally(const std::string& text) {
+    std::string copy = text;
+    const char point = *std::localeconv()->decimal_point;
+    if (const auto last = copy.rfind('.'); point != '.' && last != copy.npos) copy[last] = point;
+    return std::atof(copy.c_str());
+}
+
+void compareCasts(unsigned count, unsigned seed) {
+    std::mt19937 random(seed);
+    const std::string alphabet = "0123456789.-+eE, x";
+    char text[64];
+    for (unsigned i = 0; i < count; ++i) {
+        if (i % 4 == 0) {  // any text over the alphabet of numbers
+            std::size_t length = random() % 10;
+            text[length] = '\0';
+            while (length > 0) text[--length] = alphabet[random() % alphabet.size()];
+        } else {
+            const double value =
+                std::ldexp(static_cast<double>(random()), static_cast<int>(random() % 200) - 100);
+            std::snprintf(text, sizeof text,
+                          i % 4 == 1   ? "%.17g"
+                          : i % 4 == 2 ? "%.6f"
+                                       : "%.3e",
+                          value);
+            if (char* comma = std::strchr(text, ',')) *comma = '.';
+        }
+        double value = -1.0;
+        CmXmlCast::instance().mCast(value, text);
+        ASSERT_EQ(value, castLiterally(text)) << '"' << text << '"';
+    }
+}
+
+TEST(CmXmlCast, YieldsWhatTheCLibraryYields) {
+    for (const char* text : {"", "abc", "  7", "+7", "0x1A", "1e999", "-1e-999", "12 kg", "1e5x",
+                             ".", "-", "-.5", "5.", "1.2.3", "\t-3.25\n", "4e-320"}) {
+        double value = -1.0;
+        CmXmlCast::instance().mCast(value, text);
+        EXPECT_EQ(value, castLiterally(text)) << text;
+    }
+    compareCasts(200'000, 1);
+    EXPECT_NE(CmXmlCast::m_pInstance, nullptr);
+}
+
+TEST(CmXmlCast, ReadsPointsUnderADecimalComma) {
+    const auto directory = boost::filesystem::temp_directory_path() /
+                           boost::filesystem::unique_path("locale-%%%%-%%%%");
+    boost::filesystem::create_directories(directory);
+    const std::string make =
+        "localedef -i de_DE -f UTF-8 " + (directory / "de_DE.UTF-8").string() + " >/dev/null 2>&1";
+    const bool made = std::system(make.c_str()) == 0;
+    ::setenv("LOCPATH", directory.c_str(), 1);
+    if (!made || !std::setlocale(LC_ALL, "de_DE.UTF-8")) {
+        ::unsetenv("LOCPATH");
+        GTEST_SKIP() << "no locale with a decimal comma can be made here";
+    }
+    double value = 0;
+    CmXmlCast::instance().mCast(value, "1.5");
+    EXPECT_EQ(value, 1.5);
+    CmXmlCast::instance().mCast(value, "1.234.5");
+    EXPECT_EQ(value, 1.0) << "only the last point is a decimal comma";
+    compareCasts(50'000, 2);
+    std::setlocale(LC_ALL, "C");
+    ::unsetenv("LOCPATH");
+    boost::filesystem::remove_all(directory);
+}
+
+}  // namespace

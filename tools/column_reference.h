@@ -1,0 +1,28 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace dp::tool {
+
+// A column as the user writes it: "C", "3", or "Sheet!C" for one worksheet only.
+struct ColumnReference {
+    std::string worksheet;  // name or key; empty for every worksheet
+    unsigned column = 0;    // 1-based
+};
+
+// COLUMN=VALUE.
+struct ColumnAssignment {
+    ColumnReference column;
+    std::string value;
+};
+
+// The 1-based number of "A" to "XFD" in any letter case or of "1" to "16384", else none.
+std::optional<unsigned> columnNumber(std::string_view text);
+
+// None when the text is no such reference or assignment.
+std::optional<ColumnReference> parseColumnReference(std::string_view text);
+std::optional<ColumnAssignment> parseColumnAssignment(std::string_view text);
+
+}  // namespace dp::tool

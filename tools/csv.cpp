@@ -1,0 +1,107 @@
+#include "tools/csv.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <set>
+
+#include "tools/exit_code.h"
+#include "tools/interrupt.h"
+#include "tools/output.h"
+#include "tools/text.h"
+
+namespace dp::tool {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+std::string quoted(const std::string& text) {
+    const bool spaces = !text.empty() && (text.front() == ' ' || text.back() == ' ');
+    if (!spaces && text.find_first_of(",\"\r\n") == std::string::npos) return text;
+    std::string result = "\"";
+    for (const char c : text) {
+        if (c == '"') result += '"';
+        result += c;
+    }
+    return result + '"';
+}
+
+std::string nameOf(const Column& column) {
+    const std::string name = column.name();
+    return name.empty() ? "C" + std::to_string(column.host().GetPosition()) : name;
+}
+
+template <class TextOf>
+void writeLine(Output& output, const LoadedWorksheet& worksheet, TextOf textOf) {
+    std::string line;
+    for (const Column& column : worksheet.columns) {
+        if (&column != &worksheet.columns.front()) line += ',';
+        line += quoted(validUtf8(textOf(column)));
+    }
+    // Readers skip a line without anything: this one has a field.
+    output.write(line.empty() ? "\"\"\n" : line + "\n");
+}
+
+void writeWorksheet(const LoadedWorksheet& worksheet, const Options& options,
+                    const std::string& path) {
+    Output output(path);
+    const size_t rows = std::min(worksheet.layout.rows, options.head.value_or(SIZE_MAX));
+    writeLine(output, worksheet, nameOf);
+    for (size_t row = 0; row < rows; ++row) {
+        stopIfInterrupted();
+        writeLine(output, worksheet, [&](const Column& column) {
+            return options.asShown ? column.shown(row) : column.exact(row);
+        });
+    }
+    output.finish();
+}
+
+// The title as a file name that stays in its folder and that no file system refuses.
+std::string fileName(const std::string& title) {
+    constexpr size_t kLongest = 200;  // bytes
+    std::string name = validUtf8(title);
+    for (char& c : name) {
+        const bool control = static_cast<unsigned char>(c) < 0x20;
+        if (control || std::string("/\\:*?\"<>|").find(c) != std::string::npos) c = '_';
+    }
+    if (name.empty() || name.front() == '.') name.insert(0, "_");
+    return validUtf8(name.substr(0, kLongest));
+}
+
+void writeFolder(Workbook& workbook, const Options& options,
+                 const std::vector<SheetEntry>& sheets) {
+    const fs::path folder(options.target);
+    std::error_code error;
+    fs::create_directories(folder, error);
+    if (error) {
+        throw Failure(kOutputFailure, options.target + ": the folder cannot be made (" +
+                                          error.message() + "); name another one");
+    }
+    std::set<std::string> taken;
+    for (const SheetEntry& sheet : sheets) {
+        std::string name = fileName(sheet.title);
+        while (!taken.insert(name).second) name += "-" + std::to_string(sheet.key);
+        writeWorksheet(workbook.load(sheet), options, (folder / (name + ".csv")).string());
+    }
+}
+
+bool meansFolder(const std::string& target) {
+    std::error_code error;
+    return target.back() == '/' || fs::is_directory(target, error);
+}
+
+}  // namespace
+
+void writeCsv(Workbook& workbook, const Options& options) {
+    const std::vector<SheetEntry> sheets = workbook.worksheets();
+    if (meansFolder(options.target)) return writeFolder(workbook, options, sheets);
+    if (sheets.empty()) return Output(options.target).finish();
+    if (sheets.size() > 1) {
+        throw Failure(kUsage, options.book + ": has " + std::to_string(sheets.size()) +
+                                  " worksheets to write; choose one with --sheet, or name a "
+                                  "folder: --csv FOLDER/");
+    }
+    writeWorksheet(workbook.load(sheets.front()), options, options.target);
+}
+
+}  // namespace dp::tool

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <stdexcept>
+#include <string>
+
+namespace dp::tool {
+
+// What the program ends with. Failures of the library keep the digits of its result code.
+enum ExitCode : int {
+    kSuccess = 0,
+    kReadFailure = 1,
+    kUsage = 2,
+    kOutputFailure = 3,
+    kLibraryFailure = 4,
+    kSystemFailure = 5,
+    kMalformedWorkbook = 13,
+    kNoSuchFile = 17,
+    kTemporaryDirectory = 18,
+    kNoPackage = 22,
+    kNoWorkbook = 25
+};
+
+// A failure that ends the program. The text says which file, what is wrong and what to do.
+class Failure : public std::runtime_error {
+  public:
+    Failure(ExitCode code, const std::string& text) : std::runtime_error(text), code_(code) {}
+
+    ExitCode code() const { return code_; }
+
+  private:
+    ExitCode code_;
+};
+
+// The failure behind a negative result code of opening or listing `book`.
+Failure readFailure(const std::string& book, long result);
+
+// The failure behind the exception that is being handled, one of the library's own included. Only
+// to be called from a catch block.
+Failure currentFailure(const std::string& book);
+
+// Prints the text as one line on standard error, with the program's name before it.
+void printFailure(const std::string& text);
+
+}  // namespace dp::tool

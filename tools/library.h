@@ -1,0 +1,29 @@
+#pragma once
+
+#include <string>
+
+#include "model/host/entry_points.h"
+#include "model/host/i_data_provider.h"
+
+namespace dp::tool {
+
+// The import library. Once loaded it stays until the program ends: what it threw may still be
+// alive, and the libraries beneath it keep tables that unloading would lose.
+class Library {
+  public:
+    // Loads the library at `path`. With an empty path: the one that the environment variable
+    // DPXLSX_LIBRARY names, else the one in the folder lib next to the program's own, else the one
+    // that the loader finds. Throws a Failure when none can be loaded.
+    explicit Library(const std::string& path);
+
+    // The library's own name for the type of the file, empty when it is not one of its files.
+    std::string fileType(const std::string& book) const;
+    // A provider with a reference count of 0. Throws a Failure when there is none.
+    IDataProvider* createProvider(const std::string& type) const;
+
+  private:
+    decltype(&CreateDataProvider) create_;
+    decltype(&GetDataProviderFiletype) type_;
+};
+
+}  // namespace dp::tool

@@ -1,0 +1,30 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+
+namespace dp::tool {
+
+// One line on standard error that says how far long work is. It shows only on a terminal and is
+// erased when the work is done.
+class Progress {
+  public:
+    Progress();
+    ~Progress();
+    Progress(const Progress&) = delete;
+    Progress& operator=(const Progress&) = delete;
+
+    void opening(const std::string& book);
+    // `number` is 1-based. At most ten times a second anything is printed.
+    void column(const std::string& worksheet, size_t number, size_t count);
+    void erase();
+
+  private:
+    void show(const std::string& text);
+
+    bool terminal_;
+    bool shown_ = false;
+    double lastShown_ = 0;  // seconds
+};
+
+}  // namespace dp::tool

@@ -1,0 +1,217 @@
+#include "tools/settings.h"
+
+#include <algorithm>
+#include <memory>
+#include <set>
+
+#include "model/host/i_column.h"
+#include "model/host/i_finders.h"
+#include "model/host/i_string.h"
+#include "model/host/i_worksheet.h"
+#include "tools/counted.h"
+#include "tools/date_time_helper.h"
+#include "tools/exit_code.h"
+
+namespace dp::tool {
+
+namespace {
+
+double numberOr(const NumberOrMissing& number, const ReadSettings& settings) {
+    return number.value_or(settings.missing.value_or(kDefaultMissing));
+}
+
+void applyMissing(IDataProvider& provider, const ReadSettings& settings) {
+    if (settings.missing) provider.SetMissingValue(*settings.missing);
+    if (settings.missingDisplay) {
+        provider.SetMissingValueTextRepresentation(settings.missingDisplay->c_str());
+    }
+    if (settings.missingText) {
+        const auto& [from, to] = *settings.missingText;
+        provider.SetMissingText(from.c_str(), to.c_str());
+    }
+    if (settings.missingNumber) {
+        const auto& [from, to] = *settings.missingNumber;
+        provider.SetMissingNumeric(numberOr(from, settings), numberOr(to, settings));
+    }
+    if (settings.missingWord) {
+        const auto& [from, to] = *settings.missingWord;
+        provider.SetAlphaMissingNumeric(from.c_str(), numberOr(to, settings));
+    }
+}
+
+void applyTexts(IDataProvider& provider, const ReadSettings& settings) {
+    if (settings.maxText) provider.SetMaximumTextLength(*settings.maxText);
+    if (settings.maxName) provider.SetMaxVariableNameLength(*settings.maxName);
+    if (settings.trueText) provider.SetBooleanTrueValue(settings.trueText->c_str());
+    if (settings.falseText) provider.SetBooleanFalseValue(settings.falseText->c_str());
+    provider.SetReadOptionCleanTextValues(settings.cleanText);
+    provider.SetReadOptionCleanWorksheetNames(settings.cleanSheetNames);
+    provider.SetReadOptionConvertDateTimeToText(settings.datesAsText);
+}
+
+bool isNamed(const SheetEntry& sheet, const std::string& name) {
+    return sheet.title == name || std::to_string(sheet.key) == name;
+}
+
+[[noreturn]] void noSuchSheet(const Options& options, const std::vector<SheetEntry>& sheets,
+                              const std::string& name) {
+    std::string list;
+    for (const SheetEntry& sheet : sheets) {
+        list += (list.empty() ? "" : ", ") + sheet.title + " (" + std::to_string(sheet.key) + ")";
+    }
+    throw Failure(kUsage, options.book + ": there is no worksheet \"" + name + "\"; " +
+                              (list.empty() ? "it has none with cells" : "it has " + list));
+}
+
+// The key of the worksheet with this name, else of the one with this key.
+int keyOf(const Options& options, const std::vector<SheetEntry>& sheets, const std::string& name) {
+    const auto titled = [&](const SheetEntry& sheet) { return sheet.title == name; };
+    auto found = std::find_if(sheets.begin(), sheets.end(), titled);
+    if (found == sheets.end()) {
+        found = std::find_if(sheets.begin(), sheets.end(),
+                             [&](const SheetEntry& sheet) { return isNamed(sheet, name); });
+    }
+    if (found == sheets.end()) noSuchSheet(options, sheets, name);
+    return found->key;
+}
+
+std::set<int> keysOf(const Options& options, const std::vector<SheetEntry>& sheets,
+                     const std::vector<std::string>& names) {
+    std::set<int> keys;
+    for (const std::string& name : names) keys.insert(keyOf(options, sheets, name));
+    return keys;
+}
+
+// Whether a host would find a variable name in any column of the worksheet.
+bool hasNames(IDataProvider& provider, int sheet) {
+    IVariableFinder& finder = *provider.GetVariableFinder();
+    const IReadOnlyCollection<int>& keys = *finder.GetColumnPrimeKeys(sheet);
+    for (unsigned long i = 0; i < keys.Count(); ++i) {
+        IColumn* found = nullptr;
+        if (!finder.FindColumn(keys.Item(i), &found, true)) continue;
+        const Counted<IColumn> column(found);
+        if (*column->GetName()->database_str() != '\0') return true;
+    }
+    return false;
+}
+
+// The row that the library takes the names from. What it inferred it does not tell: the names do.
+unsigned nameRowOf(IDataProvider& provider, const ReadSettings& settings, int sheet) {
+    switch (settings.names.value_or(VNR_GIVEN)) {
+        case VNR_NONE:
+            return 0;
+        case VNR_GIVEN:
+            return settings.nameRow == 0 ? 1 : settings.nameRow;
+        case VNR_INFER:
+            break;
+    }
+    provider.SetPreviewing(true);  // less to convert
+    const bool found = hasNames(provider, sheet);
+    provider.SetPreviewing(settings.preview);
+    return found ? 1 : 0;
+}
+
+void applyRows(IDataProvider& provider, const ReadSettings& settings, int sheet) {
+    const auto key = static_cast<unsigned>(sheet);
+    provider.SetReadOptionDataRowPositions(key, settings.names.value_or(VNR_GIVEN),
+                                           settings.nameRow, settings.firstRow);
+    if (settings.rows) provider.SetReadOptionDataRowCount(key, *settings.rows);
+}
+
+class ColumnOptions {
+  public:
+    ColumnOptions(const Options& options, const std::vector<SheetEntry>& sheets)
+        : options_(options), sheets_(sheets) {}
+
+    // Calls `act` for each worksheet that the reference means.
+    template <class Act>
+    void forEach(const ColumnReference& column, Act act) const {
+        const bool every = column.worksheet.empty();
+        const int wanted = every ? 0 : keyOf(options_, sheets_, column.worksheet);
+        for (const SheetEntry& sheet : sheets_) {
+            if (every || sheet.key == wanted) act(static_cast<unsigned>(sheet.key), column.column);
+        }
+    }
+
+    void apply(IDataProvider& provider) const {
+        const ReadSettings& settings = options_.settings;
+        for (const ColumnReference& excluded : settings.excluded) {
+            forEach(excluded, [&](unsigned key, unsigned column) {
+                provider.SetReadColumnOptionExclude(key, column, true);
+            });
+        }
+        for (const auto& [where, type] : settings.types) {
+            forEach(where, [&, wanted = type](unsigned key, unsigned column) {
+                provider.SetReadColumnOptionColumnType(key, column, wanted);
+            });
+        }
+        for (const auto& [where, name] : settings.renamed) {
+            forEach(where, [&, wanted = name](unsigned key, unsigned column) {
+                provider.SetReadColumnOptionName(key, column, wanted.c_str());
+            });
+        }
+        for (const auto& [where, place] : settings.positions) {
+            forEach(where, [&, wanted = place](unsigned key, unsigned column) {
+                provider.SetReadColumnOptionDestinationId(key, column, wanted);
+            });
+        }
+    }
+
+  private:
+    const Options& options_;
+    const std::vector<SheetEntry>& sheets_;
+};
+
+void excludeSheets(IDataProvider& provider, const Options& options,
+                   const std::vector<SheetEntry>& sheets) {
+    const std::set<int> wanted = keysOf(options, sheets, options.sheets);
+    const std::set<int> unwanted = keysOf(options, sheets, options.settings.excludedSheets);
+    for (const SheetEntry& sheet : sheets) {
+        const bool left =
+            unwanted.count(sheet.key) != 0 || (!wanted.empty() && wanted.count(sheet.key) == 0);
+        if (left) provider.SetReadOptionExclude(static_cast<unsigned>(sheet.key), true);
+    }
+}
+
+}  // namespace
+
+std::vector<SheetEntry> listSheets(IDataProvider& provider) {
+    IWorksheetFinder& finder = *provider.GetWorksheetFinder();
+    const IReadOnlyCollection<int>& keys = *finder.GetWorksheetPrimeKeys();
+    std::vector<SheetEntry> sheets;
+    for (unsigned long i = 0; i < keys.Count(); ++i) {
+        IWorksheet* found = nullptr;
+        if (!finder.FindWorksheet(keys.Item(i), &found)) continue;
+        const Counted<IWorksheet> sheet(found);
+        sheets.push_back({keys.Item(i), sheet->GetTitle()});
+    }
+    return sheets;
+}
+
+void applySettings(IDataProvider& provider, const ReadSettings& settings) {
+    auto helper = std::make_unique<DateTimeHelper>();
+    provider.SetDateTimeVariableFormatHelper(helper.release());
+    provider.SetReadOptionDefaultUseVariableNameRow(settings.names.value_or(VNR_GIVEN));
+    provider.SetPreviewing(settings.preview);
+    if (settings.decimal) provider.SetInputDecimal(*settings.decimal);
+    if (settings.range) provider.SetNumericRange(settings.range->first, settings.range->second);
+    applyMissing(provider, settings);
+    applyTexts(provider, settings);
+}
+
+std::map<int, unsigned> applyReadOptions(IDataProvider& provider, const Options& options) {
+    const std::vector<SheetEntry> sheets = listSheets(provider);
+    excludeSheets(provider, options, sheets);
+    std::map<int, unsigned> nameRows;
+    for (const SheetEntry& sheet : listSheets(provider)) {
+        applyRows(provider, options.settings, sheet.key);
+        nameRows[sheet.key] = nameRowOf(provider, options.settings, sheet.key);
+    }
+    ColumnOptions(options, sheets).apply(provider);
+    // Blank rows are found once, among the columns that are not excluded by then.
+    provider.SetReadOptionPadColumnsWithMissingValues(options.settings.pad);
+    provider.SetReadOptionIgnoreBlankRows(options.settings.skipBlankRows);
+    return nameRows;
+}
+
+}  // namespace dp::tool

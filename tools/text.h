@@ -1,0 +1,25 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+// Texts as a terminal shows them.
+namespace dp::tool {
+
+// The text as valid UTF-8: bytes that are none become U+FFFD.
+std::string validUtf8(std::string_view text);
+
+// The text on one line, safe for a terminal: control characters become visible signs, and marks
+// that turn the direction of what follows become U+FFFD.
+std::string printable(std::string_view text);
+
+// Terminal cells that a printable text takes: 2 for wide characters, 0 for combining ones.
+int displayWidth(std::string_view text);
+
+// The text cut to at most `width` cells; the last cell of a cut text is an ellipsis.
+std::string cutToWidth(const std::string& text, int width);
+
+// The text followed (or, to the right, preceded) by spaces up to `width` cells.
+std::string padded(const std::string& text, int width, bool toTheRight);
+
+}  // namespace dp::tool

@@ -1,0 +1,92 @@
+#include "tools/workbook.h"
+
+#include <algorithm>
+
+#include "model/host/i_finders.h"
+#include "tools/exit_code.h"
+#include "tools/interrupt.h"
+
+namespace dp::tool {
+
+namespace {
+
+// The library says more about a file of another type when it is asked to open it.
+std::string providerType(const Library& library, const std::string& book) {
+    const std::string type = library.fileType(book);
+    return type.empty() ? "xlsx" : type;
+}
+
+std::vector<int> columnKeys(IVariableFinder& finder, int sheet) {
+    const IReadOnlyCollection<int>& found = *finder.GetColumnPrimeKeys(sheet);
+    std::vector<int> keys;
+    for (unsigned long i = 0; i < found.Count(); ++i) keys.push_back(found.Item(i));
+    return keys;
+}
+
+}  // namespace
+
+Workbook::Workbook(const Library& library, const Options& options)
+    : options_(options), provider_(library.createProvider(providerType(library, options.book))) {}
+
+Workbook::~Workbook() { provider_->CloseFile(); }
+
+std::vector<std::string> Workbook::worksheetNames() {
+    std::vector<std::string> names;
+    provider_->SetReadOptionCleanWorksheetNames(options_.settings.cleanSheetNames);
+    const long result = provider_->GetWorksheets(options_.book.c_str(), names);
+    if (result != 0) throw readFailure(options_.book, result);
+    return names;
+}
+
+void Workbook::open() {
+    applySettings(*provider_, options_.settings);
+    progress_.opening(options_.book);
+    const long result = provider_->OpenFile(options_.book.c_str(), IDataProvider::FileAccess::Read);
+    if (result != 0) throw readFailure(options_.book, result);
+    stopIfInterrupted();
+    nameRows_ = applyReadOptions(*provider_, options_);
+    progress_.erase();
+}
+
+std::vector<SheetEntry> Workbook::worksheets() { return listSheets(*provider_); }
+
+LoadedWorksheet Workbook::load(const SheetEntry& sheet) {
+    LoadedWorksheet worksheet{findWorksheet(sheet.key), sheet.key, sheet.title, {}, {}, 0};
+    loadColumns(worksheet);
+    worksheet.layout = layoutOf(worksheet);
+    return worksheet;
+}
+
+Counted<IWorksheet> Workbook::findWorksheet(int key) {
+    IWorksheet* found = nullptr;
+    provider_->GetWorksheetFinder()->FindWorksheet(key, &found);
+    return Counted<IWorksheet>(found);
+}
+
+void Workbook::loadColumns(LoadedWorksheet& worksheet) {
+    IVariableFinder& finder = *provider_->GetVariableFinder();
+    const std::vector<int> keys = columnKeys(finder, worksheet.key);
+    for (size_t i = 0; i < keys.size(); ++i) {
+        stopIfInterrupted();
+        progress_.column(worksheet.title, i + 1, keys.size());
+        IColumn* column = nullptr;
+        if (finder.FindColumn(keys[i], &column, false)) {
+            worksheet.columns.emplace_back(column, missing(), options_.settings.preview);
+        } else {
+            ++worksheet.excludedColumns;
+        }
+    }
+    progress_.erase();
+}
+
+Layout Workbook::layoutOf(const LoadedWorksheet& worksheet) const {
+    Layout layout{nameRows_.at(worksheet.key), options_.settings.firstRow, 0,
+                  provider_->GetWorksheetRowCount(static_cast<unsigned>(worksheet.key))};
+    if (layout.firstDataRow == 0) layout.firstDataRow = layout.nameRow + 1;
+    for (const Column& column : worksheet.columns) {
+        layout.rows = std::max(layout.rows, column.rows());
+    }
+    return layout;
+}
+
+}  // namespace dp::tool

@@ -1,0 +1,67 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <vector>
+
+#include "model/host/i_data_provider.h"
+#include "model/host/i_worksheet.h"
+#include "tools/column.h"
+#include "tools/counted.h"
+#include "tools/library.h"
+#include "tools/options.h"
+#include "tools/progress.h"
+#include "tools/settings.h"
+
+namespace dp::tool {
+
+// Where a worksheet's values come from. Rows are 1-based rows of the worksheet.
+struct Layout {
+    unsigned nameRow;       // 0 for none
+    unsigned firstDataRow;  // where data starts
+    size_t rows;            // of the longest column
+    unsigned usedRows;      // the last row with a cell
+};
+
+struct LoadedWorksheet {
+    Counted<IWorksheet> host;
+    int key;
+    std::string title;
+    Layout layout;
+    std::vector<Column> columns;  // those that are not excluded
+    size_t excludedColumns;
+};
+
+// A workbook in a provider, closed at the end so that nothing stays on disk. Its operations throw
+// a Failure when the library reports one, and let the library's own exceptions pass.
+class Workbook {
+  public:
+    Workbook(const Library& library, const Options& options);
+    ~Workbook();
+    Workbook(const Workbook&) = delete;
+    Workbook& operator=(const Workbook&) = delete;
+
+    // The names of all worksheets, without reading any cell. Not after open().
+    std::vector<std::string> worksheetNames();
+
+    // Hands the settings over, reads the workbook and hands over the options of its worksheets.
+    void open();
+    // The wanted worksheets in workbook order.
+    std::vector<SheetEntry> worksheets();
+    LoadedWorksheet load(const SheetEntry& sheet);
+
+    // The number that marks a missing value.
+    double missing() const { return options_.settings.missing.value_or(kDefaultMissing); }
+
+  private:
+    Counted<IWorksheet> findWorksheet(int key);
+    void loadColumns(LoadedWorksheet& worksheet);
+    Layout layoutOf(const LoadedWorksheet& worksheet) const;
+
+    const Options& options_;
+    Counted<IDataProvider> provider_;
+    Progress progress_;
+    std::map<int, unsigned> nameRows_;  // by worksheet key
+};
+
+}  // namespace dp::tool
