@@ -1,5 +1,7 @@
 #include "model/columns.h"
 
+#include <algorithm>
+#include <iterator>
 #include <memory>
 #include <numeric>
 #include <utility>
@@ -77,16 +79,28 @@ struct ColumnAddress {
     const WorksheetCells::value_type* column;  // null for an unknown key
 };
 
-ColumnAddress decodeKey(const std::vector<WorksheetCells>& worksheets, int key) {
-    if (key <= 0) return {0, nullptr};
-    std::size_t remaining = static_cast<std::size_t>(key) - 1;
-    for (std::size_t position = 0; position < worksheets.size(); ++position) {
-        const WorksheetCells& cells = worksheets[position];
-        if (remaining < cells.size())
-            return {static_cast<unsigned>(position), &cells.nth(remaining)};
-        remaining -= cells.size();
+// Counts the columns before each worksheet, so that no key is sought by walking all of them.
+// Whoever changes the number of columns forgets the count of the last worksheet.
+void countColumns(const std::vector<WorksheetCells>& worksheets) {
+    if (worksheets.empty() || worksheets.back().columnsBefore) return;
+    std::size_t count = 0;
+    for (const WorksheetCells& cells : worksheets) {
+        cells.columnsBefore = count;
+        count += cells.size();
     }
-    return {0, nullptr};
+}
+
+ColumnAddress decodeKey(const std::vector<WorksheetCells>& worksheets, int key) {
+    if (key <= 0 || worksheets.empty()) return {0, nullptr};
+    countColumns(worksheets);
+    const std::size_t index = static_cast<std::size_t>(key) - 1;
+    // The last worksheet that starts at or before the column: one without columns never holds it.
+    const auto worksheet = std::prev(std::partition_point(
+        worksheets.begin(), worksheets.end(),
+        [index](const WorksheetCells& cells) { return *cells.columnsBefore <= index; }));
+    const std::size_t nth = index - *worksheet->columnsBefore;
+    if (nth >= worksheet->size()) return {0, nullptr};
+    return {static_cast<unsigned>(worksheet - worksheets.begin()), &worksheet->nth(nth)};
 }
 
 }  // namespace
@@ -97,10 +111,9 @@ IReadOnlyCollection<int>* ExcelDataProviderBase::GetColumnPrimeKeys(int workshee
     if (worksheetKey <= 0 || !worksheetExists(static_cast<unsigned>(worksheetKey)))
         return &_columnKeys;
     const unsigned position = GetWorksheetPosition(static_cast<unsigned>(worksheetKey));
-    std::size_t base = 1;
-    for (unsigned before = 0; before < position; ++before) base += _cells[before].size();
+    countColumns(_cells);
     keys.resize(_cells[position].size());
-    std::iota(keys.begin(), keys.end(), static_cast<int>(base));
+    std::iota(keys.begin(), keys.end(), static_cast<int>(*_cells[position].columnsBefore) + 1);
     return &_columnKeys;
 }
 

@@ -4,6 +4,7 @@
 
 #include <boost/filesystem.hpp>
 
+#include "readers/silence.h"
 #include "readers/xml_reader.h"
 
 namespace dp {
@@ -14,6 +15,7 @@ namespace {
 // not be there: only an error counts.
 bool isReadable(const std::string& workbookPart) {
     try {
+        const SilentLibxml2 silent;
         XmlReader reader;
         reader.mInitialize(workbookPart);
         for (const char* element : {"workbook", "bookViews", "sheets"})

@@ -1,5 +1,7 @@
 #include "provider/temporary_directory.h"
 
+#include <unistd.h>
+
 #include <sys/stat.h>
 
 #include <boost/filesystem.hpp>
@@ -10,16 +12,19 @@ namespace fs = boost::filesystem;
 
 std::string makePrivateDirectory() {
     boost::system::error_code error;
-    const fs::path model = fs::temp_directory_path() / "%%%%-%%%%";
-    const fs::path directory = fs::unique_path(model, error);
+    // Absolute, because the host may change its working directory before the file is closed.
+    const fs::path directory =
+        fs::absolute(fs::temp_directory_path()) / fs::unique_path("%%%%-%%%%", error);
     if (error) return {};
+    return makeOwnDirectory(directory.string()) ? directory.string() : std::string();
+}
+
+bool makeOwnDirectory(const std::string& path) {
     // Closed to others from its first moment; the second call undoes what the umask took away.
-    if (::mkdir(directory.c_str(), S_IRWXU) != 0) return {};
-    if (::chmod(directory.c_str(), S_IRWXU) != 0) {
-        fs::remove(directory, error);
-        return {};
-    }
-    return directory.string();
+    if (::mkdir(path.c_str(), S_IRWXU) != 0) return false;
+    if (::chmod(path.c_str(), S_IRWXU) == 0) return true;
+    ::rmdir(path.c_str());
+    return false;
 }
 
 void removeDirectoryAndContents(const std::string& path) {

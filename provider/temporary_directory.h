@@ -11,6 +11,10 @@ namespace dp {
 // system's error when there is no temporary directory.
 std::string makePrivateDirectory();
 
+// Makes one directory that its owner alone may use, whatever the umask. False when it cannot be
+// made.
+bool makeOwnDirectory(const std::string& path);
+
 // Removes a directory with everything below it; a path that names no directory is left alone, and
 // what cannot be removed stays.
 DPXLSX_API void removeDirectoryAndContents(const std::string& path);

@@ -12,6 +12,7 @@
 
 #include "provider/entry_name.h"
 #include "provider/package.h"
+#include "provider/temporary_directory.h"
 
 // The archive's entries, one after the other, into the private directory.
 namespace dp {
@@ -27,11 +28,12 @@ constexpr int kEntryFailed = UNZ_INTERNALERROR;
 // A file being written; closes with it.
 class OutputFile {
   public:
-    // Never through a link: nothing in the private directory is one unless somebody else put it
-    // there.
+    // Never through a link. Readable by its owner whatever the umask.
     explicit OutputFile(const std::string& path)
         : descriptor_(::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOFOLLOW | O_CLOEXEC,
-                             S_IRUSR | S_IWUSR)) {}
+                             S_IRUSR | S_IWUSR)) {
+        if (isOpen()) ::fchmod(descriptor_, S_IRUSR | S_IWUSR);
+    }
     ~OutputFile() {
         if (isOpen()) ::close(descriptor_);
     }
@@ -81,18 +83,22 @@ class Unpacking {
         if (result != UNZ_OK) return result;
         EntryName entry;
         if (!parseEntryName(name.data(), entry)) return kEntryFailed;
-        const fs::path parent = fs::path(directory_) / entry.directory;
-        if (!makeDirectory(parent)) return kEntryFailed;
-        return entry.file.empty() ? UNZ_OK : unpackFile((parent / entry.file).string());
+        if (!makeDirectories(entry.directory)) return kEntryFailed;
+        if (entry.file.empty()) return UNZ_OK;
+        return unpackFile((fs::path(directory_) / entry.directory / entry.file).string());
     }
 
-    // True when `path`, in the private directory, is a directory now; links do not count as one.
-    bool makeDirectory(const fs::path& path) const {
-        boost::system::error_code error;
-        fs::create_directories(path, error);
-        if (error) return false;
-        for (fs::path part = path; part != directory_; part = part.parent_path())
-            if (!fs::is_directory(fs::symlink_status(part, error)) || error) return false;
+    // True when every directory on the way to `relative` exists now. Nothing is made or found
+    // through a link, which nothing in the private directory is unless somebody else put it there.
+    bool makeDirectories(const std::string& relative) const {
+        fs::path path = directory_;
+        for (const fs::path& component : fs::path(relative)) {
+            path /= component;
+            boost::system::error_code error;
+            const fs::file_type type = fs::symlink_status(path, error).type();
+            if (type == fs::symlink_file || type == fs::status_error) return false;
+            if (type == fs::file_not_found && !makeOwnDirectory(path.string())) return false;
+        }
         return true;
     }
 

@@ -60,13 +60,17 @@ void ExcelDataProviderBase::RemoveWorksheet(int position) {
     eraseAt(_worksheetNames, position);
     eraseAt(_cells, position);
     eraseAt(_allWorksheetKeys.items, position);
+    if (!_cells.empty()) _cells.back().columnsBefore.reset();
 }
 
 void ExcelDataProviderBase::SetWorksheetIndex(int position) { _worksheetIndex = position; }
 
 void ExcelDataProviderBase::AddExternalDataRecord(const ExternalDataRecord& record) {
     if (!isPosition(_worksheetIndex, _cells)) return;
-    _cells[static_cast<std::size_t>(_worksheetIndex)].add(record);
+    WorksheetCells& cells = _cells[static_cast<std::size_t>(_worksheetIndex)];
+    const std::size_t columns = cells.size();
+    cells.add(record);
+    if (cells.size() != columns) _cells.back().columnsBefore.reset();
 }
 
 unsigned ExcelDataProviderBase::GetColumnCount(int worksheet) const {

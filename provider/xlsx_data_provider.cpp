@@ -35,6 +35,8 @@ PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     const fs::path copy = fs::path(_tempDirectory) / source.filename();
     boost::system::error_code error;
     fs::copy_file(source, copy, fs::copy_option::fail_if_exists, error);
+    // Readable for us whatever the umask and the source's own rights.
+    if (!error) fs::permissions(copy, fs::owner_read | fs::owner_write, error);
     if (error) {
         removeDirectoryAndContents(_tempDirectory);
         return PackageStatus::DirectoryUnusable;

@@ -4,6 +4,11 @@
 
 namespace dp {
 
+// The size of a worksheet. Cells beyond it exist in no workbook, and would make the work on rows
+// and columns as large as their numbers: readers take them for an error.
+inline constexpr int kWorksheetRows = 1'048'576;
+inline constexpr int kWorksheetColumns = 16'384;
+
 // Sets `column` to the 1-based column of a cell reference: 2 for "B7". The row digits are not read.
 // Throws CmXmlException for a reference of less than 2 characters, one without a digit behind the
 // first character, and a column beyond the last one of a worksheet.
@@ -19,12 +24,15 @@ class CellPlace {
     // `reference` is null when the cell has none. Throws CmXmlException.
     void beginCell(const char* reference);
 
-    unsigned row() const { return static_cast<unsigned>(row_); }
-    unsigned column() const { return static_cast<unsigned>(column_); }
+    // Of the current row and the last cell; 0 before the first ones.
+    unsigned row() const { return row_; }
+    unsigned column() const { return column_; }
 
   private:
-    int row_ = -1;
-    int column_ = -1;
+    unsigned row_ = 0;
+    unsigned column_ = 0;
+    int nextRow_ = 1;     // 1-based, like the next one
+    int nextColumn_ = 1;  // of the current row
 };
 
 }  // namespace dp

@@ -9,6 +9,7 @@
 #include <cstring>
 #include <limits>
 #include <string>
+#include <string_view>
 #include <system_error>
 
 namespace {
@@ -25,27 +26,32 @@ bool castPlainDecimal(double& value, const char* text) {
 }
 
 // atof reads numbers as the process's locale writes them. Only the last point is its decimal
-// separator: "1.234.5" under a decimal comma is 1.
+// separator: "1.234.5" under a decimal comma is 1. In some locales that is more than one byte.
 double castByLocale(const char* text) {
-    const char point = *std::localeconv()->decimal_point;
-    if (point == '.') return std::atof(text);
+    const std::string_view point = std::localeconv()->decimal_point;
+    if (point == ".") return std::atof(text);
     std::string copy(text);
-    if (const auto last = copy.rfind('.'); last != copy.npos) copy[last] = point;
+    if (const auto last = copy.rfind('.'); last != copy.npos) copy.replace(last, 1, point);
     return std::atof(copy.c_str());
 }
 
-template <class T>
-void castInteger(T& value, const char* text) {
-    while (std::isspace(static_cast<unsigned char>(*text))) ++text;
-    const bool negative = *text == '-';
-    if (*text == '-' || *text == '+') ++text;
+// The sign and digits of an integer, the magnitude at most the largest 64-bit number.
+struct ScannedInteger {
+    bool found = false;
+    bool negative = false;
     std::uint64_t magnitude = 0;
-    const auto result = std::from_chars(text, text + std::strlen(text), magnitude);
-    if (result.ptr == text) return;
-    constexpr auto kLargest = static_cast<std::uint64_t>(std::numeric_limits<T>::max());
-    if (result.ec == std::errc::result_out_of_range) magnitude = kLargest;
-    const auto bounded = static_cast<T>(std::min(magnitude, kLargest));
-    value = negative ? static_cast<T>(T{0} - bounded) : bounded;
+};
+
+ScannedInteger scanInteger(const char* text) {
+    while (std::isspace(static_cast<unsigned char>(*text))) ++text;
+    ScannedInteger scanned;
+    scanned.negative = *text == '-';
+    if (*text == '-' || *text == '+') ++text;
+    const auto result = std::from_chars(text, text + std::strlen(text), scanned.magnitude);
+    scanned.found = result.ptr != text;
+    if (result.ec == std::errc::result_out_of_range)
+        scanned.magnitude = std::numeric_limits<std::uint64_t>::max();
+    return scanned;
 }
 
 }  // namespace
@@ -61,6 +67,22 @@ void CmXmlCast::mCast(double& value, const char* text) const {
     if (!castPlainDecimal(value, text)) value = castByLocale(text);
 }
 
-void CmXmlCast::mCast(int& value, const char* text) const { castInteger(value, text); }
+bool CmXmlCast::mCast(int& value, const char* text) const {
+    const ScannedInteger scanned = scanInteger(text);
+    if (!scanned.found) return false;
+    constexpr std::uint64_t kLargest = std::numeric_limits<int>::max();
+    const auto bounded = static_cast<std::int64_t>(
+        std::min(scanned.magnitude, scanned.negative ? kLargest + 1 : kLargest));
+    value = static_cast<int>(scanned.negative ? -bounded : bounded);
+    return true;
+}
 
-void CmXmlCast::mCast(unsigned& value, const char* text) const { castInteger(value, text); }
+bool CmXmlCast::mCast(unsigned& value, const char* text) const {
+    const ScannedInteger scanned = scanInteger(text);
+    if (!scanned.found) return false;
+    constexpr std::uint64_t kLargest = std::numeric_limits<unsigned>::max();
+    const auto bounded = static_cast<unsigned>(std::min(scanned.magnitude, kLargest));
+    const bool wraps = scanned.negative && scanned.magnitude <= kLargest;
+    value = wraps ? 0U - bounded : bounded;
+    return true;
+}

@@ -11,10 +11,11 @@ class DPXLSX_API CmXmlCast {
     // Sets `value` to the number that `text` begins with, 0 when there is none.
     void mCast(double& value, const char* text) const;
     // Sets `value` to the integer that `text` begins with, white space and a sign before it
-    // allowed; leaves it as it was when there is none. A number too large becomes the largest one,
-    // and an unsigned number with a minus wraps around.
-    void mCast(int& value, const char* text) const;
-    void mCast(unsigned& value, const char* text) const;
+    // allowed. False, and `value` as it was, when there is none. A number out of range becomes the
+    // nearest one in range; an unsigned number
+    // with a minus wraps around while its digits are in range.
+    bool mCast(int& value, const char* text) const;
+    bool mCast(unsigned& value, const char* text) const;
 
     static CmXmlCast* m_pInstance;
 };

@@ -3,6 +3,8 @@
 #include <unordered_map>
 #include <utility>
 
+#include "readers/silence.h"
+
 // The workbook: which worksheets there are, and in which order their parts are read.
 namespace dp {
 
@@ -17,6 +19,7 @@ ExcelXLSXReader::ExcelXLSXReader(const std::string& dir, bool sharedStringsPrese
 ExcelXLSXReader::~ExcelXLSXReader() = default;
 
 void ExcelXLSXReader::mReadExcelWorkbook() {
+    const SilentLibxml2 silent;
     mReadExcel2007Styles();
     mReadSharedStrings();
     mReadWorkbookRelationships(xlDir, relationshipIds, relationshipTargets);
@@ -57,6 +60,7 @@ void ExcelXLSXReader::resolveNumberKinds() {
     std::unordered_map<std::string_view, int> firstById;
     for (std::size_t i = 0; i < styles.size(); ++i)
         firstById.try_emplace(styles[i].styleId, static_cast<int>(i));
+    firstById.erase("");  // a cell format without an id has no number format
     numberKinds.clear();
     numberKinds.reserve(cellXfNumFmtIds.size());
     for (const std::string& id : cellXfNumFmtIds) {
@@ -73,6 +77,7 @@ void ExcelXLSXReader::resolveNumberKinds() {
 namespace excel_xlsx {
 
 void GetWorksheets(const std::string& dir, std::vector<std::string>& names) {
+    const SilentLibxml2 silent;
     XmlReader reader;
     reader.mInitialize(dir + "/xl/workbook.xml");
     if (!reader.mGotoElement("sheets")) throw CmXmlException(kXmlError);

@@ -30,7 +30,8 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     void mReadSharedStrings();
     void mReadExcel2007Styles();
     void mAddPredefined2007Styles();
-    // Delivers the cells of the worksheet part that the relationship target names.
+    // Delivers the cells of the worksheet part that the relationship target names. Like the next
+    // one, for use while mReadExcelWorkbook runs.
     void mReadExcel2007Worksheet(const std::string& target);
     // Copies the target of the first relationship called `id`; leaves `target` alone without one.
     void mSearchWorkbookRelationships(const std::string& id, std::string& target);

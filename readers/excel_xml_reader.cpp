@@ -97,31 +97,22 @@ DateTimeMasks ExcelXmlReader::masks() {
 }
 
 bool ExcelXmlReader::mSearchStyleIndexForFormat(const std::string& id, xStyle*& style, int& index) {
-    index = -1;
-    style = nullptr;
-    for (std::size_t i = 0; i < styles.size(); ++i) {
-        if (styles[i].styleId != id) continue;
-        style = &styles[i];
-        index = static_cast<int>(i);
-        return true;
-    }
-    return false;
+    index = static_cast<int>(styleById_.find(styles, id));
+    style = index < 0 ? nullptr : &styles[static_cast<std::size_t>(index)];
+    return style != nullptr;
 }
 
 bool ExcelXmlReader::mGetFormat(unsigned column, unsigned row, int& styleIndex) {
     styleIndex = -1;
-    const auto resolve = [&](const std::vector<xStyleRange>& ranges, unsigned xStyleRange::*place,
-                             unsigned wanted) {
-        for (const xStyleRange& range : ranges) {
-            if (range.*place != wanted) continue;
-            currentStyleId = range.styleId;
-            mSearchStyleIndexForFormat(currentStyleId, currentStyle, styleIndex);
-            return true;
-        }
-        return false;
+    const auto resolve = [&](const std::vector<xStyleRange>& ranges, auto& index, unsigned place) {
+        const std::ptrdiff_t range = index.find(ranges, place);
+        if (range < 0) return false;
+        currentStyleId = ranges[static_cast<std::size_t>(range)].styleId;
+        mSearchStyleIndexForFormat(currentStyleId, currentStyle, styleIndex);
+        return true;
     };
-    if (resolve(columnStyles, &xStyleRange::column, column)) return true;
-    if (resolve(rowStyles, &xStyleRange::row, row)) return true;
+    if (resolve(columnStyles, styleByColumn_, column)) return true;
+    if (resolve(rowStyles, styleByRow_, row)) return true;
     if (!currentStyle) return false;
     mSearchStyleIndexForFormat(currentStyleId, currentStyle, styleIndex);
     return true;

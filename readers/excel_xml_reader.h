@@ -8,6 +8,7 @@
 #include "model/host/export.h"
 #include "model/host/i_data_provider.h"
 #include "model/host/i_variable_format.h"
+#include "readers/first_entry_index.h"
 #include "readers/xml_reader.h"
 #include "store/external_data_record.h"
 
@@ -31,7 +32,8 @@ class DPXLSX_API ExcelXmlReader {
     // worksheets of another workbook already. To be called before reading.
     void startAtWorksheet(int index) { worksheetIndex = index; }
 
-    // Delivers every worksheet with its cells; to be called once.
+    // Delivers every worksheet with its cells; to be called once. A cell in a row or column that no
+    // worksheet has is an error.
     virtual void mReadExcelWorkbook();
     // A new format for the style at `styleIndex`, owned by the caller; the automatic numeric format
     // for an index outside the table. A date-time code loses its backslashes in the table.
@@ -70,7 +72,8 @@ class DPXLSX_API ExcelXmlReader {
     void mReadExcelWorksheet(std::vector<unsigned>& emptySheets);
     void mReadExcelWorksheetDataHeader();
     void mReadExcelWorksheetData(unsigned columnCount, unsigned rowCount);
-    // Delivers the next value of the row, moving `column` on; true at the end of the table.
+    // Delivers the next value of the row, if there is one, moving `column` on; true when it met the
+    // options behind the table.
     bool mReadExcelWorksheetCell(unsigned& column, unsigned row, unsigned columnCount);
     void mReadExcelWorksheetCellData(unsigned column, unsigned row);
     void mAddExternalDataRecord(ExternalDataRecord& record, bool lookUpFormat);
@@ -84,7 +87,7 @@ class DPXLSX_API ExcelXmlReader {
     // Delivers a record and notes that the worksheet is not empty.
     void deliver(const ExternalDataRecord& record);
     bool isOnElement(const char* name) const;
-    bool isStyle(const std::string& id) const;
+    bool isStyle(const std::string& id);
     void readRow(unsigned row, unsigned columnCount);
     void beginCell(unsigned& column, unsigned& mergeAcross);
     std::string readStringData();
@@ -113,6 +116,11 @@ class DPXLSX_API ExcelXmlReader {
     std::string timeMask;
     std::string timeSeparator;
     std::string ampmMask;
+
+  private:
+    FirstEntryIndex<xStyle, std::string> styleById_{&xStyle::styleId};
+    FirstEntryIndex<xStyleRange, unsigned> styleByColumn_{&xStyleRange::column};
+    FirstEntryIndex<xStyleRange, unsigned> styleByRow_{&xStyleRange::row};
 };
 
 }  // namespace dp

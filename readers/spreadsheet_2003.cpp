@@ -1,8 +1,9 @@
-#include <algorithm>
 #include <string_view>
 #include <utility>
 
+#include "readers/cell_reference.h"
 #include "readers/excel_xml_reader.h"
+#include "readers/silence.h"
 
 // XML Spreadsheet 2003: the workbook, its styles and its worksheets.
 namespace dp {
@@ -22,12 +23,15 @@ bool readIndex(XmlReader& reader, unsigned& index) {
 }  // namespace
 
 void ExcelXmlReader::mReadExcelWorkbook() {
+    const SilentLibxml2 silent;
     mReadExcelStyles();
     std::vector<unsigned> emptySheets;
     emptySheets.reserve(100);
     while (!xmlReader.endOfFile && xml::mReadForElements(xmlReader, {"Worksheet"}) != -1) {
         columnStyles.clear();
         rowStyles.clear();
+        styleByColumn_.forget();
+        styleByRow_.forget();
         mReadExcelWorksheet(emptySheets);
     }
     removeEmptyWorksheets(emptySheets);
@@ -79,9 +83,7 @@ bool ExcelXmlReader::isOnElement(const char* name) const {
     return current && std::string_view(current) == name;
 }
 
-bool ExcelXmlReader::isStyle(const std::string& id) const {
-    return std::any_of(styles.begin(), styles.end(), DateTimeFormatEqualCode(id));
-}
+bool ExcelXmlReader::isStyle(const std::string& id) { return styleById_.find(styles, id) >= 0; }
 
 void ExcelXmlReader::mReadExcelWorksheetDataHeader() {
     unsigned column = 0;
@@ -91,13 +93,14 @@ void ExcelXmlReader::mReadExcelWorksheetDataHeader() {
         readIndex(xmlReader, column);
         std::string style = xmlReader.attributeText("ss:StyleID");
         if (!style.empty() && isStyle(style)) columnStyles.push_back({column, 0, std::move(style)});
-        ++column;
+        if (column < kWorksheetColumns) ++column;
         xmlReader.readToElement();
     }
     if (element == -1) fail();
 }
 
-// Ends with the row, however many columns the table claims to have.
+// Ends with the row or the counted columns, whichever comes first; a table may claim to have any
+// number of columns.
 void ExcelXmlReader::readRow(unsigned row, unsigned columnCount) {
     unsigned column = 0;
     while (column < columnCount) {

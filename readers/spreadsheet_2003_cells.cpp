@@ -6,6 +6,7 @@
 #include <libxml/xmlreader.h>
 
 #include "readers/attributes.h"
+#include "readers/cell_reference.h"
 #include "readers/cm_xml_cast.h"
 #include "readers/excel_xml_reader.h"
 
@@ -17,17 +18,13 @@ namespace {
 // Positions in elementNames.
 enum Element { kNone = -1, kCell, kData, kWorksheetOptions, kRow, kPrefixedData, kComment };
 
-// The size of a worksheet; see the reader of .xlsx worksheets.
-constexpr unsigned kRows = 1'048'576;
-constexpr unsigned kColumns = 16'384;
-
 unsigned saturatingSum(unsigned left, unsigned right) {
     const unsigned room = std::numeric_limits<unsigned>::max() - left;
     return left + std::min(right, room);
 }
 
 ExternalDataRecord recordAt(unsigned column, unsigned row, ExternalCellType type) {
-    if (row >= kRows || column >= kColumns) throw CmXmlException(kXmlError);
+    if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
     ExternalDataRecord record(0, 0, row, column);
     record.cell.type = type;
     return record;
@@ -83,11 +80,14 @@ void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
     mergeAcross = 0;
     if (const char* text = attributes.find("MergeAcross", "ss"))
         CmXmlCast::instance().mCast(mergeAcross, text);
+    // Wider than a worksheet, or negative: it would hide the cells behind it.
+    if (mergeAcross >= kWorksheetColumns) mergeAcross = 0;
 }
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    const char* typeName = Attributes(xmlReader).find("Type", "ss");
+    Attributes attributes(xmlReader);
+    const char* typeName = attributes.find("Type", "ss");
     const std::string type = typeName ? typeName : "";
     xmlReader.readNode();
     if (!hasContent) return;

@@ -78,8 +78,7 @@ class StyleSheetPass {
 
   private:
     void beginNumberFormats() {
-        int count = 0;
-        if (reader_.mReadAttribute(count, "count")) declared_ = count;
+        reader_.mReadAttribute(declared_, "count");
         if (declared_ <= 0) return;
         styles_.clear();
         owner_.mAddPredefined2007Styles();
@@ -92,7 +91,7 @@ class StyleSheetPass {
         style.styleId = reader_.attributeText("numFmtId");
         style.formatCode = reader_.attributeText("formatCode");
         const auto size = static_cast<std::int64_t>(styles_.size());
-        if (style.formatCode.empty() || size >= declared_ + kBuiltInCount) return;
+        if (style.formatCode.empty() || size >= std::int64_t{declared_} + kBuiltInCount) return;
         owner_.mSetFmtType(style);
         styles_.push_back(std::move(style));
     }
@@ -106,7 +105,7 @@ class StyleSheetPass {
     XmlReader& reader_;
     std::vector<xStyle>& styles_;
     std::vector<std::string>& cellFormats_;
-    std::int64_t declared_ = 0;  // custom formats
+    int declared_ = 0;  // custom formats
     bool builtInsAdded_ = false;
     bool inCellFormats_ = false;
 };

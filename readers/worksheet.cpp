@@ -92,11 +92,12 @@ class WorksheetPass {
 
   private:
     void beginRow() {
-        // Not a number: as if there were none.
-        constexpr int kNone = -0x7FFFFFFF - 1;
-        int number = kNone;
-        reader_.mReadAttribute_NotSafe(number, "r");
-        place_.beginRow(number == kNone ? nullptr : &number);
+        Attributes attributes(reader_);
+        const char* text = attributes.find("r");
+        int number = 0;
+        // A row whose number is none counts as one without.
+        const bool numbered = text && CmXmlCast::instance().mCast(number, text);
+        place_.beginRow(numbered ? &number : nullptr);
     }
 
     void beginCell(const Names& names) {

@@ -7,36 +7,31 @@
 #include <libxml/xmlreader.h>
 
 #include "readers/cm_xml_cast.h"
+#include "readers/silence.h"
 
 namespace {
 
 namespace fs = boost::filesystem;
 
-// Errors are told by the result of a call, never by a message. The options alone do not keep
-// libxml2 quiet: it still prints a line for a text of over 10 MB.
-void ignoreError(void*, xmlErrorPtr) {}
+// libxml2 takes a path with a scheme for the address of another file, on another machine even.
+bool looksLikeAddress(const std::string& path) { return path.find("://") != path.npos; }
 
-// libxml2 reports a file that it cannot open through the thread's own channel, which may be the
-// host's: silenced for one call, then put back.
-class SilentThread {
-  public:
-    SilentThread() : handler_(xmlStructuredError), context_(xmlStructuredErrorContext) {
-        xmlSetStructuredErrorFunc(nullptr, ignoreError);
-    }
-    ~SilentThread() { xmlSetStructuredErrorFunc(context_, handler_); }
-    SilentThread(const SilentThread&) = delete;
-    SilentThread& operator=(const SilentThread&) = delete;
+// The path as libxml2 wants it: it takes a percent sign for the start of an escape, by which a name
+// could lead to another file, out of its directory even.
+std::string escaped(const std::string& path) {
+    std::string text;
+    for (const char byte : path) byte == '%' ? text.append("%25") : text.append(1, byte);
+    return text;
+}
 
-  private:
-    xmlStructuredErrorFunc handler_;
-    void* context_;
-};
-
+// Null for a path that libxml2 cannot open, or under which it would open something else.
 xmlTextReaderPtr openFile(const std::string& path) {
-    const SilentThread silent;
+    boost::system::error_code error;
+    if (looksLikeAddress(path) || !fs::exists(path, error)) return nullptr;
     xmlTextReaderPtr reader =
-        xmlReaderForFile(path.c_str(), nullptr, XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
-    if (reader) xmlTextReaderSetStructuredErrorHandler(reader, ignoreError, nullptr);
+        xmlReaderForFile(escaped(path).c_str(), nullptr, XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
+    // The options alone do not keep libxml2 quiet: it still prints a line for a text of over 10 MB.
+    if (reader) xmlTextReaderSetStructuredErrorHandler(reader, dp::SilentLibxml2::ignore, nullptr);
     return reader;
 }
 
@@ -44,8 +39,7 @@ xmlTextReaderPtr openFile(const std::string& path) {
 // error when there is no temporary directory.
 std::string copyToTemporary(const std::string& path) {
     boost::system::error_code error;
-    const fs::path model = fs::temp_directory_path() / "%%%%-%%%%";
-    const fs::path copy = fs::unique_path(model, error);
+    const fs::path copy = fs::temp_directory_path() / fs::unique_path("%%%%-%%%%", error);
     if (error) return {};
     fs::copy_file(path, copy, fs::copy_option::fail_if_exists, error);
     return error ? std::string() : copy.string();
@@ -61,6 +55,7 @@ XmlReader::~XmlReader() {
 }
 
 void XmlReader::mInitialize(const std::string& path) {
+    const dp::SilentLibxml2 silent;
     textReader = openFile(path);
     if (!textReader) {
         tempPath = copyToTemporary(path);

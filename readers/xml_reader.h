@@ -36,8 +36,8 @@ class DPXLSX_API XmlReader {
     // CmXmlException when the file cannot be opened, is empty, or begins with an error.
     void mInitialize(const std::string& path);
 
-    // Moves forward to the next node called `name`, staying where it is when the current node has
-    // that name, an end tag included. False at the end of the document. Throws CmXmlException.
+    // Moves forward to the next element called `name`, staying where it is when the current node,
+    // of any kind, has that name. False at the end of the document. Throws CmXmlException.
     bool mGotoElement(const char* name);
 
     // Reads an integer attribute of the current element; T is int or unsigned. True when the

@@ -18,7 +18,8 @@ DPXLSX_API const char* GetDataProviderFiletype(const char* fileName);
 DPXLSX_API bool IsMicrosoftXLSXFile(const char* fileName);
 
 // Makes a provider for the type "xlsx" (exactly so written) with a reference count of 0.
-// Returns 0, -22 for another type name, -1 when it cannot be made; then *provider is null.
+// Returns 0, -22 for another type name, -1 when it cannot be made or `provider` is null. *provider
+// is null unless the result is 0.
 DPXLSX_API long CreateDataProvider(const char* typeName, IDataProvider** provider);
 
 }  // extern "C"

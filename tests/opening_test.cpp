@@ -1,0 +1,259 @@
+#include <unistd.h>
+
+#include <clocale>
+#include <sys/stat.h>
+
+#include "model/host/entry_points.h"
+#include "provider/entry_name.h"
+#include "readers/xml_reader.h"
+#include "tests/package_builder.h"
+#include "tests/recording_provider.h"
+#include "tests/temporary_files.h"
+
+// Entry points, unpacking, and what is left on disk.
+namespace {
+
+namespace fs = boost::filesystem;
+using Access = dp::IDataProvider::FileAccess;
+
+const std::string kRow = "<row><c><v>1</v></c></row>";
+
+TEST(EntryPoints, KnowTheirFiles) {
+    const struct {
+        const char* name;
+        bool ours;
+    } cases[] = {{"Book1.XLSX", true}, {"a.b.XlSx", true},       {"/dir.x/book.xlsx", true},
+                 {"book.xlsm", false}, {"book.xls", false},      {"book", false},
+                 {"xlsx", false},      {"book.xlsx.bak", false}, {"/dir.xlsx/book", false},
+                 {"", false},          {nullptr, false}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name ? c.name : "null");
+        EXPECT_EQ(dp::IsMicrosoftXLSXFile(c.name), c.ours);
+        EXPECT_STREQ(dp::GetDataProviderFiletype(c.name), c.ours ? "xlsx" : "");
+    }
+}
+
+TEST(EntryPoints, MakeProvidersOfTheirTypeOnly) {
+    for (const char* type : {"XLSX", "xls", "", static_cast<const char*>(nullptr)}) {
+        auto* provider = reinterpret_cast<dp::IDataProvider*>(&type);
+        EXPECT_EQ(dp::CreateDataProvider(type, &provider), -22);
+        EXPECT_EQ(provider, nullptr);
+    }
+    dp::IDataProvider* provider = nullptr;
+    ASSERT_EQ(dp::CreateDataProvider("xlsx", &provider), 0);
+    EXPECT_EQ(provider->AddRef(), 1U);
+    provider->Release();
+    EXPECT_EQ(dp::CreateDataProvider("xlsx", nullptr), -1);
+}
+
+TEST(EntryNames, StayInTheirDirectory) {
+    const struct {
+        const char* name;
+        bool sound;
+        const char* directory;
+        const char* file;
+    } cases[] = {{"xl/workbook.xml", true, "xl", "workbook.xml"},
+                 {"[Content_Types].xml", true, "", "[Content_Types].xml"},
+                 {"xl/a/", true, "xl/a", ""},
+                 {"./xl//./b.xml", true, "xl", "b.xml"},
+                 {"xl/.", true, "xl", ""},
+                 {"", true, "", ""},
+                 {"xl\\b.xml", true, "", "xl\\b.xml"},
+                 {"..x/...", true, "..x", "..."},
+                 {"/etc/b", false, "", ""},
+                 {"C:b", false, "", ""},
+                 {"..", false, "", ""},
+                 {"xl/../../b", false, "", ""},
+                 {"xl/..", false, "", ""}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        dp::EntryName entry;
+        EXPECT_EQ(dp::parseEntryName(c.name, entry), c.sound);
+        if (!c.sound) continue;
+        EXPECT_EQ(entry.directory, c.directory);
+        EXPECT_EQ(entry.file, c.file);
+    }
+}
+
+class Opening : public TemporaryFiles {
+  protected:
+    long open(const std::string& path) { return provider.OpenFile(path.c_str(), Access::Read); }
+    long openPackage(const PackageBuilder& package) {
+        package.write(file("book.xlsx"));
+        return open(file("book.xlsx"));
+    }
+    PackageBuilder sound() { return PackageBuilder::of({kRow}); }
+    // Everything below the temporary directory, sorted.
+    std::string unpacked() {
+        std::vector<std::string> entries;
+        for (fs::recursive_directory_iterator at(temporary()), end; at != end; ++at)
+            entries.push_back(fs::relative(at->path(), provider.GetTempDirectoryPath()).string());
+        std::sort(entries.begin(), entries.end());
+        std::string text;
+        for (const std::string& entry : entries) text += entry + " ";
+        return text;
+    }
+
+    void TearDown() override {
+        provider.CloseFile();
+        TemporaryFiles::TearDown();
+    }
+
+    RecordingProvider provider;
+};
+
+TEST_F(Opening, AnswersResultCodes) {
+    fs::create_directory(file("folder.xlsx"));
+    write("text.xlsx", "no package");
+    write("empty.xlsx", "");
+    sound().write(file("report.xlsm"));
+    sound().write(file("report"));
+    fs::create_symlink(file("nowhere.xlsx"), file("dangling.xlsx"));
+    const struct {
+        const char* name;
+        long result;
+    } cases[] = {{"missing.xlsx", -17}, {"folder.xlsx", -17}, {"dangling.xlsx", -17},
+                 {"report.xlsm", -22},  {"report", -22},      {"text.xlsx", -22},
+                 {"empty.xlsx", -22}};
+    std::vector<std::string> names;
+    for (const auto& c : cases) {
+        EXPECT_EQ(open(file(c.name)), c.result) << c.name;
+        EXPECT_EQ(provider.GetWorksheets(file(c.name).c_str(), names), c.result) << c.name;
+    }
+    EXPECT_EQ(provider.OpenFile(nullptr, Access::Read), -17);
+    provider.CloseFile();
+    EXPECT_EQ(provider.OpenFile(file("text.xlsx").c_str(), Access::Write), -1);
+    EXPECT_TRUE(fs::is_empty(temporary()));
+}
+
+TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
+    const mode_t before = ::umask(0777);
+    const long result = openPackage(sound().add("docs/", "").add("docs/deep/er/a.txt", "a"));
+    ::umask(before);
+    ASSERT_EQ(result, 0);
+    const fs::path directory = provider.GetTempDirectoryPath();
+    EXPECT_EQ(directory.parent_path(), temporary());
+    EXPECT_EQ(fs::status(directory).permissions(), fs::owner_all);
+    EXPECT_EQ(unpacked(),
+              ". book.xlsx docs docs/deep docs/deep/er docs/deep/er/a.txt xl xl/_rels "
+              "xl/_rels/workbook.xml.rels xl/styles.xml xl/workbook.xml xl/worksheets "
+              "xl/worksheets/sheet1.xml ");
+    EXPECT_EQ(provider.CloseFile(), 0);
+    EXPECT_FALSE(fs::exists(directory));
+    EXPECT_EQ(provider.GetTempDirectoryPath(), "");
+    EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 1UL) << "the cells stay";
+}
+
+TEST_F(Opening, ResolvesRelativeNames) {
+    sound().write(file("BOOK.XLSX"));
+    fs::current_path(files());
+    ::setenv("TMPDIR", "../tmp", 1);
+    EXPECT_EQ(open("BOOK.XLSX"), 0);
+    EXPECT_EQ(fs::current_path(), files());
+    const fs::path directory = provider.GetTempDirectoryPath();
+    EXPECT_TRUE(directory.is_absolute());
+    EXPECT_TRUE(fs::exists(directory / "BOOK.XLSX"));
+    fs::current_path(workingDirectory());
+    ::setenv("TMPDIR", temporary().c_str(), 1);
+    provider.CloseFile();
+}
+
+TEST_F(Opening, WritesNothingOutside) {
+    const std::string longName(300, 'n');
+    const struct {
+        const char* name;
+        PackageBuilder package;
+        long result;
+    } cases[] = {
+        {"climbs out", sound().add("../escaped", "x"), -1},
+        {"climbs out of a folder", sound().add("xl/../../escaped", "x"), -1},
+        {"absolute", sound().add(file("escaped"), "x"), -1},
+        {"drive letter", sound().add("C:escaped", "x"), -1},
+        {"named like the copy", sound().add("book.xlsx", "x"), -1},
+        {"named like the copy, dotted", sound().add("./book.xlsx", "x"), -1},
+        {"directory where a file is wanted", sound().add("xl", "x"), -1},
+        {"file where a directory is wanted", sound().add("xl/styles.xml/x", "x"), -1},
+        {"directory entry of a file", sound().add("xl/styles.xml/", ""), 0},
+        {"twice", sound().add("xl/worksheets/sheet1.xml", PackageBuilder::worksheet(kRow)), 0},
+        {"equal once cut", sound().add(longName + "1", "x").add(longName + "2", "x"), 0},
+        {"no name", sound().add("", "x"), 0},
+        {"target in disguise",
+         sound().set("xl/_rels/workbook.xml.rels",
+                     PackageBuilder::relationships(PackageBuilder::relation(
+                         "r1", "worksheet", "..%2f..%2f..%2ffiles/secret.xml"))),
+         13},
+    };
+    write("secret.xml", PackageBuilder::worksheet(kRow));
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        long result = 0;
+        try {
+            result = openPackage(c.package);
+        } catch (const CmXmlException& e) {
+            result = e.code();
+        }
+        EXPECT_EQ(result, c.result);
+        provider.CloseFile();
+        EXPECT_TRUE(fs::is_empty(temporary()));
+        EXPECT_FALSE(fs::exists(file("escaped")) || fs::exists(temporary() / "escaped"));
+    }
+}
+
+TEST_F(Opening, ChecksEveryEntry) {
+    sound().add("docs/a.txt", std::string(5000, 'a')).write(file("book.xlsx"));
+    std::string bytes;
+    fs::load_string_file(file("book.xlsx"), bytes);
+    const auto at = bytes.find("docs/a.txt");
+    ASSERT_NE(at, bytes.npos);
+    bytes[at + 10 + 4] = static_cast<char>(bytes[at + 10 + 4] ^ 0x55);
+    write("broken.xlsx", bytes);
+    EXPECT_EQ(open(file("broken.xlsx")), -1);
+    EXPECT_NE(provider.GetTempDirectoryPath(), "") << "left until the next step";
+    EXPECT_EQ(openPackage(sound()), 0) << "which opening is";
+    provider.CloseFile();
+}
+
+TEST_F(Opening, StaysUsableAfterFailures) {
+    EXPECT_THROW(openPackage(PackageBuilder::of({kRow, "<row>"})), CmXmlException);
+    EXPECT_NE(provider.taken(), "");
+    EXPECT_EQ(provider.CloseFile(), 0);
+    provider.ClearWorksheets();
+    EXPECT_EQ(openPackage(sound()), 0);
+    EXPECT_EQ(provider.taken(), "+S1 @0 0,0=1 @0");
+    // Without clearing, the next workbook's worksheets follow, its empty ones removed.
+    EXPECT_EQ(openPackage(PackageBuilder::of({"", kRow, kRow})), 0);
+    EXPECT_EQ(provider.taken(), "+S1 @1 +S2 @2 0,0=1 +S3 @3 0,0=1 -1 @0");
+    EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 3UL);
+    EXPECT_EQ(provider.GetWorksheetRowCount(1), 1U);
+}
+
+TEST_F(Opening, ReportsAMissingTemporaryDirectory) {
+    ::setenv("TMPDIR", file("nowhere").c_str(), 1);
+    sound().write(file("book.xlsx"));
+    EXPECT_THROW(open(file("book.xlsx")), fs::filesystem_error);
+    ::setenv("TMPDIR", temporary().c_str(), 1);
+    if (::geteuid() != 0) {
+        fs::permissions(temporary(), fs::owner_read | fs::owner_exe);
+        EXPECT_EQ(open(file("book.xlsx")), -18);
+        fs::permissions(temporary(), fs::owner_all);
+    }
+}
+
+TEST_F(Opening, PrintsNothingWhateverTheEncoding) {
+    const std::string bad = "<?xml version='1.0' encoding='Shift_JIS'?><worksheet>\x80\xff\xfd" +
+                            std::string(5000, '\x81') + "</worksheet>";
+    testing::internal::CaptureStderr();
+    testing::internal::CaptureStdout();
+    for (const char* part :
+         {"xl/worksheets/sheet1.xml", "xl/workbook.xml", "xl/styles.xml", "xl/sharedStrings.xml"}) {
+        try {
+            openPackage(sound().set(part, bad));
+        } catch (const CmXmlException&) {
+        }
+        provider.CloseFile();
+    }
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
+    EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
+}
+
+}  // namespace

@@ -1,0 +1,386 @@
+#include <boost/lexical_cast.hpp>
+
+#include "formats/date_time_variable_format.h"
+#include "readers/excel_xml_reader.h"
+#include "tests/recording_provider.h"
+#include "tests/temporary_files.h"
+
+// XML Spreadsheet 2003 documents of literal parts, read into a provider that notes what reaches it.
+namespace {
+
+// The host's side of date-times: answers the fields as one number.
+class FieldsHelper : public dp::DateTimeVariableFormat {
+  public:
+    double GenerateTime(int year, int month, int day, int hour, int minute, int second,
+                        int millisecond) const override {
+        return year * 10000 + month * 100 + day + hour / 100.0 + minute / 1e4 + second / 1e6 +
+               millisecond / 1e9;
+    }
+};
+
+class Spreadsheet2003 : public TemporaryFiles {
+  protected:
+    static std::string table(const std::string& content, const std::string& size) {
+        return "<Table " + size + ">" + content + "</Table>";
+    }
+    // A worksheet of `rows` in a table that is large enough.
+    static std::string sheet(const std::string& rows) {
+        return "<Worksheet ss:Name='S'>" +
+               table(rows, "ss:ExpandedColumnCount='9' ss:ExpandedRowCount='20'") +
+               "<WorksheetOptions/></Worksheet>";
+    }
+    static std::string document(const std::string& content, const std::string& styles = "") {
+        return "<Workbook xmlns:ss='urn:s'><Styles>" + styles + "</Styles>" + content +
+               "</Workbook>";
+    }
+    static std::string number(const std::string& value, const std::string& attributes = "") {
+        return "<Cell " + attributes + "><Data ss:Type='Number'>" + value + "</Data></Cell>";
+    }
+
+    // The calls that reach the provider, "!13" behind them when the reader fails.
+    std::string read(const std::string& content) {
+        dp::ExcelXmlReader reader(write("book.xml", content), "m/d/yy", 1.23456e30, &provider,
+                                  &helper);
+        std::string outcome;
+        try {
+            reader.mReadExcelWorkbook();
+        } catch (const CmXmlException& e) {
+            outcome = " !" + std::to_string(e.code());
+        }
+        return provider.taken() + outcome;
+    }
+    // The records of one worksheet of rows.
+    std::string readRows(const std::string& rows, const std::string& styles = "") {
+        provider.taken();
+        std::string calls = read(document(sheet(rows), styles));
+        provider.ClearWorksheets();
+        for (const std::string frame : {"+S @0 ", "+S @0", " @0", " -0", "-0"})
+            if (const auto at = calls.find(frame); at != calls.npos) calls.erase(at, frame.size());
+        return calls;
+    }
+
+    RecordingProvider provider;
+    FieldsHelper helper;
+};
+
+TEST_F(Spreadsheet2003, CellsByPlaceAndKind) {
+    const auto n = [](const std::string& value, const std::string& attributes = "") {
+        return number(value, attributes);
+    };
+    const auto data = [](const std::string& type, const std::string& value) {
+        return "<Cell><Data ss:Type='" + type + "'>" + value + "</Data></Cell>";
+    };
+    const struct {
+        const char* name;
+        std::string rows;
+        const char* expected;
+    } cases[] = {
+        {"in order", "<Row>" + n("1") + n("2") + "</Row><Row>" + n("3") + "</Row>",
+         "0,0=1 0,1=2 1,0=3"},
+        {"row index forward and back",
+         "<Row>" + n("1") + "</Row><Row ss:Index='5'>" + n("2") + "</Row><Row ss:Index='2'>" +
+             n("3") + "</Row>",
+         "0,0=1 4,0=2 5,0=3"},
+        {"cell index forward and back",
+         "<Row>" + n("1", "ss:Index='3'") + n("2") + n("3", "ss:Index='1'") + "</Row>",
+         "0,2=1 0,3=2 0,4=3"},
+        {"merged", "<Row>" + n("1", "ss:MergeAcross='2'") + n("2") + "</Row>", "0,0=1 0,3=2"},
+        {"cells without data move on", "<Row><Cell/><Cell></Cell>" + n("1") + "</Row>", "0,2=1"},
+        {"a row ends early", "<Row/><Row><Cell/></Row><Row>" + n("1") + "</Row>", "2,0=1"},
+        {"cells behind the counted columns",
+         "<Row>" + n("1", "ss:Index='9'") + n("2") + "</Row><Row>" + n("3") + "</Row>",
+         "0,8=1 1,0=3"},
+        {"index 0 counts as none", "<Row ss:Index='0'>" + n("1", "ss:Index='0'") + "</Row>",
+         "0,0=1"},
+        {"attributes with references",
+         "<Row>" + n("1", "ss:Index='&#51;'") + data("&#83;tring", "a") + "</Row>",
+         "0,2=1 0,3='a'"},
+        {"merged by a negative number", "<Row>" + n("1", "ss:MergeAcross='-1'") + n("2") + "</Row>",
+         "0,0=1 0,1=2"},
+        {"Boolean", "<Row>" + data("Boolean", "1") + "</Row>", "0,0=1"},
+        {"error and unknown", "<Row>" + data("Error", "#N/A") + data("number", "1") + "</Row>", ""},
+        {"text of runs",
+         "<Row>" + data("String", "a<B>b</B> <I>c</I>") + data("String", "   ") + n("1") + "</Row>",
+         "0,0='ab c' 0,2=1"},
+        {"prefixed data",
+         "<Row><Cell><ss:Data ss:Type='String'>a<B>b</B></ss:Data></Cell>" + n("1") + "</Row>",
+         "0,0='ab' 0,1=1"},
+        {"no escapes are decoded", "<Row>" + data("String", "_x000D_") + "</Row>", "0,0='_x000D_'"},
+        {"comment",
+         "<Row><Cell><Data ss:Type='Number'>1</Data><Comment><ss:Data ss:Type='String'>c</ss:Data>"
+         "</Comment></Cell>" +
+             n("2") + "</Row>",
+         "0,0=1 0,1=2"},
+        {"empty data swallows nothing",
+         "<Row><Cell><Data ss:Type='String'/></Cell><Cell><Data ss:Type='Number'/></Cell>"
+         "<Cell><Data ss:Type='String'></Data></Cell>" +
+             data("DateTime", "") + n("1") + "<Cell><Data/></Cell></Row>",
+         "0,4=1"},
+        {"date-time", "<Row>" + data("DateTime", "2010-01-05T10:30:59.125") + "</Row>",
+         "0,0=d2.01001e+07"},
+    };
+    for (const auto& c : cases) EXPECT_EQ(readRows(c.rows), c.expected) << c.name;
+}
+
+TEST_F(Spreadsheet2003, StylesOfCellsRowsAndColumns) {
+    const std::string styles =
+        "<Style ss:ID='none'/><Style/><Style ss:ID='date'><NumberFormat ss:Format='Short Date'/>"
+        "</Style><Style ss:ID='time'><NumberFormat ss:Format='h:mm'/></Style>"
+        "<Style ss:ID='fix'><NumberFormat ss:Format='Fixed'/></Style>"
+        "<Style ss:ID='bare'><NumberFormat/></Style>"
+        "<Style ss:ID='both'><NumberFormat ss:Format='d/m/yy h:mm'/></Style>";
+    const auto n = [](const std::string& id) {
+        return number("1", id.empty() ? "" : "ss:StyleID='" + id + "'");
+    };
+    const struct {
+        const char* name;
+        std::string rows;
+        const char* expected;
+    } cases[] = {
+        {"date, time, both, number",
+         "<Row>" + n("date") + n("time") + n("both") + n("fix") + n("none") + n("bare") + n("x") +
+             "</Row>",
+         "0,0=d1#0 0,1=1#1 0,2=d1#3 0,3=1#2 0,4=1 0,5=1 0,6=1"},
+        {"column before row before cell",
+         "<Column ss:StyleID='fix'/><Column ss:Index='3' ss:StyleID='date'/><Row ss:StyleID='time'>"
+         "" + n("both") +
+             n("both") + n("both") + "</Row><Row>" + n("") + n("both") + n("") + n("") + "</Row>",
+         "0,0=1#2 0,1=1#1 0,2=d1#0 1,0=1#2 1,1=d1#3 1,2=d1#0 1,3=1"},
+        {"texts carry a style too",
+         "<Row><Cell ss:StyleID='date'><Data ss:Type='String'>a</Data></Cell></Row>", "0,0='a'#0"},
+    };
+    for (const auto& c : cases) EXPECT_EQ(readRows(c.rows, styles), c.expected) << c.name;
+}
+
+TEST_F(Spreadsheet2003, WorksheetsAndFailures) {
+    const std::string cell = "<Row>" + number("1") + "</Row>";
+    const std::string size = "ss:ExpandedColumnCount='1' ss:ExpandedRowCount='1'";
+    const auto named = [&](const std::string& name, const std::string& content) {
+        return "<Worksheet ss:Name='" + name + "'>" + content + "</Worksheet>";
+    };
+    const std::string full = table(cell, size);
+    const std::string options = "<WorksheetOptions/>";
+    const struct {
+        const char* name;
+        std::string content;
+        const char* expected;
+    } cases[] = {
+        {"empty ones first, in the middle and last",
+         named("A", table("<Row/>", size) + options) + named("B", full + options) +
+             named("C", table("", size) + options) + named("D", full + options) +
+             named("E", table("<Row><Cell/></Row>", size) + options),
+         "+A @0 +B @1 0,0=1 +C @2 +D @3 0,0=1 +E @4 -4 -2 -0 @0"},
+        {"without a table", named("A", options) + named("B", full + options), "+B @0 0,0=1 @0"},
+        {"without a row count", named("A", table(cell, "ss:ExpandedColumnCount='1'") + options),
+         "+A @0 -0"},
+        {"options before the rows",
+         named("A", "<Table " + size + "/>" + options) + named("B", full),
+         "+A @0 +B @1 0,0=1 -0 @0"},
+        {"without options", named("A", full) + named("B", full), "+A @0 0,0=1 +B @1 0,0=1 @0"},
+        {"without a name", "<Worksheet>" + full + "</Worksheet>", "+ @0 0,0=1 @0"},
+        {"no worksheet", "", " !13"},
+        {"neither table nor options", named("A", ""), " !13"},
+        {"ends in the column header", named("A", table("<Column/>", size)), " !13"},
+        {"counts that nothing fills",
+         named("A", table(cell,
+                          "ss:ExpandedColumnCount='4294967295' "
+                          "ss:ExpandedRowCount='4294967295'") +
+                        options),
+         "+A @0 0,0=1 @0"},
+        {"a row that no worksheet has",
+         named("A", table("<Row ss:Index='1048577'>" + number("1") + "</Row>",
+                          "ss:ExpandedColumnCount='1' ss:ExpandedRowCount='4294967295'")),
+         "+A @0 !13"},
+        {"merged beyond all columns",
+         named("A", table("<Row>" + number("1", "ss:MergeAcross='4294967295'") + number("2") +
+                              "</Row>" + cell,
+                          "ss:ExpandedColumnCount='9' ss:ExpandedRowCount='2'") +
+                        options),
+         "+A @0 0,0=1 0,1=2 1,0=1 @0"},
+    };
+    for (const auto& c : cases) {
+        EXPECT_EQ(read(document(c.content)), c.expected) << c.name;
+        provider.ClearWorksheets();
+    }
+    EXPECT_EQ(read("<Workbook><Worksheet>"), " !13") << "cut";
+    EXPECT_THROW(dp::ExcelXmlReader(file("nowhere.xml"), "", 0, &provider, nullptr),
+                 CmXmlException);
+}
+
+TEST_F(Spreadsheet2003, PreviewsDeliverPlainValuesOutside) {
+    const std::string styles = "<Style ss:ID='f'><NumberFormat ss:Format='0.00'/></Style>";
+    const std::string time = "<Cell ss:StyleID='f'><Data ss:Type='DateTime'>no date</Data></Cell>";
+    const std::string rows = "<Row ss:Index='100'>" + number("1", "ss:StyleID='f'") +
+                             number("2", "ss:StyleID='f' ss:Index='101'") + "</Row><Row>" +
+                             number("3", "ss:StyleID='f'") + time + "</Row>";
+    const std::string content = document(
+        "<Worksheet>" + table(rows, "ss:ExpandedColumnCount='200' ss:ExpandedRowCount='200'") +
+            "</Worksheet>",
+        styles);
+    provider.SetPreviewing(true);
+    EXPECT_EQ(read(content), "+ @0 99,0=1#0 99,100=2 100,0=3 100,1=d1.23456e+30 @0");
+    provider.ClearWorksheets();
+    EXPECT_THROW(read(content), boost::bad_lexical_cast) << "converted when not previewing";
+    provider.ClearWorksheets();
+    EXPECT_EQ(readRows("<Row>" + number("1") + "</Row>"), "0,0=1") << "and usable afterwards";
+}
+
+// --- the style table of the reader base ---
+
+class StyleTable : public dp::ExcelXmlReader {
+  public:
+    StyleTable(const std::string& path, dp::IDateTimeVariableFormat* helper)
+        : ExcelXmlReader(path, "yy/m/d", -99.0, nullptr, helper) {}
+
+    using ExcelXmlReader::columnStyles;
+    using ExcelXmlReader::currentStyle;
+    using ExcelXmlReader::currentStyleId;
+    using ExcelXmlReader::elementNames;
+    using ExcelXmlReader::rowStyles;
+    using ExcelXmlReader::styles;
+};
+
+class OtherMasks : public StyleTable {
+  public:
+    using StyleTable::StyleTable;
+    const std::string& GetTimeMask() override { return mask_; }
+    const std::string& GetAMPMMask() override { return ampm_; }
+
+  private:
+    std::string mask_ = "h.mm";
+    std::string ampm_ = "a/p";
+};
+
+TEST_F(Spreadsheet2003, TheStyleTableClassifiesAndHandsOutFormats) {
+    const std::string path = write("book.xml", "<Workbook/>");
+    StyleTable reader(path, &helper);
+    const struct {
+        const char* code;
+        int type;
+        const char* cleaned;
+        const char* pattern;  // null: not a date-time format
+    } cases[] = {{"Short Date", 7, "yy/m/d", ""},
+                 {"Long Time", 8, "h:mm:ss AM/PM", "h:mm:ss a"},
+                 {"Percent", 4, "0.00%", nullptr},
+                 {"[$-409]mmm\\-yy;@", 7, "mmm-yy", "MMM-yy"},
+                 {"#,##0 \"days\"", 0, "#,##0 \"days\"", nullptr},
+                 {"yyyy", 7, "yyyy", ""},
+                 {"short date", 9, "short date", ""},
+                 {"0.00%", 0, "0.00%", nullptr}};
+    for (const auto& c : cases) {
+        dp::xStyle style{"s", c.code, 99};
+        reader.mSetFmtType(style);
+        reader.styles.push_back(style);
+    }
+    reader.mReplaceDescWithFormat();
+    for (std::size_t i = 0; i < std::size(cases); ++i) {
+        SCOPED_TRACE(cases[i].code);
+        EXPECT_EQ(reader.styles[i].formatCode, cases[i].cleaned);
+        EXPECT_EQ(reader.GetExcelFormatType(static_cast<int>(i)), cases[i].type);
+        const std::unique_ptr<dp::IVariableFormat> format(
+            reader.createVextralNumericFormat(static_cast<int>(i)));
+        const auto* time = dynamic_cast<dp::IDateTimeVariableFormat*>(format.get());
+        ASSERT_EQ(time != nullptr, cases[i].pattern != nullptr);
+        if (time) {
+            EXPECT_STREQ(time->GetFormatString()->database_str(), cases[i].pattern);
+        }
+    }
+    for (const int outside : {-1, static_cast<int>(std::size(cases))}) {
+        EXPECT_EQ(reader.GetExcelFormatType(outside), 0);
+        const std::unique_ptr<dp::IVariableFormat> format(
+            reader.createVextralNumericFormat(outside));
+        EXPECT_TRUE(format->GetAuto());
+    }
+    EXPECT_EQ(reader.elementNames, (std::vector<std::string>{"Cell", "Data", "WorksheetOptions",
+                                                             "Row", "ss:Data", "Comment"}));
+}
+
+TEST_F(Spreadsheet2003, DefaultMasksCanBeOverridden) {
+    const std::string path = write("book.xml", "<Workbook/>");
+    StyleTable usual(path, nullptr);
+    OtherMasks other(path, nullptr);
+    const struct {
+        const char* id;
+        const char* usual;
+        const char* other;
+    } cases[] = {{"14", "m/d/yy", "m/d/yy"},
+                 {"18", "hh:mm AM/PM", "h.mm a/p"},
+                 {"19", "hh:mm:ss AM/PM", "h.mm:ss a/p"},
+                 {"20", "hh:mm", "h.mm"},
+                 {"21", "hh:mm:ss", "h.mm:ss"},
+                 {"22", "m/d/yy hh:mm", "m/d/yy h.mm"},
+                 {"15", "code", "code"}};
+    for (const auto& c : cases)
+        for (StyleTable* reader : {&usual, static_cast<StyleTable*>(&other)})
+            reader->styles.push_back({c.id, "code", 3});
+    usual.UpdateFormatsForLocale();
+    other.UpdateFormatsForLocale();
+    for (std::size_t i = 0; i < std::size(cases); ++i) {
+        EXPECT_EQ(usual.styles[i].formatCode, cases[i].usual) << cases[i].id;
+        EXPECT_EQ(other.styles[i].formatCode, cases[i].other) << cases[i].id;
+        EXPECT_EQ(usual.styles[i].formatType, 3);
+    }
+    std::string code = "kept";
+    usual.GetLocaleDefaultDateTimeFormat(code, 4 | 8);
+    EXPECT_EQ(code, "kept") << "neither date nor time";
+}
+
+TEST_F(Spreadsheet2003, DefaultStylesAreInherited) {
+    StyleTable reader(write("book.xml", "<Workbook/>"), nullptr);
+    reader.styles = {{"a", "0", 0}, {"b", "0", 0}, {"a", "0.0", 0}};
+    int index = 7;
+    EXPECT_FALSE(reader.mGetFormat(0, 0, index));
+    EXPECT_EQ(index, -1);
+    reader.columnStyles = {{2, 0, "b"}, {2, 0, "a"}, {4, 0, "unknown"}};
+    reader.rowStyles = {{0, 5, "a"}};
+    const struct {
+        const char* name;
+        unsigned column, row;
+        bool found;
+        int index;
+    } cases[] = {{"column, the first entry", 2, 5, true, 1},
+                 {"inherits", 0, 0, true, 1},
+                 {"row, the first style", 0, 5, true, 0},
+                 {"inherits again", 9, 9, true, 0},
+                 {"an unknown style is found", 4, 0, true, -1},
+                 {"and leaves nothing to inherit", 0, 0, false, -1}};
+    for (const auto& c : cases) {
+        EXPECT_EQ(reader.mGetFormat(c.column, c.row, index), c.found) << c.name;
+        EXPECT_EQ(index, c.index) << c.name;
+    }
+    dp::xStyle* style = nullptr;
+    EXPECT_TRUE(reader.mSearchStyleIndexForFormat("a", style, index));
+    EXPECT_EQ(style, &reader.styles[0]);
+    EXPECT_FALSE(reader.mSearchStyleIndexForFormat("c", style, index));
+    EXPECT_EQ(style, nullptr);
+}
+
+TEST_F(Spreadsheet2003, DateTimeTexts) {
+    StyleTable reader(write("book.xml", "<Workbook/>"), &helper);
+    const auto fields = [&](int y, int mo, int d, int h, int mi, int s, int ms) {
+        return helper.GenerateTime(y, mo, d, h, mi, s, ms);
+    };
+    EXPECT_EQ(reader.mFormatExcelDateTime("2010-01-05T10:30:59.125"),
+              fields(2010, 1, 5, 10, 30, 59, 125));
+    EXPECT_EQ(reader.mFormatExcelDateTime("1899-12-31T10:30:00.000"),
+              fields(1899, 12, 30, 10, 30, 0, 0));
+    EXPECT_EQ(reader.mFormatExcelDateTime("1900-12-31T00:00:00.000"),
+              fields(1900, 12, 31, 0, 0, 0, 0));
+    EXPECT_EQ(reader.mFormatExcelDateTime("1899-12-30T00:00:00.000"),
+              fields(1899, 12, 30, 0, 0, 0, 0));
+    EXPECT_EQ(reader.mFormatExcelDateTime("+201x-1x+5x+0x+0x+0x+00"),
+              fields(201, -1, 5, 0, 0, 0, 0));
+    for (const char* text : {"2010", "2010-01", "2010-01-05", "2010-01-05T10", "2010-01-05T10:30",
+                             "2010-01-05T10:30:59"}) {
+        try {
+            reader.mFormatExcelDateTime(text);
+            ADD_FAILURE() << text;
+        } catch (const std::out_of_range& e) {
+            EXPECT_STREQ(e.what(), "basic_string::substr") << text;
+        }
+    }
+    for (const char* text : {"", "abcd-01-05", "2010-", "2010-xx-05", "2010-01-05T10:30:59."})
+        EXPECT_THROW(reader.mFormatExcelDateTime(text), boost::bad_lexical_cast) << text;
+}
+
+}  // namespace
