@@ -1,0 +1,169 @@
+// Opens every file of tests/data as a host would and compares what comes out with what stands
+// beside it: expectations worked out from what other programs read in the files.
+#include <algorithm>
+#include <chrono>
+#include <filesystem>
+#include <fstream>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+#include "formats/date_time_variable_format.h"
+#include "model/host/entry_points.h"
+#include "model/host/i_column.h"
+#include "model/host/i_finders.h"
+#include "model/host/i_string.h"
+#include "model/host/i_worksheet.h"
+#include "provider/xlsx_data_provider.h"
+#include "readers/excel_xml_reader.h"
+#include "tests/temporary_files.h"
+
+namespace {
+
+using nlohmann::json;
+
+// References to an object that is counted, not owned by any one.
+template <class T>
+std::shared_ptr<T> held(T* object) {
+    object->AddRef();
+    return {object, [](T* released) { released->Release(); }};
+}
+
+std::string taken(dp::IString* text) { return std::unique_ptr<dp::IString>(text)->database_str(); }
+
+// The host's part in reading date-times.
+class Calendar : public dp::DateTimeVariableFormat {
+  public:
+    double GenerateTime(int year, int month, int day, int hour, int minute, int second,
+                        int millisecond) const override {
+        using namespace std::chrono;
+        const sys_days date = std::chrono::year(year) / month / day;
+        const milliseconds time =
+            hours(hour) + minutes(minute) + seconds(second) + milliseconds(millisecond);
+        return static_cast<double>((date.time_since_epoch() + days(25569)).count()) +
+               static_cast<double>(time.count()) / 86400000.0;
+    }
+};
+
+// Holds an XML Spreadsheet 2003 document and shows its columns by the document's styles.
+class DocumentProvider : public dp::xlsxDataProvider {
+  public:
+    void read(const std::string& path) {
+        reader_ = std::make_unique<dp::ExcelXmlReader>(path, "m/d/yy", GetMissingVxlValue(), this,
+                                                       &calendar_);
+        reader_->mReadExcelWorkbook();
+    }
+    dp::IVariableFormat* CreateVextralNumericFormat(
+        const dp::ExternalDataRecordCell& cell) const override {
+        return reader_->createVextralNumericFormat(cell.formatIndex);
+    }
+    bool IsDateTimeFormatType(const dp::ExternalDataRecordCell& cell) const override {
+        return reader_->IsDateTimeFormatType(reader_->GetExcelFormatType(cell.formatIndex));
+    }
+
+  private:
+    Calendar calendar_;
+    std::unique_ptr<dp::ExcelXmlReader> reader_;
+};
+
+void addNumbers(const dp::INumericColumn& column, json& shown) {
+    shown["converted"] = column.GetConvertedMissingCount();
+    for (int row = 0; row < column.GetRowCount(); ++row) {
+        const double value = column.GetValues()[row];
+        const bool missing = value == dp::ExcelDataProviderBase::_missingValue;
+        shown["values"].push_back(missing ? json() : json(value));
+        if (!missing && !shown.contains("shown"))
+            shown["shown"] = taken(column.GetFormat()->FormatValue(value, false));
+    }
+}
+
+void addTexts(const dp::ITextColumn& column, json& shown) {
+    const auto& texts = *column.GetTextValues();
+    for (unsigned long row = 0; row < texts.Count(); ++row) {
+        const std::string text = texts.Item(row).database_str();
+        shown["values"].push_back(text.empty() ? json() : json(text));
+    }
+}
+
+json contents(const dp::IColumn& column) {
+    const int kind = column.GetDataType();
+    json shown = {{"name", column.GetName()->database_str()},
+                  {"kind", kind == 4   ? "text"
+                           : kind == 2 ? "date-time"
+                                       : "numeric"},
+                  {"missing", column.GetMissingCount()},
+                  {"values", json::array()}};
+    if (const auto* numbers = dynamic_cast<const dp::INumericColumn*>(&column))
+        addNumbers(*numbers, shown);
+    else
+        addTexts(dynamic_cast<const dp::ITextColumn&>(column), shown);
+    return shown;
+}
+
+json contents(dp::IDataProvider& provider) {
+    json sheets = json::array();
+    const auto& worksheets = *provider.GetWorksheetFinder()->GetWorksheetPrimeKeys();
+    for (unsigned long i = 0; i < worksheets.Count(); ++i) {
+        dp::IWorksheet* found = nullptr;
+        EXPECT_TRUE(provider.GetWorksheetFinder()->FindWorksheet(worksheets.Item(i), &found));
+        json columns = json::array();
+        const auto& keys = *provider.GetVariableFinder()->GetColumnPrimeKeys(worksheets.Item(i));
+        for (unsigned long j = 0; j < keys.Count(); ++j) {
+            dp::IColumn* column = nullptr;
+            EXPECT_TRUE(provider.GetVariableFinder()->FindColumn(keys.Item(j), &column, false));
+            columns.push_back(contents(*held(column)));
+        }
+        sheets.push_back({{"name", held(found)->GetTitle()}, {"columns", columns}});
+    }
+    return {{"sheets", sheets}};
+}
+
+json imported(const std::string& path) {
+    if (path.ends_with(".xml")) {
+        const auto provider = held(new DocumentProvider);
+        try {
+            provider->read(path);
+        } catch (const CmXmlException& error) {
+            return {{"error", error.code()}};
+        }
+        return contents(*provider);
+    }
+    dp::IDataProvider* made = nullptr;
+    EXPECT_EQ(dp::CreateDataProvider("xlsx", &made), 0);
+    const auto provider = held(made);
+    EXPECT_EQ(provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read), 0);
+    const json all = contents(*provider);
+    EXPECT_EQ(provider->CloseFile(), 0);
+    return all;
+}
+
+class DataTest : public TemporaryFiles, public testing::WithParamInterface<std::string> {};
+
+TEST_P(DataTest, GivesWhatOtherReadersFindInIt) {
+    const std::filesystem::path path = std::filesystem::path(DPXLSX_TEST_DATA) / GetParam();
+    std::ifstream stored(std::filesystem::path(path).replace_extension(".expected.json"));
+    const json expected = json::parse(stored);
+    // A text may be cut inside a character; what is left of that one compares as U+FFFD.
+    const std::string text =
+        imported(path.string()).dump(-1, ' ', false, json::error_handler_t::replace);
+    EXPECT_EQ(json::diff(expected, json::parse(text)), json::array()) << expected.dump(1);
+}
+
+std::vector<std::string> dataFiles() {
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(DPXLSX_TEST_DATA))
+        if (entry.path().extension() != ".json") names.push_back(entry.path().filename().string());
+    std::sort(names.begin(), names.end());
+    return names;
+}
+
+INSTANTIATE_TEST_SUITE_P(, DataTest, testing::ValuesIn(dataFiles()), [](const auto& file) {
+    std::string name = file.param;
+    std::replace(name.begin(), name.end(), '.', '_');
+    return name;
+});
+
+}  // namespace
