@@ -7,6 +7,8 @@ target_compile_options(dpxlsx_options INTERFACE
     $<$<BOOL:${DPXLSX_WERROR}>:-Werror>)
 if(DPXLSX_SANITIZE)
     target_compile_options(dpxlsx_options INTERFACE
-        -fsanitize=${DPXLSX_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+        -fsanitize=${DPXLSX_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer
+        # Instrumented code of the standard library looks uninitialised to g++ 12.
+        -Wno-maybe-uninitialized)
     target_link_options(dpxlsx_options INTERFACE -fsanitize=${DPXLSX_SANITIZE})
 endif()

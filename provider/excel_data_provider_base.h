@@ -181,7 +181,8 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     // The cell as text, cut to GetMaximumTextLength() bytes when `truncate`.
     virtual std::string ConvertCellToString(const ExternalDataRecordCell& cell,
                                             bool truncate) const;
-    // A number or date-time cell as its style shows it.
+    // A number or date-time cell as its style shows it. Loading converts by the same rules without
+    // these two calls.
     virtual std::string ConvertNumericCellToString(const ExternalDataRecordCell& cell) const;
     // A new format for the cell's style, never null, owned by the caller.
     virtual IVariableFormat* CreateVextralNumericFormat(
@@ -190,8 +191,9 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     virtual bool IsDateTimeFormatType(const ExternalDataRecordCell& cell) const = 0;
 
     // --- Cell conversion ---
-    // The cell as number; the missing value with `converted` set when it has none. `dateTimeFormat`
-    // is the pattern by which texts are read as date-times, null when not known.
+    // The cell as number; the missing value when it has none that the settings allow. `converted`
+    // tells of content that did not convert. `dateTimeFormat` is the pattern by which texts are
+    // read as date-times, null when not known.
     double ConvertCellToReal(const ExternalDataRecordCell& cell, bool asDateTime,
                              const IString* dateTimeFormat, bool& converted) const;
 

@@ -63,7 +63,9 @@ char ExcelDataProviderBase::GetOutputGroupingSymbol() { return _outputGroupingSy
 char inputDecimal() noexcept { return ExcelDataProviderBase::_inputDecimal; }
 
 bool IsNumber(const std::string& text, char decimal, double* value) {
-    return recogniseNumber(text, decimal, ExcelDataProviderBase::_missingValue, value);
+    double unasked = 0.0;
+    return recogniseNumber(text, decimal, ExcelDataProviderBase::_missingValue,
+                           value ? value : &unasked);
 }
 
 }  // namespace dp

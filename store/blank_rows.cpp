@@ -37,7 +37,8 @@ class OccupiedRows {
         for (const auto& [number, page] : pages_) {
             for (std::uint32_t word = 0; word < page.size(); ++word) {
                 for (std::uint64_t marks = page[word]; marks != 0; marks &= marks - 1) {
-                    const std::uint64_t row = std::uint64_t{number} * kRowsPerPage + std::uint64_t{word} * 64 +
+                    const std::uint64_t row = std::uint64_t{number} * kRowsPerPage +
+                                              std::uint64_t{word} * 64 +
                                               static_cast<unsigned>(std::countr_zero(marks));
                     if (row > last) break;
                     appendBetween(blank, next, row);

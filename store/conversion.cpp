@@ -117,14 +117,8 @@ const IVariableFormat& FormatCache::formatOf(const CellContent& cell) {
 double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
                     const ConversionSettings& settings, bool& converted) {
     converted = false;
-    double value = rawNumber(cell, asDateTime, dateTimeFormat, settings, converted);
-    value = mapMissing(value, cell, settings);
-    // Written so that a value that is not a number fails the test too.
-    if (!(value >= settings.minNumericValue && value <= settings.maxNumericValue)) {
-        value = settings.missingValue;
-        converted = true;
-    }
-    return value;
+    const double value = rawNumber(cell, asDateTime, dateTimeFormat, settings, converted);
+    return inRange(mapMissing(value, cell, settings), settings, converted);
 }
 
 std::string numericCellToText(const CellContent& cell, const ConversionSettings& settings,

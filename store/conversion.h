@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cmath>
 #include <cstdint>
 #include <map>
 #include <memory>
@@ -77,9 +78,19 @@ class FormatCache {
     const IVariableFormat* recent_ = nullptr;
 };
 
-// The cell as number. `converted` is set when it had content that is no number, or one out of
-// range; the result is then the missing value. `dateTimeFormat` is the pattern by which texts are
-// read as date-times, null when none is known.
+// A number that the host's range allows; else the missing value, and `converted` is set.
+inline double inRange(double value, const ConversionSettings& settings, bool& converted) {
+    const bool outside =
+        std::isnan(value) || value < settings.minNumericValue || value > settings.maxNumericValue;
+    if (!outside) return value;
+    converted = true;
+    return settings.missingValue;
+}
+
+// The cell as number; the missing value when it has none that the settings allow. `converted` is
+// then set for content that is no number or out of range, also where the missing-code mapping put
+// another number in, and for an empty cell when the missing value itself lies outside the range.
+// `dateTimeFormat` is the pattern by which texts are read as date-times, null when none is known.
 double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
                     const ConversionSettings& settings, bool& converted);
 

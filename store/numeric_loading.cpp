@@ -61,7 +61,9 @@ class NumericLoad {
           requested_(requested),
           asDateTime_(requested == BasicDataType::DateTime ||
                       firstCellType == FormatType::DateTime),
-          replacesMissing_(replacesMissingNumbers(settings.conversion)) {}
+          replacesMissing_(replacesMissingNumbers(settings.conversion)),
+          plainNumbers_(!(asDateTime_ && settings.conversion.dateTimeHelper) &&
+                        !settings.conversion.alphaMissingNumericSet) {}
 
     // Whether any cell was handled.
     bool run(const CellColumn& cells) {
@@ -72,11 +74,12 @@ class NumericLoad {
         const auto end = cells.end();
         for (auto cell = cells.lower_bound(firstRow); cell != end && slot < settings_.rowCount;
              ++cell) {
-            slot += passGap(expectedRow, cell->first);
+            const auto [row, content] = *cell;
+            if (row != expectedRow) slot += passGap(expectedRow, row);
             if (slot >= settings_.rowCount) break;
-            expectedRow = cell->first + 1;
+            expectedRow = row + 1;
             handled = true;
-            store(CellContent(cell->second), slot);
+            store(content, slot);
             ++slot;
         }
         return handled;
@@ -92,20 +95,44 @@ class NumericLoad {
         return gap.slots;
     }
 
-    void store(const CellContent& cell, std::uint32_t slot) {
-        double value = kPreviewFiller;
-        if (!settings_.previewing || slot <= kLastPreviewSlot) {
-            bool converted = false;
-            value = cellToNumber(cell, asDateTime_, pattern_, settings_.conversion, converted);
-            if (converted) ++column_.convertedMissingCount;
-        }
+    // Views of cells go by value here: in memory they cost more than the rest of the loop.
+    void store(CellView cell, std::uint32_t slot) {
+        const double value = valueOf(cell, slot);
         column_.values[slot] = value;
         if (value == settings_.conversion.missingValue) return;
         --column_.missingCount;
-        if (!column_.format) {
-            column_.format = inferFormat(cell, requested_, settings_.formats);
-            pattern_ = patternOf(*column_.format);
-        }
+        if (!column_.format) takeFormat(cell);
+    }
+
+    double valueOf(CellView cell, std::uint32_t slot) {
+        if (settings_.previewing && slot > kLastPreviewSlot) return kPreviewFiller;
+        bool converted = false;
+        const double value = plainNumbers_ && isNumber(cell.type())
+                                 ? plainNumber(cell.numValue(), converted)
+                                 : convert(cell, converted);
+        if (converted) ++column_.convertedMissingCount;
+        return value;
+    }
+
+    bool isNumber(ExternalCellType type) const {
+        return type == CELL_NUMBER ||
+               (type == CELL_DATETIME && !settings_.conversion.convertDateTimeToText);
+    }
+
+    double plainNumber(double value, bool& converted) const {
+        const ConversionSettings& conversion = settings_.conversion;
+        if (value == conversion.missingNumericFrom) value = conversion.missingNumericTo;
+        return inRange(value, conversion, converted);
+    }
+
+    double convert(CellView cell, bool& converted) const {
+        return cellToNumber(CellContent(cell), asDateTime_, pattern_, settings_.conversion,
+                            converted);
+    }
+
+    void takeFormat(CellView cell) {
+        column_.format = inferFormat(CellContent(cell), requested_, settings_.formats);
+        pattern_ = patternOf(*column_.format);
     }
 
     NumericColumn& column_;
@@ -113,6 +140,7 @@ class NumericLoad {
     const BasicDataType requested_;
     const bool asDateTime_;
     const bool replacesMissing_;
+    const bool plainNumbers_;  // numbers and date-times need neither the helper nor the cell's text
     const IString* pattern_ = nullptr;
 };
 
@@ -135,9 +163,12 @@ std::unique_ptr<NumericColumn> loadNumericColumn(const CellColumn& cells,
     column->dataType =
         requested == BasicDataType::DateTime ? NumericColumn::kDateTimes : NumericColumn::kNumbers;
     column->formatDirty = true;
-    column->rowCount = column->missingCount = static_cast<std::int32_t>(settings.rowCount);
-    column->values.reset(new double[settings.rowCount]);
-    std::fill_n(column->values.get(), settings.rowCount, settings.conversion.missingValue);
+    // Without a name and a data cell the column ends up without rows, however many the layout has.
+    const bool hasData = cells.lower_bound(settings.layout.firstDataRow) != cells.end();
+    const std::uint32_t rowCount = hasData || !identity.name.empty() ? settings.rowCount : 0;
+    column->rowCount = column->missingCount = static_cast<std::int32_t>(rowCount);
+    column->values.reset(new double[rowCount]);
+    std::fill_n(column->values.get(), rowCount, settings.conversion.missingValue);
 
     NumericLoad load(*column, settings, requested, firstCellType);
     const bool handled = load.run(cells);

@@ -38,7 +38,7 @@ class TextLoad {
 
     std::uint32_t passGap(std::uint32_t expectedRow, std::uint32_t row) {
         const Gap gap = gapBefore(settings_.layout, expectedRow, row);
-        if (settings_.missingTextFrom.empty() && !settings_.missingTextTo.empty())
+        if (settings_.missingTextFrom.empty())
             fillGap(gap, settings_.rowCount,
                     [&](std::size_t slot) { textAt(slot) = settings_.missingTextTo; });
         return gap.slots;
@@ -46,7 +46,9 @@ class TextLoad {
 
     void store(const CellView& cell, std::uint32_t slot) {
         std::string& text = textAt(slot);
-        if (!settings_.previewing || slot <= kLastPreviewSlot)
+        if (settings_.previewing && slot > kLastPreviewSlot)
+            text.clear();
+        else
             cellToText(CellContent(cell), settings_.conversion, formats_, text);
         if (isAllSpaces(text)) text.clear();
         if (text == settings_.missingTextFrom) text = settings_.missingTextTo;
@@ -74,8 +76,11 @@ std::unique_ptr<TextColumn> loadTextColumn(const CellColumn& cells, const Column
     column->formatDirty = true;
     auto format = std::make_unique<TextVariableFormat>();
     format->characterCount = 1;
-    column->rowCount = column->missingCount = static_cast<std::int32_t>(settings.rowCount);
-    column->textValues.items.resize(settings.rowCount);
+    // Without a data cell the column ends up without rows, however many the layout has.
+    const bool hasData = cells.lower_bound(settings.layout.firstDataRow) != cells.end();
+    const std::uint32_t rowCount = hasData ? settings.rowCount : 0;
+    column->rowCount = column->missingCount = static_cast<std::int32_t>(rowCount);
+    column->textValues.items.resize(rowCount);
 
     TextLoad load(*column, *format, settings);
     if (!load.run(cells)) {

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <map>
 #include <memory>
+#include <optional>
 #include <vector>
 
 #include "model/host/export.h"
@@ -60,6 +61,10 @@ class DPXLSX_API WorksheetCells {
     unsigned rowCount() const;
     // Puts cells that came out of order in their places.
     void settle() const;
+
+    // Columns of all worksheets before this one: a note of whoever numbers columns over several
+    // worksheets. It is about the place, so it does not move along with the cells.
+    mutable std::optional<std::size_t> columnsBefore;
 
   private:
     CellColumn* known(unsigned column);

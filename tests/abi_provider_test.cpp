@@ -11,57 +11,10 @@ namespace {
 using namespace raw;
 using Settings = dp::ExcelDataProviderBase;  // for the exported settings of the process alone
 
-const std::string kProvider =
-    /* 0-3 */
-    "~ ~ AddRef Release "
-    /* 4-7 */
-    "GetWorksheets OpenFile CloseFile AddWorksheetObject "
-    /* 8-27 */
-    "AddDesign AddTaguchiDesign AddTaguchiAnalysis AddTaguchiPrediction AddAnalysis "
-    "AddResponseModels AddVariabilityDataCollection AddMultipleResponseOptimization "
-    "AddMixtureResponseModelCollection AddNumericColumn AddTextColumn AddNumericConstant "
-    "AddTextConstant AddMatrix AddModel AddFactorialPlot AddMixturePlot AddCustomDesign "
-    "AddFormulaNode AddDDELink "
-    /* 28-30 */
-    "GetWorksheetFinder GetVariableFinder GetDOEReader "
-    /* 31-43 */
-    "SetMissingValue SetMissingValueTextRepresentation SetNumericRange SetMaximumTextLength "
-    "SetInputDecimal SetOutputDecimal SetOutputGroupingSymbol SetBooleanTrueValue "
-    "SetBooleanFalseValue SetWriteOptionVariableNames SetMissingText SetMissingNumeric "
-    "SetAlphaMissingNumeric "
-    /* 44-46 */
-    "SetFieldDelimiter SetTextDelimiter SetDecimalSeparator "
-    /* 47-52 */
-    "SetReadOptionIgnoreBlankRows SetReadOptionPadColumnsWithMissingValues "
-    "SetReadOptionCleanTextValues SetReadOptionFoldTextValues SetReadOptionCleanWorksheetNames "
-    "SetReadOptionConvertDateTimeToText "
-    /* 53-56 */
-    "SetReadOptionDataRowPositions SetReadOptionDefaultUseVariableNameRow "
-    "SetReadOptionDataRowCount SetReadOptionExclude "
-    /* 57-61 */
-    "SetReadColumnOptionExclude SetReadColumnOptionColumnType SetReadColumnOptionName "
-    "SetReadColumnOptionDestinationId ClearReadColumnOptions "
-    /* 62-67 */
-    "ClearWorksheets SetMaxVariableNameLength SetDateTimeVariableFormatHelper "
-    "SetInferFormatPolicy RereadFile SetPreviewing "
-    /* 68-71 */
-    "GetTempDirectoryPath GetWorksheetRowCount SetUnitTesting SetTestNoTempFile "
-    /* 72-79 */
-    "SetError GetError AddExternalDataRecord RemoveWorksheet SetWorksheetIndex AddWorksheet "
-    "GetColumnCount GetColumn "
-    /* 80-89 */
-    "GetMissingTextFrom GetMissingTextTo GetMissingVxlValue GetAlphaMissingNumericFrom "
-    "GetMissingNumericTo GetMissingNumericFrom GetWriteOptionVariableNames IsPreviewing "
-    "GetPreviewNumberOfRows GetPreviewNumberOfColumns "
-    /* 90-91 */
-    "GetWorksheetPrimeKeys FindWorksheet "
-    /* 92-102 */
-    "GetColumnPrimeKeys GetConstantPrimeKeys GetMatrixPrimeKeys GetModelPrimeKeys FindColumn "
-    "FindColumnOfStorage FindConstant FindMatrix FindModel FindRegisteredSharedVariableBody "
-    "RegisterSharedVariableBody "
-    /* 103-108 */
-    "GetDateTimeVariableFormatHelper FindColumnOfType ConvertCellToString "
-    "ConvertNumericCellToString CreateVextralNumericFormat IsDateTimeFormatType";
+const Contract& kProvider() {
+    static const Contract contract = contractOf("Provider");
+    return contract;
+}
 
 // A cell record as its users lay it out in memory.
 struct RawCell {
@@ -93,7 +46,7 @@ class ProviderContract : public testing::Test {
 
     template <class Result, class... Arguments>
     Result op(std::string_view name, Arguments... arguments) {
-        return call<Result>(provider, slotOf(kProvider, name), arguments...);
+        return call<Result>(provider, slotOf(kProvider(), name), arguments...);
     }
 
     void file(unsigned row, unsigned column, RawCell cell) {
@@ -205,7 +158,7 @@ TEST_F(ProviderContract, FilesAreOpenedAndClosed) {
     alignas(std::string) char place[sizeof(std::string)];
     using PathOf = void (*)(void*, const void*);
     void* const* table = *static_cast<void* const* const*>(provider);
-    reinterpret_cast<PathOf>(table[slotOf(kProvider, "GetTempDirectoryPath")])(place, provider);
+    reinterpret_cast<PathOf>(table[slotOf(kProvider(), "GetTempDirectoryPath")])(place, provider);
     auto* path = std::launder(reinterpret_cast<std::string*>(place));
     EXPECT_EQ(*path, "");
     std::destroy_at(path);
@@ -331,8 +284,8 @@ TEST_F(ProviderContract, ColumnAndTextOptionsTakeEffect) {
         alignas(std::string) char place[sizeof(std::string)];
         using Convert = void (*)(void*, const void*, const RawCell*, bool);
         void* const* table = *static_cast<void* const* const*>(provider);
-        reinterpret_cast<Convert>(table[slotOf(kProvider, operation)])(place, provider, &cell,
-                                                                       false);
+        reinterpret_cast<Convert>(table[slotOf(kProvider(), operation)])(place, provider, &cell,
+                                                                         false);
         auto* result = std::launder(reinterpret_cast<std::string*>(place));
         std::string copy = *result;
         std::destroy_at(result);

@@ -1,4 +1,5 @@
 #include "readers/xml_reader.h"
+#include "tests/case_table.h"
 #include "tests/package_builder.h"
 #include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
@@ -44,64 +45,7 @@ class Packages : public TemporaryFiles {
 };
 
 TEST_F(Packages, CellsByPlaceAndKind) {
-    const struct {
-        const char* name;
-        const char* rows;
-        const char* expected;
-    } cases[] = {
-        {"place by references", "<row r='3'><c r='B3'><v>1.5</v></c></row>", "2,1=1.5"},
-        {"place by order",
-         "<row><c><v>1</v></c><c/><c><v>3</v></c></row><row><c><v>4</v></c></row>",
-         "0,0=1 0,2=3 1,0=4"},
-        {"a reference sets the counters",
-         "<row r='5'><c r='D5'><v>1</v></c><c><v>2</v></c></row><row><c><v>3</v></c></row>",
-         "4,3=1 4,4=2 5,0=3"},
-        {"a row whose number is none", "<row r='2'/><row r='x'><c><v>1</v></c></row>", "2,0=1"},
-        {"the last cell there is", "<row r='1048576'><c r='XFD1'><v>1</v></c></row>",
-         "1048575,16383=1"},
-        {"row 0", "<row r='0'/>", "!13"},
-        {"row beyond", "<row r='1048577'/>", "!13"},
-        {"row far beyond", "<row r='4294967297'/>", "!13"},
-        {"column beyond", "<row r='1'><c r='XFE1'/></row>", "!13"},
-        {"column far beyond", "<row r='1'><c r='AAAAAAAAAAAAAAAAAAAAA1'/></row>", "!13"},
-        {"reference too short", "<row r='1'><c r='A'/></row>", "!13"},
-        {"reference without digits", "<row r='1'><c r='AB'/></row>", "!13"},
-        {"reference of digits", "<row r='1'><c r='12'/></row>", "!13"},
-        {"shared string", "<row><c t='s'><v>0</v></c></row>", "0,0='zero'"},
-        {"runs, indentation is no text", "<row><c t='s'><v>3</v></c></row>", "0,0='Ab cd'"},
-        {"escape decoded", "<row><c t='s'><v>4</v></c></row>", "0,0='x_y'"},
-        {"phonetic text belongs to the entry", "<row><c t='s'><v>5</v></c></row>", "0,0='jpph'"},
-        {"empty and blank entries, no shift",
-         "<row><c t='s'><v>1</v></c><c t='s'><v>2</v></c><c t='s'><v>+3</v></c></row>",
-         "0,2='Ab cd'"},
-        {"index out of range",
-         "<row><c t='s'><v>6</v></c><c t='s'><v>-1</v></c><c t='s'><v>99999999999</v></c></row>",
-         ""},
-        {"index that is no integer", "<row><c t='s'><v>1.0</v></c></row>", "!13"},
-        {"formula text", "<row><c t='str'><f>A1</f><v>a_x000A_b</v></c></row>", "0,0='a\nb'"},
-        {"error", "<row><c t='e'><v>#N/A</v></c></row>", ""},
-        {"Boolean and ISO date", "<row><c t='b'><v>1</v></c><c t='d'><v>2010-01-05</v></c></row>",
-         "0,0=1 0,1=2010"},
-        {"number with text behind", "<row><c><v>12 kg</v></c><c><v>kg</v></c></row>",
-         "0,0=12 0,1=0"},
-        {"inline, the last run wins",
-         "<row><c t='inlineStr'><is><r><t>a</t></r><r><t>b</t></r></is></c></row>",
-         "0,0='a' 0,0='b'"},
-        {"a t that is not inline", "<row><c><is><t>a</t></is></c></row>", ""},
-        {"empty values swallow nothing",
-         "<row><c t='s' s='1'><v/></c><c><v></v></c><c t='inlineStr'><is><t/></is></c>"
-         "<c t='inlineStr'><is><t></t></is></c><c><v>5</v></c></row>",
-         "0,4=5"},
-        {"a value that holds an element", "<row><c><v><c r='C1'><v>7</v></c></v></c></row>",
-         "0,2=7"},
-        {"a comment is no value", "<row><c><v><!--8-->9</v></c></row>", "0,0=9"},
-        {"blank text, tab is content",
-         "<row><c t='str'><v>  </v></c><c t='str'><v>\t</v></c></row>", "0,1='\t'"},
-        {"type and style end with their cell", "<row><c t='s'/><c><v>0</v></c></row>", "0,1=0"},
-        {"attributes with references", "<row><c r='&#66;1' t='&#115;'><v>0</v></c></row>",
-         "0,1='zero'"},
-    };
-    for (const auto& c : cases) EXPECT_EQ(readRows(c.rows), c.expected) << c.name;
+    for (const auto& c : caseTable("worksheet_cells.txt")) EXPECT_EQ(readRows(c[1]), c[2]) << c[0];
 }
 
 TEST_F(Packages, StylesDecideNumbersAndDates) {
@@ -210,29 +154,12 @@ TEST_F(Packages, WorksheetsOfTheWorkbook) {
 }
 
 TEST_F(Packages, SharedStringTables) {
-    const std::string row = "<row><c t='s'><v>0</v></c><c t='s'><v>1</v></c></row>";
-    const struct {
-        const char* name;
-        const char* strings;
-        const char* expected;
-    } cases[] = {
-        {"none", "", ""},
-        {"no count, no texts", "<sst><si><t>a</t></si></sst>", ""},
-        {"another root", "<x uniqueCount='1'><si><t>a</t></si></x>", ""},
-        {"negative count", "<sst uniqueCount='-1'><si><t>a</t></si></sst>", "0,0='a'"},
-        {"hostile count", "<sst uniqueCount='2147483647'><si><t>a</t></si></sst>", "0,0='a'"},
-        {"count too small", "<sst uniqueCount='1'><si><t>a</t></si><si><t>b</t></si></sst>",
-         "0,0='a' 0,1='b'"},
-        {"blanks inside a text", "<sst uniqueCount='1'><si><t> </t><t>a </t></si></sst>",
-         "0,0=' a '"},
-        {"CDATA is not collected", "<sst uniqueCount='1'><si><t>a<![CDATA[b]]></t></si></sst>",
-         "0,0='a'"},
-        {"cut", "<sst uniqueCount='2'><si><t>a</t></si>", "!13"},
-    };
-    for (const auto& c : cases)
-        EXPECT_EQ(readCells(PackageBuilder::of({row}).set("xl/sharedStrings.xml", c.strings)),
-                  c.expected)
-            << c.name;
+    const auto package =
+        PackageBuilder::of({"<row><c t='s'><v>0</v></c><c t='s'><v>1</v></c></row>"});
+    EXPECT_EQ(readCells(package), "") << "no such part";
+    for (const auto& c : caseTable("shared_strings.txt"))
+        EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", c[1])), c[2])
+            << c[0];
 }
 
 TEST(Escapes, AreDecoded) {

@@ -1,7 +1,10 @@
+#include <regex>
+
 #include <boost/lexical_cast.hpp>
 
 #include "formats/date_time_variable_format.h"
 #include "readers/excel_xml_reader.h"
+#include "tests/case_table.h"
 #include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
 
@@ -63,93 +66,18 @@ class Spreadsheet2003 : public TemporaryFiles {
     FieldsHelper helper;
 };
 
-TEST_F(Spreadsheet2003, CellsByPlaceAndKind) {
-    const auto n = [](const std::string& value, const std::string& attributes = "") {
-        return number(value, attributes);
-    };
-    const auto data = [](const std::string& type, const std::string& value) {
-        return "<Cell><Data ss:Type='" + type + "'>" + value + "</Data></Cell>";
-    };
-    const struct {
-        const char* name;
-        std::string rows;
-        const char* expected;
-    } cases[] = {
-        {"in order", "<Row>" + n("1") + n("2") + "</Row><Row>" + n("3") + "</Row>",
-         "0,0=1 0,1=2 1,0=3"},
-        {"row index forward and back",
-         "<Row>" + n("1") + "</Row><Row ss:Index='5'>" + n("2") + "</Row><Row ss:Index='2'>" +
-             n("3") + "</Row>",
-         "0,0=1 4,0=2 5,0=3"},
-        {"cell index forward and back",
-         "<Row>" + n("1", "ss:Index='3'") + n("2") + n("3", "ss:Index='1'") + "</Row>",
-         "0,2=1 0,3=2 0,4=3"},
-        {"merged", "<Row>" + n("1", "ss:MergeAcross='2'") + n("2") + "</Row>", "0,0=1 0,3=2"},
-        {"cells without data move on", "<Row><Cell/><Cell></Cell>" + n("1") + "</Row>", "0,2=1"},
-        {"a row ends early", "<Row/><Row><Cell/></Row><Row>" + n("1") + "</Row>", "2,0=1"},
-        {"cells behind the counted columns",
-         "<Row>" + n("1", "ss:Index='9'") + n("2") + "</Row><Row>" + n("3") + "</Row>",
-         "0,8=1 1,0=3"},
-        {"index 0 counts as none", "<Row ss:Index='0'>" + n("1", "ss:Index='0'") + "</Row>",
-         "0,0=1"},
-        {"attributes with references",
-         "<Row>" + n("1", "ss:Index='&#51;'") + data("&#83;tring", "a") + "</Row>",
-         "0,2=1 0,3='a'"},
-        {"merged by a negative number", "<Row>" + n("1", "ss:MergeAcross='-1'") + n("2") + "</Row>",
-         "0,0=1 0,1=2"},
-        {"Boolean", "<Row>" + data("Boolean", "1") + "</Row>", "0,0=1"},
-        {"error and unknown", "<Row>" + data("Error", "#N/A") + data("number", "1") + "</Row>", ""},
-        {"text of runs",
-         "<Row>" + data("String", "a<B>b</B> <I>c</I>") + data("String", "   ") + n("1") + "</Row>",
-         "0,0='ab c' 0,2=1"},
-        {"prefixed data",
-         "<Row><Cell><ss:Data ss:Type='String'>a<B>b</B></ss:Data></Cell>" + n("1") + "</Row>",
-         "0,0='ab' 0,1=1"},
-        {"no escapes are decoded", "<Row>" + data("String", "_x000D_") + "</Row>", "0,0='_x000D_'"},
-        {"comment",
-         "<Row><Cell><Data ss:Type='Number'>1</Data><Comment><ss:Data ss:Type='String'>c</ss:Data>"
-         "</Comment></Cell>" +
-             n("2") + "</Row>",
-         "0,0=1 0,1=2"},
-        {"empty data swallows nothing",
-         "<Row><Cell><Data ss:Type='String'/></Cell><Cell><Data ss:Type='Number'/></Cell>"
-         "<Cell><Data ss:Type='String'></Data></Cell>" +
-             data("DateTime", "") + n("1") + "<Cell><Data/></Cell></Row>",
-         "0,4=1"},
-        {"date-time", "<Row>" + data("DateTime", "2010-01-05T10:30:59.125") + "</Row>",
-         "0,0=d2.01001e+07"},
-    };
-    for (const auto& c : cases) EXPECT_EQ(readRows(c.rows), c.expected) << c.name;
-}
-
-TEST_F(Spreadsheet2003, StylesOfCellsRowsAndColumns) {
+TEST_F(Spreadsheet2003, CellsByPlaceKindAndStyle) {
     const std::string styles =
         "<Style ss:ID='none'/><Style/><Style ss:ID='date'><NumberFormat ss:Format='Short Date'/>"
         "</Style><Style ss:ID='time'><NumberFormat ss:Format='h:mm'/></Style>"
         "<Style ss:ID='fix'><NumberFormat ss:Format='Fixed'/></Style>"
         "<Style ss:ID='bare'><NumberFormat/></Style>"
         "<Style ss:ID='both'><NumberFormat ss:Format='d/m/yy h:mm'/></Style>";
-    const auto n = [](const std::string& id) {
-        return number("1", id.empty() ? "" : "ss:StyleID='" + id + "'");
-    };
-    const struct {
-        const char* name;
-        std::string rows;
-        const char* expected;
-    } cases[] = {
-        {"date, time, both, number",
-         "<Row>" + n("date") + n("time") + n("both") + n("fix") + n("none") + n("bare") + n("x") +
-             "</Row>",
-         "0,0=d1#0 0,1=1#1 0,2=d1#3 0,3=1#2 0,4=1 0,5=1 0,6=1"},
-        {"column before row before cell",
-         "<Column ss:StyleID='fix'/><Column ss:Index='3' ss:StyleID='date'/><Row ss:StyleID='time'>"
-         "" + n("both") +
-             n("both") + n("both") + "</Row><Row>" + n("") + n("both") + n("") + n("") + "</Row>",
-         "0,0=1#2 0,1=1#1 0,2=d1#0 1,0=1#2 1,1=d1#3 1,2=d1#0 1,3=1"},
-        {"texts carry a style too",
-         "<Row><Cell ss:StyleID='date'><Data ss:Type='String'>a</Data></Cell></Row>", "0,0='a'#0"},
-    };
-    for (const auto& c : cases) EXPECT_EQ(readRows(c.rows, styles), c.expected) << c.name;
+    for (const auto& c : caseTable("spreadsheet_2003_cells.txt")) {
+        const std::string rows =
+            std::regex_replace(c[1], std::regex("@([^ @]+) ?([^@]*)@"), number("$1", "$2"));
+        EXPECT_EQ(readRows(rows, styles), c[2]) << c[0];
+    }
 }
 
 TEST_F(Spreadsheet2003, WorksheetsAndFailures) {

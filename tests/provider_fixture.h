@@ -1,0 +1,204 @@
+#pragma once
+
+#include <memory>
+#include <sstream>
+#include <string>
+#include <tuple>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "formats/date_time_variable_format.h"
+#include "formats/numeric_variable_format.h"
+#include "formats/percentage_variable_format.h"
+#include "model/host/i_string.h"
+#include "provider/excel_data_provider_base.h"
+
+namespace dp {
+
+// The styles of hand-filled cells. Two are at odds with themselves: shown as date-time but not
+// counted as one, and the other way round.
+enum HandStyle { kNumberAsDate = -2, kNoStyle, kFixed2, kPercent, kDate, kTime, kDateAsNumber };
+
+inline bool isDateStyle(int style) {
+    return style == kDate || style == kTime || style == kDateAsNumber;
+}
+
+inline std::unique_ptr<IVariableFormat> formatOfStyle(int style) {
+    if (style == kPercent) return std::make_unique<PercentageVariableFormat>();
+    if (style == kTime) return std::make_unique<DateTimeVariableFormat>(std::string("H:mm"));
+    if (style == kDate || style == kNumberAsDate)
+        return std::make_unique<DateTimeVariableFormat>(std::string("M/d/yyyy"));
+    auto format = std::make_unique<NumericVariableFormat>();
+    format->autoFormat = style == kNoStyle;
+    format->decimalPlaces = style == kFixed2 ? 2 : 0;
+    return format;
+}
+
+// The host's side of date-times: texts "d<number>" are read, a known pattern adds a thousandth a
+// byte, and values below 0 and from 100000 on cannot be shown.
+class HandHelper : public DateTimeVariableFormat {
+  public:
+    bool ConvertToDatetime(const IString* format, IString* text, double& value) const override {
+        const std::string read = text->database_str();
+        if (read.substr(0, 1) != "d") return false;
+        const std::string known = format ? format->database_str() : "";
+        value = std::stod("0" + read.substr(1)) + static_cast<double>(known.size()) / 1000;
+        return true;
+    }
+    bool ValidVextralTime(double value) const override { return value >= 0 && value < 100000; }
+    void SetDateTimeParameters(const IDateTimeVariableFormat* other) override {
+        taken_ = other->GetFormatString()->database_str();
+    }
+    IString* FormatValue(double value, bool) const override {
+        return new String("by helper " + taken_ + " " + std::to_string(value));
+    }
+
+  private:
+    std::string taken_;
+};
+
+// A provider whose worksheets are filed cell by cell, without a file.
+class HandFilledProvider : public ExcelDataProviderBase {
+  public:
+    long GetWorksheets(const char*, std::vector<std::string>&) override { return -1; }
+    long OpenFile(const char*, FileAccess) override { return -1; }
+    long CloseFile() override { return 0; }
+    IVariableFormat* CreateVextralNumericFormat(const ExternalDataRecordCell& cell) const override {
+        ++formatsMade;
+        return formatOfStyle(cell.formatIndex).release();
+    }
+    bool IsDateTimeFormatType(const ExternalDataRecordCell& cell) const override {
+        return isDateStyle(cell.formatIndex);
+    }
+    void file(unsigned row, unsigned column, const ExternalDataRecordCell& cell) {
+        ExternalDataRecord record(0, 0, row, column);
+        record.cell = cell;
+        AddExternalDataRecord(record);
+    }
+
+    using ExcelDataProviderBase::_blankRows;
+    mutable int formatsMade = 0;
+};
+
+// "'text", "i12" integer, "?1" Boolean, "@3" date-time of the date style, else a number; a last
+// letter names another style: "2f" fixed, "2%", "@3t" time, "@3n" at odds.
+inline ExternalDataRecordCell cellOf(const std::string& code) {
+    ExternalDataRecordCell cell;
+    const std::string kinds = "'i?@";
+    const std::size_t kind = kinds.find(code.at(0));
+    if (kind == 0) {
+        cell.type = CELL_TEXT;
+        cell.textValue = code.substr(1);
+        return cell;
+    }
+    const double value = std::stod(code.substr(kind < kinds.size() ? 1 : 0));
+    constexpr ExternalCellType types[] = {CELL_TEXT, CELL_INTEGER, CELL_BOOLEAN, CELL_DATETIME};
+    cell.type = kind < kinds.size() ? types[kind] : CELL_NUMBER;
+    if (kind == 1) cell.intValue = static_cast<int>(value);
+    if (kind == 2) cell.boolValue = static_cast<int>(value);
+    if (kind >= 3) cell.numValue = value;
+    const std::string styles = "f%?tn";  // in the order of HandStyle
+    const std::size_t style = styles.find(code.back());
+    cell.formatIndex = style < styles.size() ? static_cast<int>(style)
+                       : kind == 3           ? kDate
+                                             : kNoStyle;
+    return cell;
+}
+
+// What a format shows of itself.
+inline std::string describe(const IVariableFormat& format) {
+    const std::string automatic = format.GetAuto() ? "auto " : "";
+    if (const auto* text = dynamic_cast<const ITextVariableFormat*>(&format))
+        return "text " + std::to_string(text->GetCharacterCount());
+    if (const auto* dates = dynamic_cast<const IDateTimeVariableFormat*>(&format))
+        return automatic + "date-time " + dates->GetFormatString()->database_str();
+    const auto& numeric = dynamic_cast<const INumericVariableFormat&>(format);
+    int places = 0;
+    numeric.GetDecimalPlaces(&places, nullptr);
+    const int subtype = static_cast<int>(numeric.GetNumericSubtype());
+    return automatic + "numeric " + std::to_string(subtype) + "." + std::to_string(places);
+}
+
+// What a host sees of a column.
+struct ColumnFacts {
+    bool found = false;
+    int formatType = -1;
+    int dataType = -1;
+    int missing = 0;
+    int converted = 0;
+    int position = 0;
+    std::string name;
+    std::string format;
+    std::vector<double> values;
+    std::vector<std::string> texts;
+
+    // The values alone, missing ones as "*".
+    std::string rows() const {
+        std::ostringstream out;
+        out.precision(17);
+        for (const double value : values) value == 1.23456e30 ? out << " *" : out << ' ' << value;
+        for (const std::string& value : texts) out << " '" << value << '\'';
+        return out.str().substr(out.str().empty() ? 0 : 1);
+    }
+    std::string all() const {
+        std::ostringstream out;
+        out << "found " << found << ", format type " << formatType << ", data type " << dataType
+            << ", missing " << missing << ", converted " << converted << ", position " << position
+            << ", name '" << name << "', format " << format << ": " << rows();
+        return out.str();
+    }
+};
+
+// Asks for a column, notes what it shows and releases it.
+inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key,
+                           ColumnType requested = ColumnType::Automatic,
+                           bool ignoreExclusion = false) {
+    ColumnFacts facts;
+    IColumn* column = reinterpret_cast<IColumn*>(&facts);  // to be set to null
+    IVariableFormat::FormatType type{-1};
+    facts.found = provider.FindColumn(key, &column, requested, &type, ignoreExclusion);
+    facts.formatType = static_cast<int>(type);
+    EXPECT_EQ(column != nullptr, facts.found);
+    if (!facts.found || !column) return facts;
+    EXPECT_EQ(column->AddRef(), 1U);
+    facts.dataType = column->GetDataType();
+    facts.missing = column->GetMissingCount();
+    facts.position = column->GetPosition();
+    facts.name = column->GetName()->database_str();
+    facts.format = describe(*column->GetFormat());
+    if (const auto* numeric = dynamic_cast<INumericColumn*>(column)) {
+        facts.converted = numeric->GetConvertedMissingCount();
+        facts.values.assign(numeric->GetValues(), numeric->GetValues() + column->GetRowCount());
+    } else {
+        const auto& texts = *dynamic_cast<ITextColumn&>(*column).GetTextValues();
+        EXPECT_EQ(texts.Count(), static_cast<unsigned long>(column->GetRowCount()));
+        for (unsigned long i = 0; i < texts.Count(); ++i)
+            facts.texts.emplace_back(texts.Item(i).database_str());
+    }
+    column->Release();
+    return facts;
+}
+
+inline auto processSettings() {
+    using Settings = ExcelDataProviderBase;
+    return std::tie(Settings::_missingValue, Settings::_minNumericValue, Settings::_maxNumericValue,
+                    Settings::_maxTextLength, Settings::_inputDecimal, Settings::_missingValueText,
+                    Settings::_trueValue, Settings::_falseValue);
+}
+
+// Puts the settings of the process back at its end.
+struct KeptSettings {
+    ~KeptSettings() { processSettings() = before; }
+
+    std::tuple<double, double, double, int, char, std::string, std::string, std::string> before{
+        processSettings()};
+};
+
+class ProviderTest : public testing::Test {
+  protected:
+    KeptSettings settings;
+    HandFilledProvider provider;
+};
+
+}  // namespace dp
