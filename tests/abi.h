@@ -138,8 +138,8 @@ inline std::string fieldBehind(const std::string& operation) {
 
 // Checks that every operation of the table at `facet` (the object itself or its second base) that
 // answers a field answers that one, or points to it when it is an object. Returns how many.
-inline int expectGetters(void* object, const void* facet, const Contract& table,
-                         const Contract& layout, std::size_t start = 8) {
+inline int expectGetters(void* object, const void* facet, const Contract& table, const Contract& layout,
+                         std::size_t start = 8) {
     int checked = 0;
     for (std::size_t slot = 2; slot < table.slots.size(); ++slot) {
         SCOPED_TRACE(table.slots[slot]);

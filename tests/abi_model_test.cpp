@@ -116,8 +116,7 @@ TEST(HostContract, FormulaManager) {
     auto* node = new dp::FormulaModelNode;
     manager.formulaNodes.push_back(node);
     EXPECT_EQ(call<int>(&manager, slotOf(contract, "GetFormulaNodeCount")), 1);
-    EXPECT_EQ(call<void*>(&manager, slotOf(contract, "GetFormulaNode"), 0),
-              static_cast<dp::IFormulaModelNode*>(node));
+    EXPECT_EQ(call<void*>(&manager, slotOf(contract, "GetFormulaNode"), 0), static_cast<dp::IFormulaModelNode*>(node));
 }
 
 // A node answers through its own table and through that of its kind, which lacks three operations.
@@ -158,8 +157,7 @@ TEST(HostContract, FormulaNodes) {
     EXPECT_EQ(call<int>(&variable, slotOf(own, "GetVariablePositionCount")), 2);
     EXPECT_STREQ(call<const char*>(&variable, slotOf(own, "GetFormula")), "A+B");
     EXPECT_EQ(call<int>(&variable, slotOf(own, "GetExpressionErrorCount")), 1);
-    EXPECT_EQ(call<void*>(&variable, slotOf(own, "GetExpressionError"), 0),
-              variable.expressionErrors.data());
+    EXPECT_EQ(call<void*>(&variable, slotOf(own, "GetExpressionError"), 0), variable.expressionErrors.data());
 
     dp::FormulaModelNode model;
     model.terms = std::string("A B");
@@ -207,8 +205,7 @@ TEST(HostContract, TextAndDateTimeFormats) {
     EXPECT_EQ(expectOwnGetters(time, "DateTimeVariableFormat"), 2);
     EXPECT_EQ(call<int>(&time, slotOf(slots, "GetType")), 1);
     const unsigned given[4] = {1, 2, 3, 4};
-    std::memcpy(reinterpret_cast<char*>(&time) + fieldOf(slots, "dateTimeParameters").offset, given,
-                sizeof given);
+    std::memcpy(reinterpret_cast<char*>(&time) + fieldOf(slots, "dateTimeParameters").offset, given, sizeof given);
     dp::DateTimeVariableFormat other;
     call<void>(&other, slotOf(slots, "SetDateTimeParameters"), &time);
     unsigned p[4] = {};
@@ -222,8 +219,7 @@ TEST(HostContract, TextAndDateTimeFormats) {
     EXPECT_EQ(call<void*>(&time, slotOf(slots, "CovertVextralDateTimeToString"), 1.0), nullptr);
     EXPECT_FALSE(call<bool>(&time, slotOf(slots, "ValidVextralTime"), 1.0));
     EXPECT_EQ(call<double>(&time, slotOf(slots, "GetCurrentVextralTime")), 0.0);
-    const std::unique_ptr<dp::IString> shown(
-        call<dp::IString*>(&time, slotOf(slots, "FormatValue"), 40179.0, false));
+    const std::unique_ptr<dp::IString> shown(call<dp::IString*>(&time, slotOf(slots, "FormatValue"), 40179.0, false));
     EXPECT_STREQ(shown->database_str(), "1/1/2010");
 }
 

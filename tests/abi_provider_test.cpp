@@ -64,9 +64,7 @@ class ProviderContract : public testing::Test {
         file(1, 1, {5, 0, 0, 0.0, "a  b", -1});
     }
     unsigned long count(const void* collection) { return call<unsigned long>(collection, 2); }
-    int item(const void* collection, unsigned long index) {
-        return call<int>(collection, 3, index);
-    }
+    int item(const void* collection, unsigned long index) { return call<int>(collection, 3, index); }
     // What a column says of itself through its slots: name, rows.
     std::string describe(void* column) {
         const char* name = call<const char*>(call<void*>(column, 6), 2);
@@ -90,13 +88,12 @@ class ProviderContract : public testing::Test {
 };
 
 TEST_F(ProviderContract, WriteSideIsRefused) {
-    for (std::size_t slot = 7; slot <= 27; ++slot)
-        EXPECT_EQ(call<long>(provider, slot, nullptr), -50) << slot;
+    for (std::size_t slot = 7; slot <= 27; ++slot) EXPECT_EQ(call<long>(provider, slot, nullptr), -50) << slot;
     EXPECT_EQ(op<void*>("GetDOEReader"), nullptr);
     EXPECT_EQ(op<long>("RereadFile"), -1);
-    for (const char* ignored : {"SetFieldDelimiter", "SetTextDelimiter", "SetDecimalSeparator",
-                                "SetReadOptionFoldTextValues", "SetInferFormatPolicy",
-                                "SetUnitTesting", "SetTestNoTempFile"})
+    for (const char* ignored :
+         {"SetFieldDelimiter", "SetTextDelimiter", "SetDecimalSeparator", "SetReadOptionFoldTextValues",
+          "SetInferFormatPolicy", "SetUnitTesting", "SetTestNoTempFile"})
         op<void>(ignored, 1);
 }
 
@@ -197,8 +194,7 @@ TEST_F(ProviderContract, WorksheetsAndColumnsComeThroughEveryRoad) {
 
     for (const char* keys : {"GetConstantPrimeKeys", "GetMatrixPrimeKeys", "GetModelPrimeKeys"})
         EXPECT_EQ(count(op<void*>(keys, 1, 1)), 0UL) << keys;
-    for (std::size_t slot = 3; slot <= 5; ++slot)
-        EXPECT_EQ(count(call<void*>(variables, slot, 1, 1)), 0UL) << slot;
+    for (std::size_t slot = 3; slot <= 5; ++slot) EXPECT_EQ(count(call<void*>(variables, slot, 1, 1)), 0UL) << slot;
     for (std::size_t slot = 8; slot <= 11; ++slot) {
         EXPECT_FALSE(call<bool>(variables, slot, 1, &sheet)) << slot;
         EXPECT_FALSE(call<bool>(provider, slot + 90, 1, &sheet)) << slot;
@@ -217,21 +213,16 @@ TEST_F(ProviderContract, ReadOptionsTakeEffect) {
         const char* expected;
     };
     const std::vector<Case> cases = {
-        {"SetReadOptionIgnoreBlankRows", [&] { op<void>("SetReadOptionIgnoreBlankRows", true); },
-         "n/2 t/1"},
+        {"SetReadOptionIgnoreBlankRows", [&] { op<void>("SetReadOptionIgnoreBlankRows", true); }, "n/2 t/1"},
         {"SetReadOptionPadColumnsWithMissingValues",
          [&] { op<void>("SetReadOptionPadColumnsWithMissingValues", true); }, "n/3 t/3"},
-        {"SetReadOptionDataRowPositions",
-         [&] { op<void>("SetReadOptionDataRowPositions", 1U, 0, 0U, 4U); }, "/1 /0"},
-        {"SetReadOptionDefaultUseVariableNameRow",
-         [&] { op<void>("SetReadOptionDefaultUseVariableNameRow", 0); }, "/4 /2"},
-        {"SetReadOptionDataRowCount", [&] { op<void>("SetReadOptionDataRowCount", 1U, 2U); },
-         "n/1 t/1"},
+        {"SetReadOptionDataRowPositions", [&] { op<void>("SetReadOptionDataRowPositions", 1U, 0, 0U, 4U); }, "/1 /0"},
+        {"SetReadOptionDefaultUseVariableNameRow", [&] { op<void>("SetReadOptionDefaultUseVariableNameRow", 0); },
+         "/4 /2"},
+        {"SetReadOptionDataRowCount", [&] { op<void>("SetReadOptionDataRowCount", 1U, 2U); }, "n/1 t/1"},
         {"SetReadOptionExclude", [&] { op<void>("SetReadOptionExclude", 1U, true); }, ""},
-        {"SetReadColumnOptionExclude",
-         [&] { op<void>("SetReadColumnOptionExclude", 1U, 2U, true); }, "n/3 none"},
-        {"SetReadColumnOptionName", [&] { op<void>("SetReadColumnOptionName", 1U, 2U, "x"); },
-         "n/3 x/1"},
+        {"SetReadColumnOptionExclude", [&] { op<void>("SetReadColumnOptionExclude", 1U, 2U, true); }, "n/3 none"},
+        {"SetReadColumnOptionName", [&] { op<void>("SetReadColumnOptionName", 1U, 2U, "x"); }, "n/3 x/1"},
         {"ClearReadColumnOptions",
          [&] {
              op<void>("SetReadColumnOptionName", 1U, 2U, "x");
@@ -284,8 +275,7 @@ TEST_F(ProviderContract, ColumnAndTextOptionsTakeEffect) {
         alignas(std::string) char place[sizeof(std::string)];
         using Convert = void (*)(void*, const void*, const RawCell*, bool);
         void* const* table = *static_cast<void* const* const*>(provider);
-        reinterpret_cast<Convert>(table[slotOf(kProvider(), operation)])(place, provider, &cell,
-                                                                         false);
+        reinterpret_cast<Convert>(table[slotOf(kProvider(), operation)])(place, provider, &cell, false);
         auto* result = std::launder(reinterpret_cast<std::string*>(place));
         std::string copy = *result;
         std::destroy_at(result);

@@ -19,8 +19,8 @@ namespace {
 
 using Model = std::map<unsigned, std::map<unsigned, ExternalDataRecordCell>>;
 
-ExternalDataRecordCell cellOf(std::uint32_t type, std::int32_t integer, std::int32_t boolean,
-                              double number, std::string text, std::int32_t format) {
+ExternalDataRecordCell cellOf(std::uint32_t type, std::int32_t integer, std::int32_t boolean, double number,
+                              std::string text, std::int32_t format) {
     ExternalDataRecordCell cell;
     cell.type = static_cast<ExternalCellType>(type);
     std::tie(cell.intValue, cell.boolValue, cell.numValue) = std::tuple(integer, boolean, number);
@@ -31,13 +31,10 @@ ExternalDataRecordCell cellOf(std::uint32_t type, std::int32_t integer, std::int
 
 auto fieldsOf(const ExternalDataRecordCell& cell) {
     return std::tuple(std::uint32_t{cell.type}, cell.intValue, cell.boolValue,
-                      std::bit_cast<std::uint64_t>(cell.numValue), cell.textValue,
-                      cell.formatIndex);
+                      std::bit_cast<std::uint64_t>(cell.numValue), cell.textValue, cell.formatIndex);
 }
 
-ExternalDataRecordCell textCell(const std::string& text) {
-    return cellOf(CELL_TEXT, 0, 0, 0.0, text, -1);
-}
+ExternalDataRecordCell textCell(const std::string& text) { return cellOf(CELL_TEXT, 0, 0, 0.0, text, -1); }
 
 ExternalDataRecord recordOf(unsigned row, unsigned column, const ExternalDataRecordCell& cell) {
     ExternalDataRecord record(0, 0, row, column);
@@ -52,11 +49,9 @@ class RandomCells {
 
     ExternalDataRecordCell next() {
         const bool usual = below(5) != 0;
-        const std::uint32_t type = usual ? oneOf({3U, 4U, 5U, 6U, 8U})
-                                         : oneOf({0U, 1U, 2U, 4U, 5U, 7U, 15U, 16U, 0xFFFFFFFFU});
-        const auto holds = [&](std::uint32_t named) {
-            return usual ? type == named : below(2) == 0;
-        };
+        const std::uint32_t type =
+            usual ? oneOf({3U, 4U, 5U, 6U, 8U}) : oneOf({0U, 1U, 2U, 4U, 5U, 7U, 15U, 16U, 0xFFFFFFFFU});
+        const auto holds = [&](std::uint32_t named) { return usual ? type == named : below(2) == 0; };
         return cellOf(type, holds(CELL_INTEGER) ? oneOf({1, -1, INT32_MIN, INT32_MAX}) : 0,
                       holds(CELL_BOOLEAN) ? oneOf({1, -1, 0, 256}) : 0,
                       holds(CELL_NUMBER) || holds(CELL_DATETIME) ? number() : 0.0,
@@ -75,8 +70,7 @@ class RandomCells {
     std::mt19937_64 random_{7};
 };
 
-void expectSameColumn(const CellColumn& column,
-                      const std::map<unsigned, ExternalDataRecordCell>& model) {
+void expectSameColumn(const CellColumn& column, const std::map<unsigned, ExternalDataRecordCell>& model) {
     ASSERT_EQ(column.size(), model.size());
     auto cell = column.begin();
     for (const auto& [row, expected] : model) {
@@ -95,8 +89,8 @@ void expectSameColumn(const CellColumn& column,
 template <typename Column>
 auto lookups(const Column& column, unsigned row) {
     const auto found = [&](auto it) { return it == column.end() ? 1ULL << 32 : it->first; };
-    return std::tuple(found(column.find(row)), found(column.lower_bound(row)),
-                      found(column.upper_bound(row)), column.count(row));
+    return std::tuple(found(column.find(row)), found(column.lower_bound(row)), found(column.upper_bound(row)),
+                      column.count(row));
 }
 
 void expectSame(const WorksheetCells& cells, const Model& model) {
@@ -138,8 +132,7 @@ TEST(CellStore, AnswersAsPlainMapsDo) {
         Model model;
         for (unsigned i = 0; i < named.records; ++i) {
             const unsigned row = named.rowOf(i, random.below(named.rows));
-            const unsigned column =
-                random.below(4) ? i % named.columns : random.below(named.columns);
+            const unsigned column = random.below(4) ? i % named.columns : random.below(named.columns);
             const ExternalDataRecordCell cell = random.next();
             cells.add(recordOf(row, column, cell));
             model[column][row] = cell;
@@ -206,8 +199,7 @@ TEST(CellStore, KeepsEqualTextsOnce) {
 TEST(TextPool, TellsTextsApartAtAnyLength) {
     TextPool pool;
     std::map<std::string, PooledText> texts;
-    for (const std::size_t length :
-         {1U, 7U, 8U, 15U, 16U, 17U, 33U, 254U, 255U, 256U, 5000U, 70000U}) {
+    for (const std::size_t length : {1U, 7U, 8U, 15U, 16U, 17U, 33U, 254U, 255U, 256U, 5000U, 70000U}) {
         for (std::size_t place = 0; place < std::min<std::size_t>(length, 40); ++place) {
             std::string text(length, '\0');
             text[length - 1 - place] = 'x';
@@ -224,8 +216,8 @@ TEST(TextPool, TellsTextsApartAtAnyLength) {
 
 TEST(ExternalDataRecord, CopiesAllAndInitializesAll) {
     const auto allOf = [](const ExternalDataRecord& record) {
-        return std::tuple_cat(fieldsOf(record.cell), std::tuple(record.reserved0, record.reserved1,
-                                                                record.row, record.column));
+        return std::tuple_cat(fieldsOf(record.cell),
+                              std::tuple(record.reserved0, record.reserved1, record.row, record.column));
     };
     ExternalDataRecord record(1, 2, 3, 4);
     record.cell = cellOf(CELL_TEXT, 5, 6, 7.0, "text", 8);

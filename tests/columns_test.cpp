@@ -54,9 +54,7 @@ TEST_F(ColumnsOnDemand, LiesInRowsAsTheHostSays) {
     const Options date = [](auto& p) { p.file(0, 9, cellOf("@12")); };
     const Options boolean = [](auto& p) { p.file(0, 9, cellOf("?1")); };
     const auto rows = [](unsigned setting, unsigned name, unsigned data) {
-        return [=](auto& p) {
-            p.SetReadOptionDataRowPositions(1, EVariableNameRowSetting{setting}, name, data);
-        };
+        return [=](auto& p) { p.SetReadOptionDataRowPositions(1, EVariableNameRowSetting{setting}, name, data); };
     };
     const struct {
         std::vector<Options> options;
@@ -104,9 +102,7 @@ TEST_F(ColumnsOnDemand, FillsTheGapsOfExcludedColumnsFromTheRowsThatCount) {
 }
 
 TEST_F(ColumnsOnDemand, TakesItsKindFromItsFirstCell) {
-    const auto type = [](Basic kind) {
-        return [kind](auto& p) { p.SetReadColumnOptionColumnType(1, 1, kind); };
-    };
+    const auto type = [](Basic kind) { return [kind](auto& p) { p.SetReadColumnOptionColumnType(1, 1, kind); }; };
     const Options none;
     const Options helped = [](auto& p) {
         p.SetReadColumnOptionColumnType(1, 1, Basic::DateTime);
@@ -148,8 +144,7 @@ TEST_F(ColumnsOnDemand, TakesItsKindFromItsFirstCell) {
     for (const auto& [cells, options, expected] : cases) {
         fileSheet(cells, options);
         const ColumnFacts facts = factsOf(provider, 1);
-        const std::string numbers =
-            " " + std::to_string(facts.dataType) + " " + std::to_string(facts.converted);
+        const std::string numbers = " " + std::to_string(facts.dataType) + " " + std::to_string(facts.converted);
         EXPECT_EQ(facts.format + numbers + ": " + facts.rows(), expected) << cells;
     }
 }
@@ -180,8 +175,7 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     const auto keysOf = [this](int worksheet) {
         std::string keys;
         const auto* listed = provider.GetColumnPrimeKeys(worksheet);
-        for (unsigned long i = 0; i < listed->Count(); ++i)
-            keys += " " + std::to_string(listed->Item(i));
+        for (unsigned long i = 0; i < listed->Count(); ++i) keys += " " + std::to_string(listed->Item(i));
         return keys;
     };
     fileSheet("|1", [](HandFilledProvider& p) { p.file(1, 7, cellOf("2")); });

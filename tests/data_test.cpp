@@ -41,8 +41,7 @@ class Calendar : public dp::DateTimeVariableFormat {
                         int millisecond) const override {
         using namespace std::chrono;
         const sys_days date = std::chrono::year(year) / month / day;
-        const milliseconds time =
-            hours(hour) + minutes(minute) + seconds(second) + milliseconds(millisecond);
+        const milliseconds time = hours(hour) + minutes(minute) + seconds(second) + milliseconds(millisecond);
         return static_cast<double>((date.time_since_epoch() + days(25569)).count()) +
                static_cast<double>(time.count()) / 86400000.0;
     }
@@ -52,12 +51,10 @@ class Calendar : public dp::DateTimeVariableFormat {
 class DocumentProvider : public dp::xlsxDataProvider {
   public:
     void read(const std::string& path) {
-        reader_ = std::make_unique<dp::ExcelXmlReader>(path, "m/d/yy", GetMissingVxlValue(), this,
-                                                       &calendar_);
+        reader_ = std::make_unique<dp::ExcelXmlReader>(path, "m/d/yy", GetMissingVxlValue(), this, &calendar_);
         reader_->mReadExcelWorkbook();
     }
-    dp::IVariableFormat* CreateVextralNumericFormat(
-        const dp::ExternalDataRecordCell& cell) const override {
+    dp::IVariableFormat* CreateVextralNumericFormat(const dp::ExternalDataRecordCell& cell) const override {
         return reader_->createVextralNumericFormat(cell.formatIndex);
     }
     bool IsDateTimeFormatType(const dp::ExternalDataRecordCell& cell) const override {
@@ -75,8 +72,7 @@ void addNumbers(const dp::INumericColumn& column, json& shown) {
         const double value = column.GetValues()[row];
         const bool missing = value == dp::ExcelDataProviderBase::_missingValue;
         shown["values"].push_back(missing ? json() : json(value));
-        if (!missing && !shown.contains("shown"))
-            shown["shown"] = taken(column.GetFormat()->FormatValue(value, false));
+        if (!missing && !shown.contains("shown")) shown["shown"] = taken(column.GetFormat()->FormatValue(value, false));
     }
 }
 
@@ -147,8 +143,7 @@ TEST_P(DataTest, GivesWhatOtherReadersFindInIt) {
     std::ifstream stored(std::filesystem::path(path).replace_extension(".expected.json"));
     const json expected = json::parse(stored);
     // A text may be cut inside a character; what is left of that one compares as U+FFFD.
-    const std::string text =
-        imported(path.string()).dump(-1, ' ', false, json::error_handler_t::replace);
+    const std::string text = imported(path.string()).dump(-1, ' ', false, json::error_handler_t::replace);
     EXPECT_EQ(json::diff(expected, json::parse(text)), json::array()) << expected.dump(1);
 }
 

@@ -15,29 +15,28 @@
 #include "formats/percentage_variable_format.h"
 #include "formats/style_classification.h"
 #include "provider/excel_data_provider_base.h"
+#include "tests/case_table.h"
 
 namespace dp {
 namespace {
 
 // "D"ecimal, "P"ercentage, "S"cientific and "C"urrency: which recognisers accept the code.
 std::string kindsOf(const std::string& code) {
-    return std::string(parseDecimalFormat(code) ? "D" : "") +
-           (parsePercentageFormat(code) ? "P" : "") + (parseScientficFormat(code) ? "S" : "") +
-           (parseCurrencyFormat(code) ? "C" : "");
+    return std::string(parseDecimalFormat(code) ? "D" : "") + (parsePercentageFormat(code) ? "P" : "") +
+           (parseScientficFormat(code) ? "S" : "") + (parseCurrencyFormat(code) ? "C" : "");
 }
 
 TEST(FormatCodes, NumberRecognisers) {
     const struct {
         const char* kinds;
         std::vector<const char*> codes;
-    } cases[] = {
-        {"D", {"", "0", "0.", "0.0", "0.00000000000", "#,##0", "#,##0.", "#,##0.00"}},
-        {"P", {"%", "0%", "0.%", "#,##0.0%"}},
-        {"S", {"0.00E+00", "0E+0", "##0.0E+0", "###,##0.0E+00", "#,##0E+0"}},
-        {"C", {R"("$"#,##0.00_);\("$"#,##0.00\))", "[$€-2] #,##0.00", R"(#\,##0 "days")"}},
-        {"", {"00", ".5", "0..", "0.0.0", "0.0#", "#,##", "#,##00", "#,##0_)", "General"}},
-        {"", {"0.0%%", "%0", "##E+0", "E+00", "E+0", "0.00E+000", "0.00e+00", "0.00E-00"}},
-        {"", {"#,##0.00_);(#,##0.00)", "#,##0 \"", R"("$"0.00)", R"(#,##0;"a")", R"("a";#,##0)"}}};
+    } cases[] = {{"D", {"", "0", "0.", "0.0", "0.00000000000", "#,##0", "#,##0.", "#,##0.00"}},
+                 {"P", {"%", "0%", "0.%", "#,##0.0%"}},
+                 {"S", {"0.00E+00", "0E+0", "##0.0E+0", "###,##0.0E+00", "#,##0E+0"}},
+                 {"C", {R"("$"#,##0.00_);\("$"#,##0.00\))", "[$€-2] #,##0.00", R"(#\,##0 "days")"}},
+                 {"", {"00", ".5", "0..", "0.0.0", "0.0#", "#,##", "#,##00", "#,##0_)", "General"}},
+                 {"", {"0.0%%", "%0", "##E+0", "E+00", "E+0", "0.00E+000", "0.00e+00", "0.00E-00"}},
+                 {"", {"#,##0.00_);(#,##0.00)", "#,##0 \"", R"("$"0.00)", R"(#,##0;"a")", R"("a";#,##0)"}}};
     for (const auto& c : cases)
         for (const char* code : c.codes) EXPECT_EQ(kindsOf(code), c.kinds) << code;
 }
@@ -56,14 +55,12 @@ TEST(FormatCodes, DateTimeCodes) {
     const struct {
         const char* type;
         std::vector<std::string> codes;  // none of which is changed
-    } groups[] = {
-        {"0 ", {"", "General", "DD/MM/YYYY", "qq QQ Q", "WW wk W", "0.00"}},
-        {"7 ", {"m", "mmm", "[$-409 d", "Qq", "qQ0", "Wk", "Ww", "[Red]0.0"}},
-        {"8 ", {"mm:ss", "h:mm", "hm:m0s", "mm:ss.0", "ss.00["}},
-        {"9 ", {"mmm:ss", "h:mmm", "h:m:mm", "mh", "m/d/yy h:mm", "0 \"sad\"", "d [ss.0"}}};
+    } groups[] = {{"0 ", {"", "General", "DD/MM/YYYY", "qq QQ Q", "WW wk W", "0.00"}},
+                  {"7 ", {"m", "mmm", "[$-409 d", "Qq", "qQ0", "Wk", "Ww", "[Red]0.0"}},
+                  {"8 ", {"mm:ss", "h:mm", "hm:m0s", "mm:ss.0", "ss.00["}},
+                  {"9 ", {"mmm:ss", "h:mmm", "h:m:mm", "mh", "m/d/yy h:mm", "0 \"sad\"", "d [ss.0"}}};
     for (const auto& group : groups)
-        for (const std::string& code : group.codes)
-            EXPECT_EQ(dateTimeParse(code), group.type + code);
+        for (const std::string& code : group.codes) EXPECT_EQ(dateTimeParse(code), group.type + code);
 
     const char* const changed[][2] = {{"[$-409]h:mm:ss AM/PM;@", "8 h:mm:ss AM/PM"},
                                       {"\\[$-409]mmm\\-yy", "7 mmm-yy"},
@@ -117,20 +114,13 @@ std::string expectedPattern(std::string code) {
 }
 
 TEST(FormatCodes, IcuPatterns) {
-    for (const char* code : {"m/d",         "d/m",
-                             "m/d/yy",      "mm/dd/yy",
-                             "d/m/yy",      "dd/mm/yy",
-                             "d-mmm",       "d-mmm-yy",
-                             "dd-mmm-yy",   "mmm-yy",
-                             "mmmm-yy",     "mmmm d, yyyy",
-                             "m/d/yy h:mm", "m/d/yy h:mm AM/PM",
-                             "mmmmm",       "mmmmm-yy",
-                             "m/d/yyyy",    "d/m/yyyy",
-                             "d-mmm-yyyy",  "dddd, mmmm dd, yyyy",
-                             "h:mm",        "h:mm AM/PM",
-                             "h:mm:ss",     "h:mm:ss.000",
-                             "mm:ss",       "h:mm:ss AM/PM",
-                             "mm:ss.0",     "h:mm:ss.000 AM/PM"}) {
+    for (const char* code :
+         {"m/d",           "d/m",          "m/d/yy",           "mm/dd/yy",          "d/m/yy",
+          "dd/mm/yy",      "d-mmm",        "d-mmm-yy",         "dd-mmm-yy",         "mmm-yy",
+          "mmmm-yy",       "mmmm d, yyyy", "m/d/yy h:mm",      "m/d/yy h:mm AM/PM", "mmmmm",
+          "mmmmm-yy",      "m/d/yyyy",     "d/m/yyyy",         "d-mmm-yyyy",        "dddd, mmmm dd, yyyy",
+          "h:mm",          "h:mm AM/PM",   "h:mm:ss",          "h:mm:ss.000",       "mm:ss",
+          "h:mm:ss AM/PM", "mm:ss.0",      "h:mm:ss.000 AM/PM"}) {
         ASSERT_NE(icuPatternOf(code), nullptr) << code;
         EXPECT_EQ(*icuPatternOf(code), expectedPattern(code));
     }
@@ -152,44 +142,22 @@ std::string describe(const IVariableFormat& format) {
         return "percentage " + std::to_string(percentage->percentDecimalPlaces);
     const auto& numeric = dynamic_cast<const NumericVariableFormat&>(format);
     const char* const kinds[] = {"general ", "fixed ", "scientific "};
-    return (numeric.autoFormat ? "automatic " : "") +
-           std::string(kinds[static_cast<int>(numeric.numericSubtype)]) +
+    return (numeric.autoFormat ? "automatic " : "") + std::string(kinds[static_cast<int>(numeric.numericSubtype)]) +
            std::to_string(numeric.decimalPlaces);
 }
 
 std::string formatOf(std::vector<xStyle>& styles, int index, bool isDateTime) {
-    return describe(
-        *std::unique_ptr<IVariableFormat>(createStyleFormat(styles, index, isDateTime)));
+    return describe(*std::unique_ptr<IVariableFormat>(createStyleFormat(styles, index, isDateTime)));
 }
 
 TEST(StyleClassification, CodesFromTheFile) {
-    const struct {
-        const char* code;
-        int type;
-        const char* left;
-        const char* format;
-    } cases[] = {{"", 0, "", "fixed 0"},
-                 {"0.", 0, "0.", "fixed 0"},
-                 {"#,##0.000", 0, "#,##0.000", "fixed 3"},
-                 {"0.00%", 0, "0.00%", "percentage 2"},
-                 {"0%", 0, "0%", "percentage 0"},
-                 {"#,##0%", 0, "#,##0%", "percentage 2"},
-                 {"0.000E+00", 0, "0.000E+00", "scientific 3"},
-                 {"0E+00", 0, "0E+00", "scientific 2"},
-                 {"0.E+0", 0, "0.E+0", "scientific 0"},
-                 {"#,##0 \"days\"", 0, "#,##0 \"days\"", "automatic general 0"},
-                 {"\\k# ?/?;0", 0, "\\k# ?/?;0", "automatic general 0"},
-                 {"General Date", 0, "General Date", "automatic general 0"},
-                 {"[$-409]mmm\\-yy;@", 7, "mmm-yy", "MMM-yy"},
-                 {"h:mm:ss AM/PM", 8, "h:mm:ss AM/PM", "h:mm:ss a"},
-                 {"yyyy", 7, "yyyy", ""}};
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.code);
-        std::vector<xStyle> styles = {{"164", c.code, EXCEL_FORMAT_PARENTHESES}};
+    for (const auto& c : caseTable("format_codes.txt")) {
+        SCOPED_TRACE(c[0]);
+        std::vector<xStyle> styles = {{"164", c[1], EXCEL_FORMAT_PARENTHESES}};
         setFormatType(styles[0]);
-        EXPECT_EQ(styles[0].formatType, c.type);
-        EXPECT_EQ(styles[0].formatCode, c.left);
-        EXPECT_EQ(formatOf(styles, 0, c.type != 0), c.format);
+        EXPECT_EQ(std::to_string(styles[0].formatType), c[2]);
+        EXPECT_EQ(styles[0].formatCode, c[3]);
+        EXPECT_EQ(formatOf(styles, 0, c[2] != "0"), c[4]);
     }
 }
 
@@ -205,48 +173,13 @@ TEST(StyleClassification, FormatsOfTheTable) {
 }
 
 TEST(StyleClassification, DescriptiveNames) {
-    const xStyle expected[] = {{"General Date", "m/d/yyyy h:mm", 9},
-                               {"Long Date", "d-mmm-yy", 7},
-                               {"Medium Date", "d-mmm-yy", 7},
-                               {"Short Date", "m/d/yy", 7},
-                               {"Long Time", "h:mm:ss AM/PM", 8},
-                               {"Medium Time", "h:mm AM/PM", 8},
-                               {"Short Time", "h:mm", 8},
-                               {"Percent", "0.00%", 4},
-                               {"Currency", "$0", 3},
-                               {"Scientific", "0.00E+00", 5},
-                               {"Fixed", "0.00", 2},
-                               {"short date", "short date", 10},
-                               {"Fixed ", "Fixed ", 10}};
-    for (const xStyle& style : expected) {
-        std::vector<xStyle> styles = {{"", "other", 10}, {"", style.styleId, 10}};
+    for (const auto& c : caseTable("descriptive_names.txt")) {
+        std::vector<xStyle> styles = {{"", "other", 10}, {"", c[1], 10}};
         replaceDescriptiveNames(styles, {"m/d/yy", "0.00%", "$0", "0.00E+00", "0.00"});
         EXPECT_EQ(styles[0].formatCode, "other");
-        EXPECT_EQ(styles[1].formatCode, style.formatCode);
-        EXPECT_EQ(styles[1].formatType, style.formatType) << style.styleId;
+        EXPECT_EQ(styles[1].formatCode, c[2]);
+        EXPECT_EQ(std::to_string(styles[1].formatType), c[3]) << c[1];
     }
-}
-
-TEST(StyleClassification, LocaleCodes) {
-    const auto mask = [](const char* text) {
-        return [text = std::string(text)]() -> const std::string& { return text; };
-    };
-    const auto unasked = []() -> const std::string& { throw std::logic_error("asked in vain"); };
-    const xStyle expected[] = {
-        {"22", "m/d/yy hh:mm"}, {"19", "hh:mm:ss AM/PM"}, {"14", "m/d/yy"}, {"18", "hh:mm AM/PM"},
-        {"20", "hh:mm"},        {"21", "hh:mm:ss"},       {"19", "other"},  {"9", "other"}};
-    std::vector<xStyle> styles;
-    for (const xStyle& style : expected) styles.push_back({style.styleId, "other", 4});
-    updateFormatsForLocale(styles, {mask("hh:mm"), mask(":"), mask("AM/PM")});
-    for (std::size_t i = 0; i < styles.size(); ++i) {
-        EXPECT_EQ(styles[i].formatCode, expected[i].formatCode) << styles[i].styleId;
-        EXPECT_EQ(styles[i].formatType, 4);
-    }
-    std::string code = "kept";
-    composeDateTimeCode(code, SECONDS_PART | AMPM_PART, {mask("H"), unasked, unasked});
-    EXPECT_EQ(code, "kept");
-    composeDateTimeCode(code, 15, {mask("HH.mm"), mask("."), mask("vorm.")});
-    EXPECT_EQ(code, "m/d/yy HH.mm.ss vorm.");
 }
 
 }  // namespace

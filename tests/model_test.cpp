@@ -36,20 +36,17 @@ class Round {
     }
 
     std::string anyText() {
-        return oneOf<std::string>({"", " ", "  a  b ", " 12.5 ", "(3)", "1,5", "NA", "x\ny\tz",
-                                   "\x01#it's", "*\r\nx*", "R\u00e9s", "2d4", "d400", "a \x01",
-                                   "e\u0301 \u0301f", "d", "* it"});
+        return oneOf<std::string>({"", " ", "  a  b ", " 12.5 ", "(3)", "1,5", "NA", "x\ny\tz", "\x01#it's", "*\r\nx*",
+                                   "R\u00e9s", "2d4", "d400", "a \x01", "e\u0301 \u0301f", "d", "* it"});
     }
     ExternalDataRecordCell anyCell(unsigned kind) {
         if (below(5) == 0) kind = below(6);
-        const auto number =
-            oneOf<const char*>({"0", "-0.0", "1.5", "-99", "12.25", "40000.5", "123456.7", "2e18",
-                                "1.23456e30", "1e-7", "nan", "-7"});
-        ExternalDataRecordCell cell =
-            cellOf(kind == 2 || kind == 5 ? "'" + anyText()
-                   : kind == 3            ? std::string("@") + number
-                   : kind == 4            ? oneOf<std::string>({"i7", "i-99", "?0", "?1", "?-2"})
-                                          : number);
+        const auto number = oneOf<const char*>(
+            {"0", "-0.0", "1.5", "-99", "12.25", "40000.5", "123456.7", "2e18", "1.23456e30", "1e-7", "nan", "-7"});
+        ExternalDataRecordCell cell = cellOf(kind == 2 || kind == 5 ? "'" + anyText()
+                                             : kind == 3            ? std::string("@") + number
+                                             : kind == 4 ? oneOf<std::string>({"i7", "i-99", "?0", "?1", "?-2"})
+                                                         : number);
         if (kind == 5) cell.type = oneOf({CELL_EMPTY, ExternalCellType{7}, CELL_NUMBER});
         cell.formatIndex = oneOf({-1, -1, -1, 0, 1, 2, 3, 4, 99, -2, -3});
         return cell;
@@ -87,8 +84,8 @@ class Round {
     using Change = std::function<void()>;
     void change() {
         const unsigned key = below(12) ? 1 + below(3) : 99;
-        oneOf<Change>({[&] { changeColumn(key, 1 + below(6)); }, [&] { changeSettings(); },
-                       [&] { changeLayout(key); }})();
+        oneOf<Change>(
+            {[&] { changeColumn(key, 1 + below(6)); }, [&] { changeSettings(); }, [&] { changeLayout(key); }})();
     }
     void changeLayout(unsigned key) {
         const bool on = below(3) != 0;
@@ -109,9 +106,7 @@ class Round {
                 provider_.SetReadOptionDataRowCount(key, count);
                 naive_.options[key].dataRowCount = count;
             },
-            [&] {
-                provider_.SetReadOptionDefaultUseVariableNameRow(naive_.defaultSetting = setting);
-            },
+            [&] { provider_.SetReadOptionDefaultUseVariableNameRow(naive_.defaultSetting = setting); },
         })();
     }
     void changeColumn(unsigned key, unsigned column) {

@@ -33,9 +33,7 @@ inline std::string variableName(std::string name, unsigned maximumLength) {
     return name;
 }
 
-inline bool hasCell(const Column& column, std::size_t row) {
-    return row < column.size() && column[row].has_value();
-}
+inline bool hasCell(const Column& column, std::size_t row) { return row < column.size() && column[row].has_value(); }
 inline std::optional<unsigned> lastRowOf(const Column& column, unsigned bound = kUnset) {
     std::optional<unsigned> last;
     for (unsigned row = 0; row < column.size() && row <= bound; ++row)
@@ -77,8 +75,8 @@ class Provider {
         if (on)
             for (const Sheet& sheet : sheets) findLastRow(sheet.key);
     }
-    void SetReadOptionDataRowPositions(unsigned key, EVariableNameRowSetting setting,
-                                       unsigned nameRow, unsigned firstRow) {
+    void SetReadOptionDataRowPositions(unsigned key, EVariableNameRowSetting setting, unsigned nameRow,
+                                       unsigned firstRow) {
         SheetReadOptions& rows = options[key];
         rows.rowsOneBased = true;
         rows.variableNameRowSetting = setting;
@@ -161,8 +159,7 @@ class Provider {
         const Sheet* sheet = sheetOf(key);
         if (!sheet || !(ignoreBlank || pad) || lastRows_.count(key) || hidden(key)) return;
         unsigned last = 0;
-        for (const Column& column : sheet->columns)
-            last = std::max(last, lastRowOf(column).value_or(0));
+        for (const Column& column : sheet->columns) last = std::max(last, lastRowOf(column).value_or(0));
         lastRows_[key] = last;
     }
     void findBlankRows(unsigned key) {
@@ -184,19 +181,16 @@ class Provider {
     }
 
     std::string nameInSheet(const SheetReadOptions& rows, const Column& column) {
-        if (rows.variableNameRowSetting == VNR_NONE || !hasCell(column, rows.variableNameRow))
-            return "";
+        if (rows.variableNameRowSetting == VNR_NONE || !hasCell(column, rows.variableNameRow)) return "";
         return library_.ConvertCellToString(*column[rows.variableNameRow], true);
     }
     unsigned rowCount(unsigned key, const Column& column) {
         const unsigned first = options[key].firstDataRow;
         const unsigned limit = options[key].dataRowCount;
         std::optional<unsigned> last = lastRowOf(column);
-        if (!pad && static_cast<double>(first) + limit <= 4294967295.0)
-            last = lastRowOf(column, first + limit - 1);
+        if (!pad && static_cast<double>(first) + limit <= 4294967295.0) last = lastRowOf(column, first + limit - 1);
         if (!last) return 0;
-        if (pad && (firstAtOrAfter(column, first) || !nameInSheet(options[key], column).empty()))
-            last = lastRows_[key];
+        if (pad && (firstAtOrAfter(column, first) || !nameInSheet(options[key], column).empty())) last = lastRows_[key];
         const unsigned n = *last + 1 - first > 0x7FFFFFFF ? 0 : *last + 1 - first;
         const unsigned count = std::min(n, limit);
         return n ? count - blanks(key, first, first + count) : count;
@@ -204,8 +198,7 @@ class Provider {
     // Hands each cell that gets a slot below `rows` to `store`, and the slots of the rows without
     // cell in between to `fill`. Answers whether there was any cell.
     template <typename Fill, typename Store>
-    bool walk(unsigned key, const Column& column, unsigned rows, const Fill& fill,
-              const Store& store) {
+    bool walk(unsigned key, const Column& column, unsigned rows, const Fill& fill, const Store& store) {
         const unsigned first = options[key].firstDataRow;
         unsigned index = 0;
         unsigned expected = first;
@@ -224,8 +217,7 @@ class Provider {
         return expected != first;
     }
 
-    ColumnFacts load(const Sheet& sheet, unsigned index, ColumnType requested,
-                     bool ignoreExclusion) {
+    ColumnFacts load(const Sheet& sheet, unsigned index, ColumnType requested, bool ignoreExclusion) {
         using Basic = IVariable::BasicDataType;
         ColumnFacts facts;
         const Column& column = sheet.columns[index];
@@ -234,11 +226,9 @@ class Provider {
         if (!firstData)
             facts.formatType = requested == ColumnType::Text ? 2 : 0;
         else
-            facts.formatType =
-                firstData->type == CELL_TEXT ? 2 : (isDateStyle(firstData->formatIndex) ? 1 : 0);
+            facts.formatType = firstData->type == CELL_TEXT ? 2 : (isDateStyle(firstData->formatIndex) ? 1 : 0);
         bool texts = requested == ColumnType::Text;
-        if (requested == ColumnType::Automatic)
-            texts = facts.formatType == 2 || (facts.formatType == 1 && convert);
+        if (requested == ColumnType::Automatic) texts = facts.formatType == 2 || (facts.formatType == 1 && convert);
         facts.position = static_cast<int>(index) + 1;
         ColumnReadOptions option;
         if (columnOptions[sheet.key].count(index + 1)) option = columnOptions[sheet.key][index + 1];
@@ -258,8 +248,7 @@ class Provider {
             loadNumbers(sheet.key, column, option.columnType, facts);
         return facts;
     }
-    void loadNumbers(unsigned key, const Column& column, IVariable::BasicDataType wanted,
-                     ColumnFacts& facts) {
+    void loadNumbers(unsigned key, const Column& column, IVariable::BasicDataType wanted, ColumnFacts& facts) {
         const double none = ExcelDataProviderBase::_missingValue;
         const bool dateWanted = wanted == IVariable::BasicDataType::DateTime;
         facts.values.assign(rowCount(key, column), none);
@@ -275,15 +264,13 @@ class Provider {
             value = previewing && slot >= 101
                         ? 1.23456e30
                         : library_.ConvertCellToReal(cell, dateWanted || facts.formatType == 1,
-                                                     dates ? dates->GetFormatString() : nullptr,
-                                                     converted);
+                                                     dates ? dates->GetFormatString() : nullptr, converted);
             facts.converted += converted ? 1 : 0;
             if (value == none) return;
             --facts.missing;
             if (!format) format = inferred(cell, wanted);
         };
-        const bool handled =
-            walk(key, column, static_cast<unsigned>(facts.values.size()), fill, store);
+        const bool handled = walk(key, column, static_cast<unsigned>(facts.values.size()), fill, store);
         if (!format) format = automaticFormat(dateWanted);
         const bool dates = format->GetType() == IVariableFormat::FormatType::DateTime;
         facts.dataType = dateWanted || dates ? 2 : 0;
@@ -296,16 +283,14 @@ class Provider {
         format->autoFormat = true;
         return format;
     }
-    static std::unique_ptr<IVariableFormat> inferred(const Cell& cell,
-                                                     IVariable::BasicDataType wanted) {
+    static std::unique_ptr<IVariableFormat> inferred(const Cell& cell, IVariable::BasicDataType wanted) {
         using Basic = IVariable::BasicDataType;
         using Type = IVariableFormat::FormatType;
         std::unique_ptr<IVariableFormat> format = formatOfStyle(cell.formatIndex);
         const bool dateWanted = wanted == Basic::DateTime;
         if (!dateWanted && wanted != Basic::Numeric) return format;
         const bool styled = dateWanted ? cell.formatIndex != -1 : cell.formatIndex >= 0;
-        if (styled && format->GetType() == (dateWanted ? Type::DateTime : Type::Numeric))
-            return format;
+        if (styled && format->GetType() == (dateWanted ? Type::DateTime : Type::Numeric)) return format;
         return automaticFormat(dateWanted);
     }
     void loadTexts(unsigned key, const Column& column, ColumnFacts& facts) {
@@ -317,8 +302,7 @@ class Provider {
             if (missingText.empty()) facts.texts[slot] = missingTextTo;
         };
         const auto store = [&](const Cell& cell, unsigned slot) {
-            std::string value =
-                previewing && slot > 100 ? "" : library_.ConvertCellToString(cell, false);
+            std::string value = previewing && slot > 100 ? "" : library_.ConvertCellToString(cell, false);
             if (value.find_first_not_of(' ') == std::string::npos) value.clear();
             if (value == missingText) value = missingTextTo;
             value = value.substr(0, static_cast<unsigned>(ExcelDataProviderBase::_maxTextLength));

@@ -22,8 +22,7 @@ std::optional<double> numberIn(std::string text, char decimal) {
         return made;
     }();
     trim(text);
-    if (!text.empty() && text.front() == '(' && text.back() == ')')
-        text = "-" + text.substr(1, text.size() - 2);
+    if (!text.empty() && text.front() == '(' && text.back() == ')') text = "-" + text.substr(1, text.size() - 2);
     for (char& c : text) {
         if (c != decimal && (c == '.' || c == '\0')) return std::nullopt;
         c = c == decimal ? '.' : c == 'D' || c == 'd' || c == 'e' ? 'E' : c;

@@ -36,13 +36,9 @@ struct PackageBuilder {
     static std::string workbook(const std::string& sheets) {
         return "<workbook xmlns:r='r'><bookViews/><sheets>" + sheets + "</sheets></workbook>";
     }
-    static std::string relationships(const std::string& list) {
-        return "<Relationships>" + list + "</Relationships>";
-    }
-    static std::string relation(const std::string& id, const std::string& type,
-                                const std::string& target) {
-        return "<Relationship Id='" + id + "' Type='http://x/relationships/" + type + "' Target='" +
-               target + "'/>";
+    static std::string relationships(const std::string& list) { return "<Relationships>" + list + "</Relationships>"; }
+    static std::string relation(const std::string& id, const std::string& type, const std::string& target) {
+        return "<Relationship Id='" + id + "' Type='http://x/relationships/" + type + "' Target='" + target + "'/>";
     }
 
     // Adds a part or replaces the one of that name; an empty content takes it away.
@@ -61,8 +57,7 @@ struct PackageBuilder {
         const zipFile zip = zipOpen64(path.c_str(), APPEND_STATUS_CREATE);
         for (const auto& [name, content] : parts) {
             zip_fileinfo info{};
-            zipOpenNewFileInZip(zip, name.c_str(), &info, nullptr, 0, nullptr, 0, nullptr,
-                                Z_DEFLATED, Z_BEST_SPEED);
+            zipOpenNewFileInZip(zip, name.c_str(), &info, nullptr, 0, nullptr, 0, nullptr, Z_DEFLATED, Z_BEST_SPEED);
             zipWriteInFileInZip(zip, content.data(), static_cast<unsigned>(content.size()));
             zipCloseFileInZip(zip);
         }

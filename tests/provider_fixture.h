@@ -20,9 +20,7 @@ namespace dp {
 // counted as one, and the other way round.
 enum HandStyle { kNumberAsDate = -2, kNoStyle, kFixed2, kPercent, kDate, kTime, kDateAsNumber };
 
-inline bool isDateStyle(int style) {
-    return style == kDate || style == kTime || style == kDateAsNumber;
-}
+inline bool isDateStyle(int style) { return style == kDate || style == kTime || style == kDateAsNumber; }
 
 inline std::unique_ptr<IVariableFormat> formatOfStyle(int style) {
     if (style == kPercent) return std::make_unique<PercentageVariableFormat>();
@@ -100,9 +98,7 @@ inline ExternalDataRecordCell cellOf(const std::string& code) {
     if (kind >= 3) cell.numValue = value;
     const std::string styles = "f%?tn";  // in the order of HandStyle
     const std::size_t style = styles.find(code.back());
-    cell.formatIndex = style < styles.size() ? static_cast<int>(style)
-                       : kind == 3           ? kDate
-                                             : kNoStyle;
+    cell.formatIndex = style < styles.size() ? static_cast<int>(style) : kind == 3 ? kDate : kNoStyle;
     return cell;
 }
 
@@ -143,16 +139,15 @@ struct ColumnFacts {
     }
     std::string all() const {
         std::ostringstream out;
-        out << "found " << found << ", format type " << formatType << ", data type " << dataType
-            << ", missing " << missing << ", converted " << converted << ", position " << position
-            << ", name '" << name << "', format " << format << ": " << rows();
+        out << "found " << found << ", format type " << formatType << ", data type " << dataType << ", missing "
+            << missing << ", converted " << converted << ", position " << position << ", name '" << name << "', format "
+            << format << ": " << rows();
         return out.str();
     }
 };
 
 // Asks for a column, notes what it shows and releases it.
-inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key,
-                           ColumnType requested = ColumnType::Automatic,
+inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key, ColumnType requested = ColumnType::Automatic,
                            bool ignoreExclusion = false) {
     ColumnFacts facts;
     IColumn* column = reinterpret_cast<IColumn*>(&facts);  // to be set to null
@@ -173,8 +168,7 @@ inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key,
     } else {
         const auto& texts = *dynamic_cast<ITextColumn&>(*column).GetTextValues();
         EXPECT_EQ(texts.Count(), static_cast<unsigned long>(column->GetRowCount()));
-        for (unsigned long i = 0; i < texts.Count(); ++i)
-            facts.texts.emplace_back(texts.Item(i).database_str());
+        for (unsigned long i = 0; i < texts.Count(); ++i) facts.texts.emplace_back(texts.Item(i).database_str());
     }
     column->Release();
     return facts;
@@ -191,8 +185,7 @@ inline auto processSettings() {
 struct KeptSettings {
     ~KeptSettings() { processSettings() = before; }
 
-    std::tuple<double, double, double, int, char, std::string, std::string, std::string> before{
-        processSettings()};
+    std::tuple<double, double, double, int, char, std::string, std::string, std::string> before{processSettings()};
 };
 
 class ProviderTest : public testing::Test {

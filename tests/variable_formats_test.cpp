@@ -91,9 +91,8 @@ std::string streamedText(double value, NumericSubtype subtype, int decimals, boo
 }
 
 std::vector<double> specialValues() {
-    std::vector<double> values = {0.0,        -0.0,      0.1,       1.0 / 3, kInfinity,
-                                  -kInfinity, kNaN,      -kNaN,     2.5,     1e308,
-                                  kLargest,   -kLargest, 9.9999e22, 0.5,     -12345.678};
+    std::vector<double> values = {0.0, -0.0,  0.1,      1.0 / 3,   kInfinity, -kInfinity, kNaN,      -kNaN,
+                                  2.5, 1e308, kLargest, -kLargest, 9.9999e22, 0.5,        -12345.678};
     for (int exponent = -1074; exponent < 1024; ++exponent) {
         values.push_back(std::ldexp(exponent % 2 ? 1.0 : -1.0, exponent));
         values.push_back(std::strtod(("1e" + std::to_string(exponent / 3)).c_str(), nullptr));
@@ -129,8 +128,8 @@ TEST_F(VariableFormats, NumbersRenderAsTheClassicStreamRendersThem) {
         format.autoFormat = variant == 22;
         format.numericSubtype = variant < 11 ? kFixed : format.autoFormat ? kGeneral : kScientific;
         format.decimalPlaces = static_cast<int>(variant % 11);
-        ASSERT_EQ(rendered(format, value), streamedText(value, format.numericSubtype,
-                                                        format.decimalPlaces, format.autoFormat))
+        ASSERT_EQ(rendered(format, value),
+                  streamedText(value, format.numericSubtype, format.decimalPlaces, format.autoFormat))
             << std::hexfloat << value << ", variant " << variant;
     };
     for (std::size_t i = 0; i < values.size() && !HasFatalFailure(); ++i) {
@@ -141,8 +140,7 @@ TEST_F(VariableFormats, NumbersRenderAsTheClassicStreamRendersThem) {
     }
     format.numericSubtype = kFixed;
     format.decimalPlaces = 1500;  // a code may have as many zeros
-    for (const double value : {-1e308, 5e-324})
-        EXPECT_EQ(rendered(format, value), streamed(value, 1500, std::fixed));
+    for (const double value : {-1e308, 5e-324}) EXPECT_EQ(rendered(format, value), streamed(value, 1500, std::fixed));
 }
 
 TEST_F(VariableFormats, Numbers) {
@@ -157,8 +155,7 @@ TEST_F(VariableFormats, Numbers) {
     } cases[] = {
         {"14 digits suffice", kGeneral, 0, true, false, 0.1, "0.1"},
         {"16 digits", kGeneral, 0, true, false, 1.0 / 3, "0.3333333333333333"},
-        {"15 digits exceed the largest and read as it", kGeneral, 0, true, false, kLargest,
-         "1.79769313486232e+308"},
+        {"15 digits exceed the largest and read as it", kGeneral, 0, true, false, kLargest, "1.79769313486232e+308"},
         {"comma", kFixed, 2, false, false, 2.5, "2,50", ','},
         {"negative decimals count as none", kFixed, -3, false, false, 2.5, "2"},
         {"full precision drops the decimals", kFixed, 2, false, true, 2.75, "3"},

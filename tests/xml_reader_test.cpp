@@ -16,9 +16,7 @@ namespace {
 
 class XmlReading : public TemporaryFiles {
   protected:
-    void open(XmlReader& reader, const std::string& document) {
-        reader.mInitialize(write("part.xml", document));
-    }
+    void open(XmlReader& reader, const std::string& document) { reader.mInitialize(write("part.xml", document)); }
     // Reads the whole document; the code of the exception, or 0.
     int codeOfReading(const std::string& document) {
         try {
@@ -185,13 +183,8 @@ void compareCasts(unsigned count, unsigned seed) {
             text[length] = '\0';
             while (length > 0) text[--length] = alphabet[random() % alphabet.size()];
         } else {
-            const double value =
-                std::ldexp(static_cast<double>(random()), static_cast<int>(random() % 200) - 100);
-            std::snprintf(text, sizeof text,
-                          i % 4 == 1   ? "%.17g"
-                          : i % 4 == 2 ? "%.6f"
-                                       : "%.3e",
-                          value);
+            const double value = std::ldexp(static_cast<double>(random()), static_cast<int>(random() % 200) - 100);
+            std::snprintf(text, sizeof text, i % 4 == 1 ? "%.17g" : i % 4 == 2 ? "%.6f" : "%.3e", value);
             if (char* comma = std::strchr(text, ',')) *comma = '.';
         }
         double value = -1.0;
@@ -201,8 +194,8 @@ void compareCasts(unsigned count, unsigned seed) {
 }
 
 TEST(CmXmlCast, YieldsWhatTheCLibraryYields) {
-    for (const char* text : {"", "abc", "  7", "+7", "0x1A", "1e999", "-1e-999", "12 kg", "1e5x",
-                             ".", "-", "-.5", "5.", "1.2.3", "\t-3.25\n", "4e-320"}) {
+    for (const char* text : {"", "abc", "  7", "+7", "0x1A", "1e999", "-1e-999", "12 kg", "1e5x", ".", "-", "-.5", "5.",
+                             "1.2.3", "\t-3.25\n", "4e-320"}) {
         double value = -1.0;
         CmXmlCast::instance().mCast(value, text);
         EXPECT_EQ(value, castLiterally(text)) << text;
@@ -212,11 +205,10 @@ TEST(CmXmlCast, YieldsWhatTheCLibraryYields) {
 }
 
 TEST(CmXmlCast, ReadsPointsUnderADecimalComma) {
-    const auto directory = boost::filesystem::temp_directory_path() /
-                           boost::filesystem::unique_path("locale-%%%%-%%%%");
+    const auto directory =
+        boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("locale-%%%%-%%%%");
     boost::filesystem::create_directories(directory);
-    const std::string make =
-        "localedef -i de_DE -f UTF-8 " + (directory / "de_DE.UTF-8").string() + " >/dev/null 2>&1";
+    const std::string make = "localedef -i de_DE -f UTF-8 " + (directory / "de_DE.UTF-8").string() + " >/dev/null 2>&1";
     const bool made = std::system(make.c_str()) == 0;
     ::setenv("LOCPATH", directory.c_str(), 1);
     if (!made || !std::setlocale(LC_ALL, "de_DE.UTF-8")) {
