@@ -11,10 +11,7 @@ namespace {
 using namespace raw;
 using Settings = dp::ExcelDataProviderBase;  // for the exported settings of the process alone
 
-const Contract& kProvider() {
-    static const Contract contract = contractOf("Provider");
-    return contract;
-}
+const Contract kProvider = contractOf("Provider");
 
 // A cell record as its users lay it out in memory.
 struct RawCell {
@@ -46,7 +43,7 @@ class ProviderContract : public testing::Test {
 
     template <class Result, class... Arguments>
     Result op(std::string_view name, Arguments... arguments) {
-        return call<Result>(provider, slotOf(kProvider(), name), arguments...);
+        return call<Result>(provider, slotOf(kProvider, name), arguments...);
     }
 
     void file(unsigned row, unsigned column, RawCell cell) {
@@ -155,7 +152,7 @@ TEST_F(ProviderContract, FilesAreOpenedAndClosed) {
     alignas(std::string) char place[sizeof(std::string)];
     using PathOf = void (*)(void*, const void*);
     void* const* table = *static_cast<void* const* const*>(provider);
-    reinterpret_cast<PathOf>(table[slotOf(kProvider(), "GetTempDirectoryPath")])(place, provider);
+    reinterpret_cast<PathOf>(table[slotOf(kProvider, "GetTempDirectoryPath")])(place, provider);
     auto* path = std::launder(reinterpret_cast<std::string*>(place));
     EXPECT_EQ(*path, "");
     std::destroy_at(path);
@@ -275,7 +272,7 @@ TEST_F(ProviderContract, ColumnAndTextOptionsTakeEffect) {
         alignas(std::string) char place[sizeof(std::string)];
         using Convert = void (*)(void*, const void*, const RawCell*, bool);
         void* const* table = *static_cast<void* const* const*>(provider);
-        reinterpret_cast<Convert>(table[slotOf(kProvider(), operation)])(place, provider, &cell, false);
+        reinterpret_cast<Convert>(table[slotOf(kProvider, operation)])(place, provider, &cell, false);
         auto* result = std::launder(reinterpret_cast<std::string*>(place));
         std::string copy = *result;
         std::destroy_at(result);
