@@ -14,12 +14,40 @@
 
 namespace {
 
-// Plain decimal numbers, which nearly all are. The rest (white space, a plus, hexadecimal digits,
-// text behind the number, values out of range) has its own rules in atof.
+bool isDigit(char c) { return c >= '0' && c <= '9'; }
+
+// Numbers of few digits, which nearly all are: a whole number below 2^53 divided by a power of ten
+// up to 10^22 is rounded once, to the double that any other way of conversion finds.
+bool castShortDecimal(double& value, const char* text) {
+    constexpr std::size_t kDigits = 15;  // always below 2^53
+    constexpr double kPowers[kDigits + 1] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                             1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    const bool negative = *text == '-';
+    if (negative) ++text;
+    std::int64_t whole = 0;
+    std::size_t digits = 0;
+    std::size_t decimals = 0;
+    for (; isDigit(*text); ++text, ++digits) {
+        if (digits == kDigits) return false;
+        whole = whole * 10 + (*text - '0');
+    }
+    if (digits == 0) return false;
+    if (*text == '.')
+        for (++text; isDigit(*text); ++text, ++digits, ++decimals) {
+            if (digits == kDigits) return false;
+            whole = whole * 10 + (*text - '0');
+        }
+    if (*text != '\0') return false;
+    const double magnitude = static_cast<double>(whole) / kPowers[decimals];
+    value = negative ? -magnitude : magnitude;
+    return true;
+}
+
+// Other plain decimal numbers. The rest (white space, a plus, hexadecimal digits, text behind the
+// number, values out of range) has its own rules in atof.
 bool castPlainDecimal(double& value, const char* text) {
     const char first = *text == '-' ? text[1] : *text;
-    const bool startsNumber = (first >= '0' && first <= '9') || first == '.';
-    if (!startsNumber) return false;
+    if (!isDigit(first) && first != '.') return false;
     const char* end = text + std::strlen(text);
     const auto result = std::from_chars(text, end, value);
     return result.ec == std::errc() && result.ptr == end;
@@ -64,7 +92,8 @@ CmXmlCast& CmXmlCast::instance() {
 }
 
 void CmXmlCast::mCast(double& value, const char* text) const {
-    if (!castPlainDecimal(value, text)) value = castByLocale(text);
+    if (castShortDecimal(value, text) || castPlainDecimal(value, text)) return;
+    value = castByLocale(text);
 }
 
 bool CmXmlCast::mCast(int& value, const char* text) const {
