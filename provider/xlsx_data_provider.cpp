@@ -10,6 +10,7 @@
 #include "model/string.h"
 #include "provider/file_type.h"
 #include "provider/temporary_directory.h"
+#include "readers/file_copy.h"
 
 namespace dp {
 
@@ -33,11 +34,7 @@ PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     if (directory.empty()) return PackageStatus::DirectoryUnusable;
     _tempDirectory = std::move(directory);
     const fs::path copy = fs::path(_tempDirectory) / source.filename();
-    boost::system::error_code error;
-    fs::copy_file(source, copy, fs::copy_option::fail_if_exists, error);
-    // Readable for us whatever the umask and the source's own rights.
-    if (!error) fs::permissions(copy, fs::owner_read | fs::owner_write, error);
-    if (error) {
+    if (!copyFile(source.string(), copy.string())) {
         removeDirectoryAndContents(_tempDirectory);
         return PackageStatus::DirectoryUnusable;
     }

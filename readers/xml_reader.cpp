@@ -7,6 +7,7 @@
 #include <libxml/xmlreader.h>
 
 #include "readers/cm_xml_cast.h"
+#include "readers/file_copy.h"
 #include "readers/silence.h"
 
 namespace {
@@ -41,8 +42,7 @@ std::string copyToTemporary(const std::string& path) {
     boost::system::error_code error;
     const fs::path copy = fs::temp_directory_path() / fs::unique_path("%%%%-%%%%", error);
     if (error) return {};
-    fs::copy_file(path, copy, fs::copy_option::fail_if_exists, error);
-    return error ? std::string() : copy.string();
+    return dp::copyFile(path, copy.string()) ? copy.string() : std::string();
 }
 
 }  // namespace

@@ -175,6 +175,18 @@ TEST_F(Opening, WritesNothingOutside) {
     }
 }
 
+TEST_F(Opening, CopiesAcrossFileSystems) {
+    const fs::path other = fs::path("/dev/shm") / fs::unique_path("dpxlsx-%%%%-%%%%");
+    boost::system::error_code error;
+    if (!fs::create_directory(other, error)) GTEST_SKIP() << "no second file system to write to";
+    sound().write(file("book.xlsx"));
+    ::setenv("TMPDIR", other.c_str(), 1);
+    EXPECT_EQ(open(file("book.xlsx")), 0);
+    provider.CloseFile();
+    ::setenv("TMPDIR", temporary().c_str(), 1);
+    EXPECT_TRUE(fs::remove(other)) << "and nothing is left in it";
+}
+
 TEST_F(Opening, ChecksEveryEntry) {
     sound().add("docs/a.txt", std::string(5000, 'a')).write(file("book.xlsx"));
     std::string bytes;
