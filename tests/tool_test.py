@@ -305,6 +305,24 @@ class ToolTest(unittest.TestCase):
         column = json.loads(text)["worksheets"][0]["columns"][0]
         self.assertEqual(column["iso"], [wanted for _, wanted in cases])
 
+    def test_workbooks_of_other_programs_come_in(self):
+        books = sorted((SOURCE / "tests" / "data").glob("*.xlsx"))
+        self.assertGreaterEqual(len(books), 16)
+        for book in books:
+            with self.subTest(book.name):
+                expected = json.loads(book.with_suffix(".expected.json").read_text())["sheets"]
+                sheets = json.loads(self.run_tool(book, "--json"))["worksheets"]
+                self.assertEqual([sheet["title"] for sheet in sheets],
+                                 [sheet["name"] for sheet in expected])
+                for sheet, wanted in zip(sheets, expected):
+                    self.assertEqual([column["name"] for column in sheet["columns"]],
+                                     [column["name"] for column in wanted["columns"]])
+                    self.assertEqual([column["values"] for column in sheet["columns"]],
+                                     [column["values"] for column in wanted["columns"]])
+                tables = self.run_tool(book)
+                for sheet in expected:
+                    self.assertIn(sheet["name"], tables)
+
     def test_the_help_fits_a_screen_and_the_manual_has_every_option(self):
         text = self.run_tool("--help")
         self.assertLessEqual(text.count("\n"), 50)
