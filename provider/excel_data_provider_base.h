@@ -184,7 +184,8 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     // A number or date-time cell as its style shows it. Loading converts by the same rules without
     // these two calls.
     virtual std::string ConvertNumericCellToString(const ExternalDataRecordCell& cell) const;
-    // A new format for the cell's style, never null, owned by the caller.
+    // A new format for the cell's style, never null, owned by the caller. Loading asks once for all
+    // cells of one `formatIndex`.
     virtual IVariableFormat* CreateVextralNumericFormat(
         const ExternalDataRecordCell& cell) const = 0;
     // Whether the cell's style shows dates or times.

@@ -43,7 +43,7 @@ void ExcelDataProviderBase::AddWorksheet(const char* name) {
     makeRoomForOne(_worksheetNames);
     makeRoomForOne(_cells);
     makeRoomForOne(keys);
-    // Equal texts of all worksheets are kept once.
+    // Equal texts of all worksheets are kept once, until the last worksheet goes.
     const std::shared_ptr<TextPool> texts =
         _cells.empty() ? std::make_shared<TextPool>() : _cells.back().texts();
     _worksheetNames.push_back(std::move(title));
@@ -85,7 +85,7 @@ IColumn* ExcelDataProviderBase::GetColumn(int worksheet, int column) const {
 }
 
 unsigned ExcelDataProviderBase::GetWorksheetRowCount(unsigned key) const {
-    return cellsOf(key).rowCount();
+    return static_cast<unsigned>(cellsOf(key).rowCount());
 }
 
 IReadOnlyCollection<int>* ExcelDataProviderBase::GetWorksheetPrimeKeys() const {

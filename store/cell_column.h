@@ -45,7 +45,7 @@ static_assert(sizeof(PackedCell) == 16);
 
 // Reads as the ExternalDataRecordCell that was filed, all fields bit for bit, and touches no more
 // than the field that is asked for. Valid until its column changes.
-class CellView {
+class DPXLSX_API CellView {
   public:
     explicit CellView(const PackedCell& cell) : cell_(cell) {}
 

@@ -52,10 +52,10 @@ const WorksheetCells::value_type& WorksheetCells::nth(std::size_t position) cons
     return *inOrder()[position];
 }
 
-unsigned WorksheetCells::rowCount() const {
-    unsigned count = 0;
+std::uint64_t WorksheetCells::rowCount() const {
+    std::uint64_t count = 0;
     for (const auto& [number, cells] : columns_)
-        if (!cells.empty()) count = std::max(count, cells.rbegin()->first + 1);
+        if (!cells.empty()) count = std::max(count, std::uint64_t{cells.rbegin()->first} + 1);
     return count;
 }
 

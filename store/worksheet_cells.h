@@ -58,7 +58,7 @@ class DPXLSX_API WorksheetCells {
     // `position` is below size().
     const value_type& nth(std::size_t position) const;
     // The largest row of all columns plus one, 0 without cells.
-    unsigned rowCount() const;
+    std::uint64_t rowCount() const;
     // Puts cells that came out of order in their places.
     void settle() const;
 

@@ -7,7 +7,7 @@
 #include <gtest/gtest.h>
 
 // The rows of a table of cases in tests/cases: columns between bars, the first one the case's name.
-// Lines that begin with a hash are comments; \n, \r, \t, \0 and \\ stand for the characters.
+// Lines that begin with a hash are comments; \n, \r, \t, \0, \xNN and \\ stand for the characters.
 inline std::vector<std::vector<std::string>> caseTable(const std::string& name) {
     std::vector<std::vector<std::string>> rows;
     std::ifstream file(std::string(DPXLSX_TEST_CASES) + "/" + name);
@@ -21,6 +21,11 @@ inline std::vector<std::vector<std::string>> caseTable(const std::string& name) 
                 i += 2;
             } else if (line[i] == '\\' && i + 1 < line.size()) {
                 const char next = line[++i];
+                if (next == 'x') {
+                    cell += static_cast<char>(std::stoi(line.substr(i + 1, 2), nullptr, 16));
+                    i += 2;
+                    continue;
+                }
                 cell += next == 'n' ? '\n' : next == 'r' ? '\r' : next == 't' ? '\t' : next == '0' ? '\0' : next;
             } else {
                 cell += line[i];

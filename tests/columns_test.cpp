@@ -211,6 +211,27 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     EXPECT_FALSE(factsOf(provider, 1).found);
 }
 
+TEST_F(ColumnsOnDemand, KeepsTheRegistryThroughRemovals) {
+    for (const char* name : {"a", "b", "c"}) provider.AddWorksheet(name);
+    for (const int position : {-1, 3, 99}) {
+        provider.RemoveWorksheet(position);
+        provider.SetWorksheetIndex(position);
+        provider.file(0, 0, cellOf("1"));
+    }
+    for (int position = 0; position < 3; ++position) {
+        provider.SetWorksheetIndex(position);
+        provider.file(1, 0, cellOf(std::to_string(position)));
+    }
+    provider.GetWorksheetPrimeKeys();
+    EXPECT_EQ(brief(3), ": 2");
+    provider.RemoveWorksheet(1);
+    EXPECT_EQ(provider.GetColumnPrimeKeys(2)->Count() + provider.GetWorksheetRowCount(2), 0U) << "no such key";
+    EXPECT_EQ(provider.GetWorksheetPosition(3), 1U);
+    EXPECT_EQ(brief(2), ": 2");
+    provider.AddWorksheet("d");
+    EXPECT_EQ(provider.GetWorksheetPrimeKey(2), 4) << "never a key in use";
+}
+
 TEST_F(ColumnsOnDemand, ConvertsAPreviewAndAsksForAFormatOnceAStyle) {
     fileSheet("'n", [](HandFilledProvider& p) {
         for (unsigned row = 1; row <= 500; ++row)
