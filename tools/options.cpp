@@ -29,13 +29,14 @@ class OptionList {
         app_.add_flag(name, target, help);
     }
 
-    CLI::Option* once(const std::string& name, const char* value, const char* help, Take take) {
+    CLI::Option* once(const std::string& name, const char* value, const char* help,
+                      const Take& take) {
         const auto call = [name, take](const std::string& text) { take(name, text); };
         return app_.add_option_function<std::string>(name, call, help)->option_text(value);
     }
 
     // An option that may be given several times, with one value each time.
-    void repeated(const std::string& name, const char* value, const char* help, Take take) {
+    void repeated(const std::string& name, const char* value, const char* help, const Take& take) {
         const auto call = [name, take](const std::vector<std::string>& texts) {
             for (const std::string& text : texts) take(name, text);
         };
@@ -45,7 +46,7 @@ class OptionList {
     }
 
     void number(const char* name, const char* value, const char* help, unsigned most,
-                std::function<void(unsigned)> take) {
+                const std::function<void(unsigned)>& take) {
         once(name, value, help, [most, take](const std::string& option, const std::string& text) {
             take(wholeValue(option, text, 1, most));
         });

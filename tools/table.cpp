@@ -20,12 +20,14 @@ std::string withoutTrailingSpaces(const std::string& text) {
 Table::Table(std::vector<Heading> headings)
     : headings_(std::move(headings)), widths_(headings_.size(), 0) {
     std::vector<std::string> texts;
+    texts.reserve(headings_.size());
     for (const Heading& heading : headings_) texts.push_back(heading.text);
     addRow(texts);
 }
 
 void Table::addRow(const std::vector<std::string>& texts) {
     std::vector<std::string> cut;
+    cut.reserve(texts.size());
     for (const std::string& text : texts) cut.push_back(cutToWidth(printable(text), kWidestText));
     add(std::move(cut));
 }

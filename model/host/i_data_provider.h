@@ -112,8 +112,9 @@ class DPXLSX_API IDataProvider : public IResource {
     virtual void SetMissingText(const char* from, const char* to) = 0;
     // Numbers equal to `from` become `to`.
     virtual void SetMissingNumeric(double from, double to) = 0;
-    // In numeric columns, cells with the text `from` become `to`, in place of what SetMissingNumeric
-    // asks for; an empty text switches this off. `to` replaces that of SetMissingNumeric.
+    // In numeric columns, cells with the text `from` become `to`, in place of what
+    // SetMissingNumeric asks for; an empty text switches this off. `to` replaces that of
+    // SetMissingNumeric.
     virtual void SetAlphaMissingNumeric(const char* from, double to) = 0;
 
     // --- 44-46: accepted and ignored ---
@@ -148,10 +149,11 @@ class DPXLSX_API IDataProvider : public IResource {
 
     // --- 62-67: the provider as a whole ---
     // Forgets worksheets, cells, options and the error, and puts the provider's own settings back.
-    // Kept are the texts of SetMissingText and SetAlphaMissingNumeric (the latter switched off), the
-    // helper, and what all providers share.
+    // Kept are the texts of SetMissingText and SetAlphaMissingNumeric (the latter switched off),
+    // the helper, and what all providers share.
     virtual void ClearWorksheets() = 0;
-    // Characters, of which the low 16 bits count: 0xFFFFFFFF, the default, is 65,535; 0 is no limit.
+    // Characters, of which the low 16 bits count: 0xFFFFFFFF, the default, is 65,535; 0 is no
+    // limit.
     virtual void SetMaxVariableNameLength(unsigned length) = 0;
     // The provider takes the helper over and deletes it.
     virtual void SetDateTimeVariableFormatHelper(IDateTimeVariableFormat* helper) = 0;

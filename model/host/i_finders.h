@@ -46,11 +46,12 @@ class DPXLSX_API IVariableFinder {
     virtual IReadOnlyCollection<int>* GetMatrixPrimeKeys(int worksheetKey) const = 0;
     virtual IReadOnlyCollection<int>* GetModelPrimeKeys(IModel::ModelSubtype subtype,
                                                         int worksheetKey) const = 0;
-    // Loads a column in the kind of its first data cell, or in that of its column option. `*column` is null when the key is unknown
-    // or the column is excluded and `ignoreExclusion` is false.
+    // Loads a column in the kind of its first data cell, or in that of its column option. `*column`
+    // is null when the key is unknown or the column is excluded and `ignoreExclusion` is false.
     virtual bool FindColumn(int key, IColumn** column, bool ignoreExclusion) const = 0;
-    // Loads a column in the given kind unless a column option asks for another. `*formatType` becomes
-    // the kind of its first data cell, or that of the option; it stays as it was for an unknown key.
+    // Loads a column in the given kind unless a column option asks for another. `*formatType`
+    // becomes the kind of its first data cell, or that of the option; it stays as it was for an
+    // unknown key.
     virtual bool FindColumn(int key, IColumn** column, IVariable::StorageType storage,
                             IVariableFormat::FormatType* formatType,
                             bool ignoreExclusion) const = 0;
