@@ -254,38 +254,24 @@ void texts() {
     printPair("same texts, scattered repeats", filled(104'729), kCells, {0, 0.5, 0, 0});
 }
 
-// A shared string of 1 MB in 100,000 cells: with its handle, and record by record.
+// A shared string of 1 MB in 100,000 cells.
 void bigText() {
     constexpr unsigned kCells = 100'000;
-    constexpr std::size_t kLength = 1'000'000;
-    const auto file = [](const auto& add) {
+    const Figures figures = inOwnProcess([] {
         ExternalDataRecord record(0, 0, 0, 0);
         record.cell.type = dp::CELL_TEXT;
-        record.cell.textValue.assign(kLength, 'x');
-        Figures figures;
+        record.cell.textValue.assign(1'000'000, 'x');
+        Figures measured;
         const double before = residentBytes();
         WorksheetCells cells;
-        const dp::PooledText text = cells.texts()->intern(record.cell.textValue);
-        figures.file = secondsOf([&] {
-            for (; record.row < kCells; ++record.row) add(cells, record, text);
+        measured.file = secondsOf([&] {
+            for (; record.row < kCells; ++record.row) cells.add(record);
         });
-        figures.bytes = residentBytes() - before;
-        return figures;
-    };
-    const Figures handles = inOwnProcess([&] {
-        return file([](WorksheetCells& cells, const ExternalDataRecord& record, auto text) {
-            cells.addText(record.row, record.column, text, -1);
-        });
+        measured.bytes = residentBytes() - before;
+        return measured;
     });
-    const Figures records = inOwnProcess([&] {
-        return file([](WorksheetCells& cells, const ExternalDataRecord& record, auto) {
-            cells.add(record);
-        });
-    });
-    printLimit("1 MB text in 100,000 cells by handle: MB", handles.bytes / 1e6, 8.0);
-    printLimit("1 MB text in 100,000 cells by record: MB", records.bytes / 1e6, 8.0);
-    std::printf("%-44s %10.2f\n", "  by handle: ns a cell", handles.file / kCells * 1e9);
-    std::printf("%-44s %10.2f\n", "  by record: ns a cell", records.file / kCells * 1e9);
+    printLimit("1 MB text in 100,000 cells: MB", figures.bytes / 1e6, 8.0);
+    std::printf("%-44s %10.2f\n", "  ns a cell", figures.file / kCells * 1e9);
 }
 
 }  // namespace

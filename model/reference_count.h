@@ -5,8 +5,7 @@
 namespace dp {
 
 // Lowers `count`; true when the object is to be deleted now. A Release without its AddRef is a
-// mistake of the host: asserted in debug builds, ignored in release builds where the
-// object was never taken.
+// mistake of the host: asserted in debug builds, ignored in release builds.
 template <class Count>
 bool releaseReference(Count& count) {
     assert(count != 0 && "Release without AddRef");

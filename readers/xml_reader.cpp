@@ -47,6 +47,12 @@ std::string copyToTemporary(const std::string& path) {
 
 }  // namespace
 
+CmXmlException::CmXmlException(int code) : code_(code) {}
+
+int CmXmlException::code() const { return code_; }
+
+XmlReader::XmlReader() = default;
+
 XmlReader::~XmlReader() {
     if (textReader) xmlFreeTextReader(textReader);
     textReader = nullptr;

@@ -11,9 +11,9 @@ struct _xmlTextReader;  // libxml2's own name; NOLINT(bugprone-reserved-identifi
 // no text; what failed is in the package, and the host shows its own message.
 class DPXLSX_API CmXmlException {
   public:
-    explicit CmXmlException(int code) : code_(code) {}
+    explicit CmXmlException(int code);
 
-    int code() const { return code_; }
+    int code() const;
 
   private:
     int code_;
@@ -26,7 +26,7 @@ inline constexpr int kXmlError = 13;
 // opened twice. The network, external entities and entity substitution stay off.
 class DPXLSX_API XmlReader {
   public:
-    XmlReader() = default;
+    XmlReader();
     XmlReader(const XmlReader&) = delete;
     XmlReader& operator=(const XmlReader&) = delete;
     ~XmlReader();

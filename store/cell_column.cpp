@@ -117,11 +117,6 @@ void CellColumn::assign(unsigned row, const ExternalDataRecordCell& cell) {
     put(packed(row, cell.type, cell.formatIndex, value));
 }
 
-void CellColumn::assignText(unsigned row, PooledText text, std::int32_t formatIndex) {
-    if (!packsFormat(formatIndex)) return putRare(row, {CELL_TEXT, 0, 0, 0.0, text, formatIndex});
-    put(packed(row, CELL_TEXT, formatIndex, std::bit_cast<std::uint64_t>(text)));
-}
-
 void CellColumn::clear() noexcept {
     cells_.truncate(0);
     sorted_ = 0;

@@ -130,11 +130,9 @@ class DPXLSX_API CellColumn {
     CellColumn(CellColumn&& other) noexcept;
     ~CellColumn();
 
-    // Both set the cell of `row`, replacing the one that is there. They throw std::bad_alloc and
-    // the column's cells are then as before.
+    // Sets the cell of `row`, replacing the one that is there. Throws std::bad_alloc and the
+    // column's cells are then as before.
     void assign(unsigned row, const ExternalDataRecordCell& cell);
-    // Files a cell of type CELL_TEXT without a look at the text, which is of this column's pool.
-    void assignText(unsigned row, PooledText text, std::int32_t formatIndex);
     void clear() noexcept;
 
     // The pool that keeps this column's texts, made if there is none yet.

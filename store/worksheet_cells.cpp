@@ -27,11 +27,6 @@ void WorksheetCells::add(const ExternalDataRecord& record) {
     file(record.column, [&](CellColumn& cells) { cells.assign(record.row, record.cell); });
 }
 
-void WorksheetCells::addText(unsigned row, unsigned column, PooledText text,
-                             std::int32_t formatIndex) {
-    file(column, [&](CellColumn& cells) { cells.assignText(row, text, formatIndex); });
-}
-
 CellColumn& WorksheetCells::operator[](unsigned column) {
     file(column, [](CellColumn&) {});
     return recent_->second;

@@ -34,8 +34,6 @@ class DPXLSX_API WorksheetCells {
     // and the cells are then as before. Consecutive calls for a column, the next one to the right
     // or the leftmost one need no search.
     void add(const ExternalDataRecord& record);
-    // Files a cell of type CELL_TEXT without a look at the text, which is of this worksheet's pool.
-    void addText(unsigned row, unsigned column, PooledText text, std::int32_t formatIndex);
     // The cells of `column`, an empty CellColumn if there were none.
     CellColumn& operator[](unsigned column);
     void clear() noexcept;

@@ -186,7 +186,7 @@ TEST(CellStore, KeepsEqualTextsOnce) {
     const std::string text(26, 'x');
     first.add(recordOf(0, 0, textCell(text)));
     first.add(recordOf(9, 7, cellOf(CELL_TEXT, 0, 0, 1.0, text, 2)));
-    second.addText(3, 1, pool->intern(text), 0x7FFFFFFF);
+    second.add(recordOf(3, 1, cellOf(CELL_TEXT, 0, 0, 0.0, text, 0x7FFFFFFF)));
     const auto address = [](const WorksheetCells& cells, unsigned column) {
         return cells.find(column)->second.begin()->second.textValue().data();
     };

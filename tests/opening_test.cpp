@@ -104,13 +104,15 @@ TEST_F(Opening, AnswersResultCodes) {
 }
 
 TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
-    const mode_t before = ::umask(0777);
-    const long result = openPackage(sound().add("docs/", "").add("docs/deep/er/a.txt", "a"));
-    ::umask(before);
-    ASSERT_EQ(result, 0);
+    for (const mode_t mask : {0, 0777}) {
+        const mode_t before = ::umask(mask);
+        const long result = openPackage(sound().add("docs/", "").add("docs/deep/er/a.txt", "a"));
+        ::umask(before);
+        ASSERT_EQ(result, 0);
+        EXPECT_EQ(fs::status(provider.GetTempDirectoryPath()).permissions(), fs::owner_all);
+    }
     const fs::path directory = provider.GetTempDirectoryPath();
     EXPECT_EQ(directory.parent_path(), temporary());
-    EXPECT_EQ(fs::status(directory).permissions(), fs::owner_all);
     EXPECT_EQ(unpacked(),
               ". book.xlsx docs docs/deep docs/deep/er docs/deep/er/a.txt xl xl/_rels "
               "xl/_rels/workbook.xml.rels xl/styles.xml xl/workbook.xml xl/worksheets "
@@ -118,7 +120,12 @@ TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
     EXPECT_EQ(provider.CloseFile(), 0);
     EXPECT_FALSE(fs::exists(directory));
     EXPECT_EQ(provider.GetTempDirectoryPath(), "");
-    EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 1UL) << "the cells stay";
+    EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 2UL) << "the cells stay";
+    dp::IColumn* column = nullptr;
+    ASSERT_TRUE(provider.GetVariableFinder()->FindColumn(1, &column, false));
+    column->AddRef();
+    EXPECT_TRUE(column->GetFormat()->GetAuto()) << "and load without the file";
+    column->Release();
 }
 
 TEST_F(Opening, ResolvesRelativeNames) {
@@ -220,11 +227,6 @@ TEST_F(Opening, ReportsAMissingTemporaryDirectory) {
     sound().write(file("book.xlsx"));
     EXPECT_THROW(open(file("book.xlsx")), fs::filesystem_error);
     ::setenv("TMPDIR", temporary().c_str(), 1);
-    if (::geteuid() != 0) {
-        fs::permissions(temporary(), fs::owner_read | fs::owner_exe);
-        EXPECT_EQ(open(file("book.xlsx")), -18);
-        fs::permissions(temporary(), fs::owner_all);
-    }
 }
 
 TEST_F(Opening, PrintsNothingWhateverTheEncoding) {

@@ -9,6 +9,7 @@ import os
 import pathlib
 import pty
 import re
+import resource
 import signal
 import shutil
 import struct
@@ -24,9 +25,9 @@ SOURCE = pathlib.Path(sys.argv.pop(1))
 SAMPLE = SOURCE / "samples" / "sample.xlsx"
 
 
-def repacked(target, change):
+def repacked(target, change, packing=zipfile.ZIP_STORED):
     """Writes the sample to `target`, its parts passed through change(name, bytes) first."""
-    with zipfile.ZipFile(SAMPLE) as source, zipfile.ZipFile(target, "w") as made:
+    with zipfile.ZipFile(SAMPLE) as source, zipfile.ZipFile(target, "w", packing) as made:
         for name in source.namelist():
             content = change(name, source.read(name))
             if content is not None:
@@ -285,7 +286,8 @@ class ToolTest(unittest.TestCase):
         return repacked(self.folder / "made.xlsx", lambda name, content: re.sub(
             b"<sheetData>.*</sheetData>", b"<sheetData>" + (
                 rows if name.endswith("sheet1.xml") else b"") + b"</sheetData>", content,
-            flags=re.S) if "worksheets/sheet" in name else content)
+            flags=re.S) if "worksheets/sheet" in name else content,
+            zipfile.ZIP_DEFLATED)
 
     def many_rows(self):
         return self.book_of(f"><v>{r}.5</v>" for r in range(1, 60001))
@@ -304,6 +306,17 @@ class ToolTest(unittest.TestCase):
                              "A=datetime")
         column = json.loads(text)["worksheets"][0]["columns"][0]
         self.assertEqual(column["iso"], [wanted for _, wanted in cases])
+
+    def test_a_full_disk_fails_and_leaves_nothing(self):
+        def limit(size):
+            signal.signal(signal.SIGXFSZ, signal.SIG_IGN)
+            resource.setrlimit(resource.RLIMIT_FSIZE, (size, size))
+        book = self.many_rows()
+        for size, wanted in ((book.stat().st_size // 2, 18), (book.stat().st_size, 1)):
+            done = subprocess.run([TOOL, book], capture_output=True, env=self.environment(),
+                                  preexec_fn=lambda: limit(size), check=False)
+            self.assertEqual(done.returncode, wanted, done.stderr)
+            self.assertEqual(list(self.temporary.iterdir()), [])
 
     def test_workbooks_of_other_programs_come_in(self):
         books = sorted((SOURCE / "tests" / "data").glob("*.xlsx"))
