@@ -184,12 +184,8 @@ INumericColumn* ExcelDataProviderBase::LoadNumericColumn(unsigned worksheetKey,
                                                          unsigned columnIndex, unsigned position,
                                                          const std::string& name, int key,
                                                          FormatType* formatType) const {
-    const ConversionSettings conversion = conversionSettings();
-    const RowLayout layout = rowLayout(worksheetKey);
     const ProviderFormats formats(*this);
-    const LoadSettings settings{conversion,    layout,  GetLoadColumnRowCount(worksheetKey, cells),
-                                _previewing,   formats, _missingTextFrom,
-                                _missingTextTo};
+    const LoadSettings settings = loadSettings(worksheetKey, cells, formats);
     return loadNumericColumn(cells, {name, key, position}, settings,
                              requestedType(columnOptionsOf(worksheetKey), columnIndex),
                              formatType ? *formatType : FormatType::Numeric)
@@ -199,13 +195,20 @@ INumericColumn* ExcelDataProviderBase::LoadNumericColumn(unsigned worksheetKey,
 ITextColumn* ExcelDataProviderBase::LoadTextColumn(unsigned worksheetKey, const CellColumn& cells,
                                                    unsigned /*columnIndex*/, unsigned position,
                                                    const std::string& name, int key) const {
-    const ConversionSettings conversion = conversionSettings();
-    const RowLayout layout = rowLayout(worksheetKey);
     const ProviderFormats formats(*this);
-    const LoadSettings settings{conversion,    layout,  GetLoadColumnRowCount(worksheetKey, cells),
-                                _previewing,   formats, _missingTextFrom,
-                                _missingTextTo};
+    const LoadSettings settings = loadSettings(worksheetKey, cells, formats);
     return loadTextColumn(cells, {name, key, position}, settings).release();
+}
+
+LoadSettings ExcelDataProviderBase::loadSettings(unsigned worksheetKey, const CellColumn& cells,
+                                                 const CellFormats& formats) const {
+    return {.conversion = conversionSettings(),
+            .layout = rowLayout(worksheetKey),
+            .rowCount = GetLoadColumnRowCount(worksheetKey, cells),
+            .previewing = _previewing,
+            .formats = formats,
+            .missingTextFrom = _missingTextFrom,
+            .missingTextTo = _missingTextTo};
 }
 
 ConversionSettings ExcelDataProviderBase::conversionSettings() const {

@@ -304,6 +304,8 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     const WorksheetCells& cellsOf(unsigned key) const;
     RowLayout rowLayout(unsigned key) const;
     ConversionSettings conversionSettings() const;
+    LoadSettings loadSettings(unsigned worksheetKey, const CellColumn& cells,
+                              const CellFormats& formats) const;
     std::string variableNameInSheet(unsigned worksheetKey, const CellColumn& cells) const;
     IVariableFormat::FormatType firstDataType(unsigned worksheetKey, const CellColumn& cells,
                                               ColumnType requested) const;

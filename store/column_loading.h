@@ -20,10 +20,10 @@ struct ColumnIdentity {
     std::uint32_t position;  // 0-based
 };
 
-// How a column is to be read. Everything is borrowed for the duration of a load.
+// How a column is to be read. Texts and formats are borrowed for the duration of a load.
 struct LoadSettings {
-    const ConversionSettings& conversion;
-    const RowLayout& layout;
+    ConversionSettings conversion;
+    RowLayout layout;
     std::uint32_t rowCount;  // rows that the column gets
     bool previewing;
     const CellFormats& formats;
