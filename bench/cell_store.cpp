@@ -251,7 +251,7 @@ void texts() {
         });
     };
     printPair("texts of 26 bytes, half distinct", filled(7919), kCells, {0.6, 0.5, 0, 0});
-    printPair("same texts, scattered repeats", filled(104'729), kCells, {0, 0.5, 0, 0});
+    printPair("same texts, scattered repeats", filled(104'729), kCells, {0.6, 0.5, 0, 0});
 }
 
 // A shared string of 1 MB in 100,000 cells.

@@ -103,21 +103,21 @@ CellColumn::CellColumn(CellColumn&& other) noexcept
       sorted_(std::exchange(other.sorted_, 0)),
       rare_(std::move(other.rare_)) {}
 
-CellColumn::~CellColumn() = default;
+CellColumn::~CellColumn() { settleTexts(); }
 
 void CellColumn::assign(unsigned row, const ExternalDataRecordCell& cell) {
-    const PooledText text = cell.textValue.empty() ? PooledText() : texts()->intern(cell.textValue);
-    if (!packs(cell))
-        return putRare(
-            row, {cell.type, cell.intValue, cell.boolValue, cell.numValue, text, cell.formatIndex});
+    if (!packs(cell)) return assignRare(row, cell);
+    const bool hasText = !cell.textValue.empty();
+    if (hasText) texts()->begin(cell.textValue);
     std::uint64_t value = std::bit_cast<std::uint64_t>(cell.numValue);
-    if (cell.type == CELL_TEXT) value = std::bit_cast<std::uint64_t>(text);
     if (cell.type == CELL_INTEGER) value = static_cast<std::uint32_t>(cell.intValue);
     if (cell.type == CELL_BOOLEAN) value = static_cast<std::uint32_t>(cell.boolValue);
-    put(packed(row, cell.type, cell.formatIndex, value));
+    PackedCell& filed = put(packed(row, cell.type, cell.formatIndex, value));
+    if (hasText) texts_->deliverTo(filed.value);
 }
 
 void CellColumn::clear() noexcept {
+    settleTexts();
     cells_.truncate(0);
     sorted_ = 0;
     rare_.reset();
@@ -128,21 +128,24 @@ const std::shared_ptr<TextPool>& CellColumn::texts() {
     return texts_;
 }
 
-void CellColumn::put(const PackedCell& cell) {
+PackedCell& CellColumn::put(const PackedCell& cell) {
     if (!empty() && cells_.back().row == cell.row) {
+        settleTexts();
         release(cells_.back());
-        cells_.back() = cell;
-        return;
+        return cells_.back() = cell;
     }
     if (cells_.size() - sorted_ >= std::max(kLateCells, sorted_)) settle();
     const bool inOrder = sorted_ == cells_.size() && (empty() || cells_.back().row < cell.row);
     cells_.push(cell);
     if (inOrder) ++sorted_;
+    return cells_.back();
 }
 
-void CellColumn::putRare(unsigned row, const RareCell& cell) {
+void CellColumn::assignRare(unsigned row, const ExternalDataRecordCell& cell) {
+    const PooledText text = cell.textValue.empty() ? PooledText() : texts()->intern(cell.textValue);
     if (!rare_) rare_ = std::make_unique<RareCells>();
-    auto owned = std::make_unique<const RareCell>(cell);
+    auto owned = std::make_unique<const RareCell>(
+        RareCell{cell.type, cell.intValue, cell.boolValue, cell.numValue, text, cell.formatIndex});
     const RareCell* address = owned.get();
     rare_->emplace(address, std::move(owned));
     const PackedCell entry =

@@ -152,16 +152,20 @@ class DPXLSX_API CellColumn {
     const_iterator upper_bound(unsigned row) const;
     std::size_t count(unsigned row) const;
 
-    // Puts cells that came out of order in their places.
+    // Puts cells that came out of order in their places, and every text in its cell.
     void settle() const {
+        settleTexts();
         if (sorted_ != cells_.size()) mergeLateCells();
     }
 
   private:
     using RareCells = std::unordered_map<const RareCell*, std::unique_ptr<const RareCell>>;
 
-    void put(const PackedCell& cell);
-    void putRare(unsigned row, const RareCell& cell);
+    void settleTexts() const noexcept {
+        if (texts_) texts_->settle();
+    }
+    PackedCell& put(const PackedCell& cell);
+    void assignRare(unsigned row, const ExternalDataRecordCell& cell);
     void release(const PackedCell& cell) const noexcept;
     std::vector<PackedCell> lateCells() const;
     void mergeLateCells() const;

@@ -1,11 +1,12 @@
 #pragma once
 
-#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <string_view>
-#include <vector>
+#include <unordered_map>
+
+#include "store/short_texts.h"
 
 namespace dp {
 
@@ -28,7 +29,7 @@ class PooledText {
     friend class TextPool;
 
     // Stands for the length of a text that follows in full behind this byte.
-    static constexpr unsigned char kLong = 255;
+    static constexpr unsigned char kLong = ShortTexts::kLongest + 1;
 
     explicit PooledText(const char* stored) : stored_(stored) {}
     std::string_view longView() const;
@@ -44,47 +45,31 @@ class TextPool {
     TextPool(const TextPool&) = delete;
     TextPool& operator=(const TextPool&) = delete;
 
-    // The pool's copy of `text`, made when it is new. Throws std::bad_alloc and is then unchanged.
+    // The pool's copy of `text`, made when it is new. Throws std::bad_alloc and keeps no text then.
     // Costs one pass over `text`, also when it is known: who files one long text many times keeps
     // the handle.
     PooledText intern(std::string_view text);
 
+    // The same in two steps that many texts can be in at a time: after begin, which throws as
+    // intern does, deliverTo names where the bits of the handle go. They are there after settle().
+    void begin(std::string_view text);
+    void deliverTo(std::uint64_t& bits) noexcept;
+    // Delivers what is still to be delivered.
+    void settle() noexcept {
+        if (short_.isWaiting()) short_.settle();
+    }
+
     // Number of distinct texts, the empty one not counted.
-    std::size_t size() const { return size_; }
+    std::size_t size();
 
   private:
-    struct Slot {
-        std::uint64_t hash = 0;
-        PooledText text;
-    };
-    // A hash table with open addressing. The tags are few enough for the processor's caches, and
-    // they alone tell that a text is new.
-    struct Table {
-        explicit Table(std::size_t count = 0) : tags(count), slots(count) {}
+    PooledText internLong(std::string_view text);
 
-        void add(const Slot& slot);
-
-        std::vector<std::uint8_t> tags;  // 0 for a free slot, else bits of the hash
-        std::vector<Slot> slots;         // none or a power of two
-    };
-
-    PooledText following() const;
-    PooledText find(std::string_view text, std::uint64_t hash) const;
-    PooledText add(std::string_view text, std::uint64_t hash);
-    void makeRoom();
-    void makeSecret();
-    char* allocate(std::size_t size);
-    std::uint64_t hashOf(std::string_view text) const;
-
-    Table table_;
-    std::size_t size_ = 0;
-    PooledText recent_;
-    std::array<std::uint64_t, 3> secret_{};
-    // Texts stand one behind the other, and a 0 behind the last one in each block.
-    std::vector<std::unique_ptr<char[]>> blocks_;
-    char* free_ = nullptr;  // the unused end of the newest shared block
-    std::size_t freeSize_ = 0;
-    std::size_t blockSize_ = 0;
+    ShortTexts short_;
+    // The long ones, and those for which the other table has no room.
+    std::unordered_map<std::string_view, std::unique_ptr<char[]>, TextHash> long_;
+    PooledText recent_;     // the last text
+    bool isRecent_ = true;  // recent_ is what was begun last; else the short texts know it
 };
 
 }  // namespace dp

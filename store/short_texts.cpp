@@ -1,0 +1,198 @@
+#include "store/short_texts.h"
+
+#include <algorithm>
+#include <chrono>
+#include <cstring>
+#include <sys/random.h>
+#include <utility>
+
+namespace dp {
+
+namespace {
+
+constexpr std::size_t kFirstSlots = 16;
+constexpr std::size_t kFirstPage = 512;  // bytes; few texts take little room
+__extension__ using Product = unsigned __int128;
+
+// All 128 bits of the product, folded: every bit of both factors reaches every bit of the result.
+std::uint64_t mix(std::uint64_t left, std::uint64_t right) {
+    const Product product = static_cast<Product>(left) * right;
+    return static_cast<std::uint64_t>(product) ^ static_cast<std::uint64_t>(product >> 64);
+}
+
+template <class Word = std::uint64_t>
+std::uint64_t load(const char* bytes) {
+    Word word;
+    std::memcpy(&word, bytes, sizeof word);
+    return word;
+}
+
+// Never that of a free slot, and of other bits than those that choose the first slot.
+std::uint8_t tagOf(std::uint64_t hash) { return static_cast<std::uint8_t>(hash >> 56 | 0x80); }
+
+// Bytes that a text takes, its length included.
+constexpr std::size_t sizeOf(std::size_t length, std::size_t unit) {
+    return (1 + length + unit - 1) / unit * unit;
+}
+
+std::string_view textAt(const char* stored) {
+    return {stored + 1, static_cast<unsigned char>(*stored)};
+}
+
+}  // namespace
+
+TextHash::TextHash() : secret_{} {
+    if (::getrandom(secret_.data(), sizeof secret_, GRND_NONBLOCK) == sizeof secret_) return;
+    const auto now = std::chrono::steady_clock::now().time_since_epoch().count();
+    secret_ = {static_cast<std::uint64_t>(now), reinterpret_cast<std::uintptr_t>(this),
+               reinterpret_cast<std::uintptr_t>(&now)};
+}
+
+std::uint64_t TextHash::operator()(std::string_view text) const {
+    const std::size_t length = text.size();
+    const char* bytes = text.data();
+    std::uint64_t hash = secret_[0];
+    std::uint64_t first = 0;
+    std::uint64_t last = 0;
+    if (length >= 16) {
+        for (const char* end = bytes + length - 16; bytes < end; bytes += 16)
+            hash = mix(load(bytes) ^ secret_[1], load(bytes + 8) ^ hash);
+        bytes = text.data() + length - 16;  // the last 16 may overlap those before
+        first = load(bytes);
+        last = load(bytes + 8);
+    } else if (length >= 8) {
+        first = load(bytes);
+        last = load(bytes + length - 8);
+    } else if (length >= 4) {
+        first = load<std::uint32_t>(bytes);
+        last = load<std::uint32_t>(bytes + length - 4);
+    } else if (length > 0) {
+        first = load<std::uint8_t>(bytes) | load<std::uint8_t>(bytes + length / 2) << 8;
+        last = load<std::uint8_t>(bytes + length - 1);
+    }
+    hash = mix(first ^ secret_[1], last ^ hash);
+    return mix(hash ^ secret_[2], secret_[1] ^ length);
+}
+
+void ShortTexts::Table::add(std::uint64_t hash, Id id) {
+    std::size_t index = hash & mask();
+    while (tags[index] != 0) index = (index + 1) & mask();
+    tags[index] = tagOf(hash);
+    ids[index] = id;
+}
+
+bool ShortTexts::begin(std::string_view text) {
+    if (waitingCount_ == kMostWaiting) settle();
+    growTable();
+    const std::size_t size = sizeOf(text.size(), kUnit);
+    if (!makeRoom(size)) return false;
+    Waiting& waiting = waiting_[waitingCount_];
+    waiting = {hash_(text), nullptr, text.size()};
+    __builtin_prefetch(&table_.tags[waiting.hash & table_.mask()]);
+    __builtin_prefetch(&table_.ids[waiting.hash & table_.mask()]);
+    char* place = &pages_.back().bytes[pages_.back().used + waitingSize_];
+    *place = static_cast<char>(text.size());
+    std::memcpy(place + 1, text.data(), text.size());
+    waitingSize_ += size;
+    ++waitingCount_;
+    return true;
+}
+
+void ShortTexts::deliverTo(std::uint64_t& place) noexcept {
+    if (isWaiting())
+        waiting_[waitingCount_ - 1].place = &place;
+    else
+        place = reinterpret_cast<std::uintptr_t>(recent_);
+}
+
+void ShortTexts::settle() noexcept {
+    for (std::size_t i = 0; i < waitingCount_; ++i) fetchCandidate(waiting_[i]);
+    if (!isWaiting()) return;
+    const char* text = &pages_.back().bytes[pages_.back().used];
+    for (std::size_t i = 0; i < waitingCount_; ++i) {
+        recent_ = settleOne(waiting_[i], text);
+        if (waiting_[i].place) *waiting_[i].place = reinterpret_cast<std::uintptr_t>(recent_);
+        text += sizeOf(waiting_[i].length, kUnit);
+    }
+    waitingSize_ = 0;
+    waitingCount_ = 0;
+}
+
+// Asks for the first text that may be the wanted one.
+void ShortTexts::fetchCandidate(const Waiting& waiting) const {
+    const std::size_t mask = table_.mask();
+    std::size_t index = waiting.hash & mask;
+    while (table_.tags[index] != 0 && table_.tags[index] != tagOf(waiting.hash))
+        index = (index + 1) & mask;
+    if (table_.tags[index] == 0) return;
+    const char* stored = at(table_.ids[index]);
+    __builtin_prefetch(stored);
+    __builtin_prefetch(stored + waiting.length);  // it may reach into another line
+}
+
+// The stored text that equals the one at `text`, which is behind the used bytes; when it is new it
+// moves up to them.
+const char* ShortTexts::settleOne(const Waiting& waiting, const char* text) {
+    if (const char* found = find(textAt(text), waiting.hash)) return found;
+    Page& page = pages_.back();
+    char* place = &page.bytes[page.used];
+    const std::size_t size = sizeOf(waiting.length, kUnit);
+    if (place != text) std::memmove(place, text, size);
+    const Id number = static_cast<Id>(pages_.size() - 1) << kUnitBits;
+    table_.add(waiting.hash, number | static_cast<Id>(page.used / kUnit));
+    page.used += size;
+    ++size_;
+    return place;
+}
+
+const char* ShortTexts::find(std::string_view text, std::uint64_t hash) const {
+    const std::size_t mask = table_.mask();
+    for (std::size_t index = hash & mask; table_.tags[index] != 0; index = (index + 1) & mask) {
+        if (table_.tags[index] != tagOf(hash)) continue;
+        const char* stored = at(table_.ids[index]);
+        if (textAt(stored) == text) return stored;
+    }
+    return nullptr;
+}
+
+// Room for `size` bytes behind the texts that wait. False when all pages are full.
+bool ShortTexts::makeRoom(std::size_t size) {
+    const auto fits = [&] {
+        return !pages_.empty() && pages_.back().used + waitingSize_ + size <= pageSize_;
+    };
+    if (fits()) return true;
+    settle();
+    if (fits()) return true;
+    if (pages_.size() == kMostPages) return false;
+    const std::size_t pageSize = std::clamp(pageSize_ * 2, kFirstPage, kPage);
+    pages_.push_back({std::make_unique_for_overwrite<char[]>(pageSize), 0});
+    pageSize_ = pageSize;
+    return true;
+}
+
+// Keeps a quarter of the slots free, the texts that wait included.
+void ShortTexts::growTable() {
+    const std::size_t count = table_.tags.size();
+    if (size_ + waitingCount_ < count / 4 * 3) return;
+    if (isWaiting()) {
+        settle();
+        return growTable();
+    }
+    Table larger(std::max(kFirstSlots, count * 2));
+    rehash(larger);
+    table_ = std::move(larger);
+}
+
+// In the order of the texts in memory, which comes in faster than that of the slots.
+void ShortTexts::rehash(Table& table) const {
+    for (std::size_t number = 0; number < pages_.size(); ++number) {
+        const Page& page = pages_[number];
+        for (std::size_t place = 0; place < page.used;) {
+            const std::string_view text = textAt(&page.bytes[place]);
+            table.add(hash_(text), static_cast<Id>(number << kUnitBits | place / kUnit));
+            place += sizeOf(text.size(), kUnit);
+        }
+    }
+}
+
+}  // namespace dp
