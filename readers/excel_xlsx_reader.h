@@ -5,6 +5,7 @@
 
 #include "readers/excel_xml_reader.h"
 #include "readers/relationships.h"
+#include "readers/shared_string_table.h"
 
 namespace dp {
 
@@ -49,7 +50,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     std::string xlDir;
     std::vector<std::string> relationshipIds;
     std::vector<std::string> relationshipTargets;
-    std::vector<std::string> sharedStrings;  // raw; escapes are decoded when a cell uses them
+    SharedStringTable sharedStrings;  // decoded; empty for blank ones, which no cell delivers
     std::vector<std::string> cellXfNumFmtIds;
 
     std::string packageDir;

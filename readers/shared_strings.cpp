@@ -73,7 +73,9 @@ void ExcelXLSXReader::mReadSharedStrings() {
         if (isText(reader)) {
             if (const char* value = reader.nodeValue()) text += value;
         } else if (endsEntry(reader)) {
-            sharedStrings.push_back(text);
+            if (IsStringAllBlank(text)) text.clear();
+            mParseCharString(text);
+            sharedStrings.add(text);
             text.clear();
         }
     }

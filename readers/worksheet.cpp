@@ -1,4 +1,6 @@
 #include <algorithm>
+#include <array>
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -64,14 +66,37 @@ long sharedStringIndex(const char* text) {
 
 }  // namespace
 
+// A cell on its way to the provider.
+struct WaitingCell {
+    unsigned row;
+    unsigned column;
+    long sharedString;  // its index, or -1 for a number
+    double number;
+    NumberKind kind;
+};
+
 // The state of one pass over a worksheet part.
 class WorksheetPass {
   public:
     WorksheetPass(ExcelXLSXReader& owner, const std::string& path) : owner_(owner) {
+        text_.cell.type = CELL_TEXT;
         reader_.mInitialize(path);
     }
 
     void run() {
+        try {
+            readCells();
+        } catch (...) {
+            // What came before an error is delivered all the same, unless the error comes from
+            // there.
+            if (!delivering_) deliverWaiting();
+            throw;
+        }
+        deliverWaiting();
+    }
+
+  private:
+    void readCells() {
         const Names names(reader_.textReader);
         if (reader_.nodeType() != XML_READER_TYPE_ELEMENT && !reader_.readToElement()) return;
         bool onElement = true;
@@ -90,7 +115,6 @@ class WorksheetPass {
         }
     }
 
-  private:
     void beginRow() {
         Attributes attributes(reader_);
         const char* text = attributes.find("r");
@@ -167,41 +191,84 @@ class WorksheetPass {
     }
 
     void deliverNumber(const char* text) {
-        NumberKind kind;
+        WaitingCell cell{place_.row(), place_.column(), -1, 0.0, {}};
         if (style_ >= 0 && static_cast<std::size_t>(style_) < owner_.numberKinds.size())
-            kind = owner_.numberKinds[static_cast<std::size_t>(style_)];
-        number_.cell.type = kind.type;
-        number_.cell.formatIndex = kind.formatIndex;
-        CmXmlCast::instance().mCast(number_.cell.numValue, text);
-        deliverAt(number_);
+            cell.kind = owner_.numberKinds[static_cast<std::size_t>(style_)];
+        CmXmlCast::instance().mCast(cell.number, text);
+        if (waitingCount_ == 0)
+            deliver(cell);
+        else
+            wait(cell);
     }
 
     void deliverSharedString(long index) {
         if (index < 0 || static_cast<std::size_t>(index) >= owner_.sharedStrings.size()) return;
-        deliverText(owner_.sharedStrings[static_cast<std::size_t>(index)]);
+        owner_.sharedStrings.fetchPlace(static_cast<std::size_t>(index));
+        wait({place_.row(), place_.column(), index, 0.0, {}});
     }
 
-    template <class Text>
-    void deliverText(const Text& text) {
+    void deliverText(const char* text) {
+        deliverWaiting();
         std::string& value = text_.cell.textValue;
         value = text;
         if (ExcelXmlReader::IsStringAllBlank(value)) return;
         ExcelXLSXReader::mParseCharString(value);
-        text_.cell.type = CELL_TEXT;
-        deliverAt(text_);
+        deliverAt(place_.row(), place_.column(), text_);
     }
 
-    void deliverAt(ExternalDataRecord& record) {
-        record.row = place_.row();
-        record.column = place_.column();
-        owner_.deliver(record);
+    // A shared string is anywhere in memory, which takes its time to answer. It is asked early, and
+    // the cells go on in their order a little later.
+    void wait(const WaitingCell& cell) {
+        if (waitingCount_ == kWaiting) deliverOldest();
+        waiting_[(oldest_ + waitingCount_++) % kWaiting] = cell;
+        if (waitingCount_ <= kWaiting / 2) return;
+        const WaitingCell& between = waiting_[(oldest_ + waitingCount_ - kWaiting / 2) % kWaiting];
+        if (between.sharedString >= 0)
+            owner_.sharedStrings.fetchText(static_cast<std::size_t>(between.sharedString));
     }
+
+    void deliverWaiting() {
+        while (waitingCount_ > 0) deliverOldest();
+    }
+
+    void deliverOldest() {
+        const WaitingCell& cell = waiting_[oldest_];
+        oldest_ = (oldest_ + 1) % kWaiting;
+        --waitingCount_;
+        deliver(cell);
+    }
+
+    void deliver(const WaitingCell& cell) {
+        if (cell.sharedString < 0) {
+            number_.cell.type = cell.kind.type;
+            number_.cell.formatIndex = cell.kind.formatIndex;
+            number_.cell.numValue = cell.number;
+            return deliverAt(cell.row, cell.column, number_);
+        }
+        const auto index = static_cast<std::size_t>(cell.sharedString);
+        text_.cell.textValue = owner_.sharedStrings[index];
+        if (!text_.cell.textValue.empty()) deliverAt(cell.row, cell.column, text_);
+    }
+
+    void deliverAt(unsigned row, unsigned column, ExternalDataRecord& record) {
+        record.row = row;
+        record.column = column;
+        delivering_ = true;
+        owner_.deliver(record);
+        delivering_ = false;
+    }
+
+    static constexpr std::size_t kWaiting = 16;
 
     ExcelXLSXReader& owner_;
     XmlReader reader_;
     CellPlace place_;
     CellKind kind_ = CellKind::Number;
     int style_ = -1;
+    std::array<WaitingCell, kWaiting> waiting_;
+    std::size_t oldest_ = 0;
+    std::size_t waitingCount_ = 0;
+    bool delivering_ = false;
     ExternalDataRecord number_{0, 0, 0, 0};
     ExternalDataRecord text_{0, 0, 0, 0};
 };

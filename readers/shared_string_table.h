@@ -1,0 +1,43 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace dp {
+
+// Texts by index, one behind the other in memory and four bytes more for each.
+class SharedStringTable {
+  public:
+    void clear();
+    // Throws std::bad_alloc.
+    void reserve(std::size_t count) { ends_.reserve(count); }
+    void add(std::string_view text);
+
+    std::size_t size() const { return ends_.size(); }
+    // The text at `index` (0-based), which is below size(). Valid until the table changes.
+    std::string_view operator[](std::size_t index) const {
+        const std::size_t begin = index == 0 ? 0 : endOf(index - 1);
+        return std::string_view(bytes_).substr(begin, endOf(index) - begin);
+    }
+
+    // Ask memory for what the other two read, without waiting for it.
+    void fetchPlace(std::size_t index) const { __builtin_prefetch(&ends_[index]); }
+    void fetchText(std::size_t index) const {
+        __builtin_prefetch(bytes_.data() + (index == 0 ? 0 : endOf(index - 1)));
+    }
+
+  private:
+    std::size_t endOf(std::size_t index) const {
+        return carries_.empty() ? ends_[index] : farEndOf(index);
+    }
+    std::size_t farEndOf(std::size_t index) const;
+
+    std::string bytes_;
+    std::vector<std::uint32_t> ends_;   // the low halves; carries_ knows the rest
+    std::vector<std::size_t> carries_;  // the indexes before which the ends went beyond 4 GiB again
+};
+
+}  // namespace dp
