@@ -1,5 +1,7 @@
 #include "readers/attributes.h"
 
+#include <cstring>
+
 #include <libxml/xmlreader.h>
 
 #include "readers/xml_reader.h"
@@ -9,7 +11,7 @@ namespace dp {
 namespace {
 
 bool equal(const xmlChar* name, const char* wanted) {
-    return xmlStrEqual(name, reinterpret_cast<const xmlChar*>(wanted)) == 1;
+    return std::strcmp(reinterpret_cast<const char*>(name), wanted) == 0;
 }
 
 }  // namespace

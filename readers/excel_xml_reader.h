@@ -90,7 +90,9 @@ class DPXLSX_API ExcelXmlReader {
     bool isStyle(const std::string& id);
     void readRow(unsigned row, unsigned columnCount);
     void beginCell(unsigned& column, unsigned& mergeAcross);
-    std::string readStringData();
+    void setCurrentStyle(const char* id);
+    bool readData(bool inPreview);
+    void readStringData(std::string& text);
     // Announces a worksheet to the provider and makes it the current one.
     void beginWorksheet(const std::string& name);
     // Takes the worksheets that delivered nothing away again and selects the first one.
@@ -118,6 +120,7 @@ class DPXLSX_API ExcelXmlReader {
     std::string ampmMask;
 
   private:
+    ExternalDataRecord record_{0, 0, 0, 0};  // the one being read
     FirstEntryIndex<xStyle, std::string> styleById_{&xStyle::styleId};
     FirstEntryIndex<xStyleRange, unsigned> styleByColumn_{&xStyleRange::column};
     FirstEntryIndex<xStyleRange, unsigned> styleByRow_{&xStyleRange::row};

@@ -23,11 +23,16 @@ unsigned saturatingSum(unsigned left, unsigned right) {
     return left + std::min(right, room);
 }
 
-ExternalDataRecord recordAt(unsigned column, unsigned row, ExternalCellType type) {
-    if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
-    ExternalDataRecord record(0, 0, row, column);
-    record.cell.type = type;
-    return record;
+bool hasPrefix(const xmlAttr* attribute, std::string_view prefix) {
+    const xmlChar* own = attribute->ns ? attribute->ns->prefix : nullptr;
+    return own && reinterpret_cast<const char*>(own) == prefix;
+}
+
+ExternalCellType typeOfData(std::string_view name) {
+    if (name == "Number" || name == "Boolean") return CELL_NUMBER;
+    if (name == "String") return CELL_TEXT;
+    if (name == "DateTime") return CELL_DATETIME;
+    return CELL_EMPTY;
 }
 
 }  // namespace
@@ -66,58 +71,72 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
 void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
     Attributes attributes(xmlReader);
     unsigned index = 0;
-    if (const char* text = attributes.find("Index", "ss")) CmXmlCast::instance().mCast(index, text);
-    if (index > column) column = index - 1;
-
-    currentStyleId.clear();
-    currentStyle = nullptr;
-    if (const char* id = attributes.find("StyleID", "ss"); id && *id != '\0') {
-        currentStyleId = id;
-        int ignored = -1;
-        mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);
-    }
-
     mergeAcross = 0;
-    if (const char* text = attributes.find("MergeAcross", "ss"))
-        CmXmlCast::instance().mCast(mergeAcross, text);
+    bool hasStyle = false;
+    for (const xmlAttr* a = attributes.first(); a; a = a->next) {
+        if (!hasPrefix(a, "ss")) continue;
+        const std::string_view name = reinterpret_cast<const char*>(a->name);
+        if (name == "StyleID") {
+            setCurrentStyle(attributes.valueOf(a));
+            hasStyle = true;
+        } else if (name == "Index") {
+            CmXmlCast::instance().mCast(index, attributes.valueOf(a));
+        } else if (name == "MergeAcross") {
+            CmXmlCast::instance().mCast(mergeAcross, attributes.valueOf(a));
+        }
+    }
+    if (index > column) column = index - 1;
     // Wider than a worksheet, or negative: it would hide the cells behind it.
     if (mergeAcross >= kWorksheetColumns) mergeAcross = 0;
+    if (!hasStyle) setCurrentStyle("");
+}
+
+void ExcelXmlReader::setCurrentStyle(const char* id) {
+    if (currentStyle && currentStyleId == id) return;
+    currentStyleId = id;
+    currentStyle = nullptr;
+    int ignored = -1;
+    if (!currentStyleId.empty()) mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);
 }
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    Attributes attributes(xmlReader);
-    const char* typeName = attributes.find("Type", "ss");
-    const std::string type = typeName ? typeName : "";
+    const char* typeName = Attributes(xmlReader).find("Type", "ss");
+    record_.initialize();
+    record_.cell.type = typeName ? typeOfData(typeName) : CELL_EMPTY;
     xmlReader.readNode();
     if (!hasContent) return;
 
     const bool inPreview = !provider->IsPreviewing() ||
                            (row < static_cast<unsigned>(provider->GetPreviewNumberOfRows()) &&
                             column < static_cast<unsigned>(provider->GetPreviewNumberOfColumns()));
-    const char* value = xmlReader.nodeValue();
-    if (type == "Number" || type == "Boolean") {
-        if (!value) return;
-        ExternalDataRecord record = recordAt(column, row, CELL_NUMBER);
-        CmXmlCast::instance().mCast(record.cell.numValue, value);
-        mAddExternalDataRecord(record, inPreview);
-    } else if (type == "DateTime") {
-        if (!value || *value == '\0') return;
-        ExternalDataRecord record = recordAt(column, row, CELL_DATETIME);
-        record.cell.numValue = inPreview ? mFormatExcelDateTime(value) : missingValue;
-        mAddExternalDataRecord(record, inPreview);
-    } else if (type == "String") {
-        std::string text = readStringData();
-        if (IsStringAllBlank(text)) return;
-        ExternalDataRecord record = recordAt(column, row, CELL_TEXT);
-        record.cell.textValue = std::move(text);
-        mAddExternalDataRecord(record, inPreview);
-    }
+    if (!readData(inPreview)) return;
+    if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
+    record_.row = row;
+    record_.column = column;
+    mAddExternalDataRecord(record_, inPreview);
 }
 
-// The text from the current node to the end of the data, that of formatted runs included.
-std::string ExcelXmlReader::readStringData() {
-    std::string text;
+// The value of the current data, as its type has it. False when there is none.
+bool ExcelXmlReader::readData(bool inPreview) {
+    ExternalDataRecordCell& cell = record_.cell;
+    if (cell.type == CELL_TEXT) {
+        readStringData(cell.textValue);
+        return !IsStringAllBlank(cell.textValue);
+    }
+    const char* value = xmlReader.nodeValue();
+    if (cell.type == CELL_EMPTY || !value) return false;
+    if (cell.type == CELL_NUMBER) {
+        CmXmlCast::instance().mCast(cell.numValue, value);
+        return true;
+    }
+    if (*value == '\0') return false;
+    cell.numValue = inPreview ? mFormatExcelDateTime(value) : missingValue;
+    return true;
+}
+
+// Appends the text from the current node to the end of the data, that of formatted runs included.
+void ExcelXmlReader::readStringData(std::string& text) {
     do {
         const int type = xmlReader.nodeType();
         if (type == XML_READER_TYPE_TEXT || type == XML_READER_TYPE_SIGNIFICANT_WHITESPACE)
@@ -126,7 +145,6 @@ std::string ExcelXmlReader::readStringData() {
                  (isOnElement("Data") || isOnElement("ss:Data")))
             break;
     } while (xmlReader.readNode());
-    return text;
 }
 
 void ExcelXmlReader::mAddExternalDataRecord(ExternalDataRecord& record, bool lookUpFormat) {

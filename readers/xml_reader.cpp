@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <string_view>
 
 #include <boost/filesystem.hpp>
 #include <libxml/xmlreader.h>
@@ -136,7 +137,8 @@ int mReadForElements(XmlReader& reader, const std::vector<std::string>& names) {
     if (names.empty()) return -1;
     bool onElement = reader.nodeType() == XML_READER_TYPE_ELEMENT || reader.readToElement();
     for (; onElement; onElement = reader.readToElement()) {
-        const auto found = std::find(names.begin(), names.end(), reader.nodeName());
+        const std::string_view name = reader.nodeName();
+        const auto found = std::find(names.begin(), names.end(), name);
         if (found != names.end()) return static_cast<int>(found - names.begin());
     }
     return -1;
