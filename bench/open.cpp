@@ -2,7 +2,8 @@
 // every node of its parts with libxml2's reader, and append the values to one vector per column.
 // Each run is a process of its own; ours and the floor's alternate, and the medians are compared.
 //
-// open [RUNS] [WORKLOAD]: RUNS of each (5 by default), of all workloads but the largest, or of one.
+// open [RUNS] [WORKLOAD]: RUNS of each (5 by default), of all workloads but the largest, or of
+// those whose names hold WORKLOAD; "large" names the largest.
 
 #include <unistd.h>
 
@@ -13,9 +14,11 @@
 #include <cstring>
 #include <deque>
 #include <functional>
+#include <optional>
 #include <string>
 #include <sys/resource.h>
 #include <sys/wait.h>
+#include <utility>
 #include <vector>
 
 #include <boost/filesystem.hpp>
@@ -34,8 +37,9 @@ using bench::Workload;
 
 struct Goal {
     Workload workload;
-    double ratio;         // to the floor; 0 for none
-    double bytesPerCell;  // 0 for none
+    double ratio;             // to the floor; 0 for none
+    double bytesPerCell;      // 0 for none
+    double milliseconds = 0;  // 0 for none
 };
 
 const Goal kGoals[] = {
@@ -44,27 +48,33 @@ const Goal kGoals[] = {
     {{"mixed 100,000 x 10", Content::Mixed, 1, 100000, 10}, 1.00, 40},
     {{"wide 1,000 x 2,000", Content::Numbers, 1, 1000, 2000}, 0.92, 30},
     {{"100 sheets of 1,000 x 10", Content::Mixed, 100, 1000, 10}, 0.95, 40},
-    {{"small 20 x 5", Content::Mixed, 1, 20, 5}, 2.0, 0},
+    {{"small 20 x 5", Content::Mixed, 1, 20, 5}, 0, 0, 2.0},
     {{"large 1,000,000 x 10", Content::Numbers, 1, 1000000, 10}, 0.95, 40},  // by hand
 };
 
 struct Measurement {
     double seconds;
-    double bytes;  // the process's peak
+    double closing;  // seconds of them, from the closing of the file on
+    double bytes;    // the process's peak
 };
 
-// Runs `work` in a process of its own, so that no run finds the memory of another.
-Measurement inProcess(const std::function<void()>& work) {
+double secondsSince(std::chrono::steady_clock::time_point start) {
+    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+}
+
+// Runs `work`, which answers how long its closing took, in a process of its own, so that no run
+// finds the memory of another.
+Measurement inProcess(const std::function<double()>& work) {
     int ends[2];
     if (pipe(ends) != 0) std::abort();
     const pid_t child = fork();
     if (child == 0) {
         const auto start = std::chrono::steady_clock::now();
-        work();
-        const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - start;
+        const double closing = work();
+        const double seconds = secondsSince(start);
         rusage usage{};
         getrusage(RUSAGE_SELF, &usage);
-        const Measurement result{taken.count(), static_cast<double>(usage.ru_maxrss) * 1024};
+        const Measurement result{seconds, closing, static_cast<double>(usage.ru_maxrss) * 1024};
         _exit(write(ends[1], &result, sizeof result) == sizeof result ? 0 : 1);
     }
     Measurement result{};
@@ -80,17 +90,41 @@ Measurement inProcess(const std::function<void()>& work) {
     return result;
 }
 
-void openOurs(const std::string& path) {
-    dp::xlsxDataProvider provider;
-    if (provider.OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read) != 0) _exit(1);
-    provider.CloseFile();
-    provider.ClearWorksheets();
+// Opens, closes and clears; `look` sees what is in between.
+template <class Look>
+double openOurs(const std::string& path, const Look& look) {
+    std::optional<dp::xlsxDataProvider> provider(std::in_place);
+    if (provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read) != 0) _exit(1);
+    look(*provider);
+    const auto start = std::chrono::steady_clock::now();
+    provider->CloseFile();
+    provider->ClearWorksheets();
+    provider.reset();
+    return secondsSince(start);
 }
 
-void listOurs(const std::string& path) {
+double openOurs(const std::string& path) {
+    return openOurs(path, [](const auto&) {});
+}
+
+// Cells that came out of order are put in their places by the first column that is asked for.
+double openAndLoadOurs(const std::string& path) {
+    return openOurs(path, [](const dp::IExcelDataProvider& provider) {
+        const auto columns = static_cast<int>(provider.GetColumnCount(0));
+        for (int column = 0; column < columns; ++column) {
+            dp::IColumn* loaded = provider.GetColumn(0, column);
+            if (!loaded) _exit(1);
+            loaded->AddRef();
+            loaded->Release();
+        }
+    });
+}
+
+double listOurs(const std::string& path) {
     dp::xlsxDataProvider provider;
     std::vector<std::string> names;
     if (provider.GetWorksheets(path.c_str(), names) != 0) _exit(1);
+    return 0;
 }
 
 // --- the floor ---
@@ -178,7 +212,7 @@ void readSheetFloor(const fs::path& part, const std::vector<std::string>& string
     xmlFreeTextReader(reader);
 }
 
-void openFloor(const std::string& path) {
+double openFloor(const std::string& path) {
     const fs::path directory = unpackFloor(path);
     const std::vector<std::string> strings = readStringsFloor(directory / "xl/sharedStrings.xml");
     std::vector<std::deque<FloorColumn>> sheets;
@@ -186,23 +220,29 @@ void openFloor(const std::string& path) {
         readSheetFloor(entry.path(), strings, sheets.emplace_back());
     sheets.clear();
     fs::remove_all(directory);
+    return 0;
 }
 
-void listFloor(const std::string& path) { fs::remove_all(unpackFloor(path)); }
+double listFloor(const std::string& path) {
+    fs::remove_all(unpackFloor(path));
+    return 0;
+}
 
 // --- XML Spreadsheet 2003 ---
 
-void readOurs2003(const std::string& path) {
+double readOurs2003(const std::string& path) {
     dp::xlsxDataProvider provider;
     dp::ExcelXmlReader reader(path, "m/d/yy", 1.23456e30, &provider, nullptr);
     reader.mReadExcelWorkbook();
+    return 0;
 }
 
-void passFloor2003(const std::string& path) {
+double passFloor2003(const std::string& path) {
     xmlTextReaderPtr reader = xmlReaderForFile(path.c_str(), nullptr, 0x60);
     while (xmlTextReaderRead(reader) == 1) {
     }
     xmlFreeTextReader(reader);
+    return 0;
 }
 
 // --- the table ---
@@ -219,7 +259,9 @@ Measurement medianOf(std::vector<Measurement> runs) {
     return *middle;
 }
 
-Medians measure(int runs, const std::function<void()>& ours, const std::function<void()>& floor) {
+using Work = std::function<double()>;
+
+Medians measure(int runs, const Work& ours, const Work& floor) {
     std::vector<Measurement> oursRuns;
     std::vector<Measurement> floorRuns;
     for (int run = 0; run < runs; ++run) {
@@ -231,63 +273,127 @@ Medians measure(int runs, const std::function<void()>& ours, const std::function
 
 bool missed = false;  // any goal
 
-void printRow(const char* name, const Medians& medians, double ratioGoal, double bytesPerCell,
-              double bytesGoal) {
-    const double ratio = medians.ours.seconds / medians.floor.seconds;
-    missed = missed || (ratioGoal > 0 && ratio > ratioGoal) ||
-             (bytesGoal > 0 && bytesPerCell > bytesGoal);
-    std::printf("%-28s %9.1f %9.1f %7.2f", name, medians.ours.seconds * 1e3,
-                medians.floor.seconds * 1e3, ratio);
-    ratioGoal > 0 ? std::printf(" %6.2f", ratioGoal) : std::printf(" %6s", "-");
-    bytesPerCell > 0 ? std::printf(" %9.1f", bytesPerCell) : std::printf(" %9s", "-");
-    bytesGoal > 0 ? std::printf(" %6.0f\n", bytesGoal) : std::printf(" %6s\n", "-");
+// A value beside its goal, which is none when it is 0.
+void printFigure(int width, int digits, double value, double goal) {
+    missed = missed || (goal > 0 && value > goal);
+    std::printf(" %*.*f", width, digits, value);
+    goal > 0 ? std::printf(" %5.2f", goal) : std::printf(" %5s", "-");
+}
+
+void printTimes(const std::string& name, const Medians& medians, double goal) {
+    std::printf("%-36s %9.1f %9.1f", name.c_str(), medians.ours.seconds * 1e3,
+                medians.floor.seconds * 1e3);
+    printFigure(6, 2, medians.ours.seconds / medians.floor.seconds, goal);
+}
+
+void endRow() {
+    std::printf("\n");
     std::fflush(stdout);
 }
+
+// The runs, the workloads and the files of one call of the program.
+class Program {
+  public:
+    Program(int runs, std::string only, const fs::path& directory)
+        : runs_(runs),
+          only_(std::move(only)),
+          book_((directory / "book.xlsx").string()),
+          document_((directory / "book.xml").string()) {}
+
+    void openings() {
+        bench::writeWorkbook(book_, kGoals[5].workload);
+        const double idle = inProcess([&] { return openOurs(book_); }).bytes;
+        std::printf("%-36s %9s %9s %6s %5s %6s %5s %6s %5s\n", "open, close and clear", "ours ms",
+                    "floor ms", "ratio", "goal", "close", "goal", "B/cell", "goal");
+        for (const Goal& goal : kGoals) {
+            const bool large = goal.workload.rows > 100000;
+            if (large ? only_ != "large" : !isWanted(goal.workload.name)) continue;
+            bench::writeWorkbook(book_, goal.workload);
+            const Medians medians = compare([this] { return openFloor(book_); });
+            printTimes(goal.workload.name, medians, goal.ratio);
+            if (goal.bytesPerCell > 0) {
+                const auto cells = static_cast<double>(goal.workload.cells());
+                printFigure(6, 3, medians.ours.closing / medians.floor.seconds, 0.05);
+                printFigure(6, 1, (medians.ours.bytes - idle) / cells, goal.bytesPerCell);
+            }
+            if (goal.milliseconds > 0) {
+                std::printf("  ms:");
+                printFigure(4, 1, medians.ours.seconds * 1e3, goal.milliseconds);
+            }
+            endRow();
+        }
+    }
+
+    void listing() {
+        const std::string name = "worksheet names of the mixed workbook";
+        if (!isWanted(name)) return;
+        bench::writeWorkbook(book_, kGoals[2].workload);
+        const Medians medians = measure(
+            runs_, [this] { return listOurs(book_); }, [this] { return listFloor(book_); });
+        printTimes(name, medians, 1.1);
+        endRow();
+    }
+
+    void older() {
+        const std::string name = "XML 2003, 100,000 x 10 / bare pass";
+        if (!isWanted(name)) return;
+        bench::writeSpreadsheet2003(document_, 100000, 10);
+        const Medians medians = measure(
+            runs_, [this] { return readOurs2003(document_); },
+            [this] { return passFloor2003(document_); });
+        printTimes(name, medians, 1.5);
+        endRow();
+    }
+
+    // Rows out of order beside the same rows in order.
+    void orders() {
+        const Workload inOrder[] = {{"100,000 x 10", Content::Numbers, 1, 100000, 10},
+                                    {"1,000,000 x 2", Content::Numbers, 1, 1000000, 2}};
+        for (const Workload& workload : inOrder) {
+            order(workload, bench::Order::Descending, "rows descending, ", 1.2);
+            order(workload, bench::Order::Random, "rows in random order, ", 1.5);
+        }
+    }
+
+  private:
+    bool isWanted(const std::string& name) const { return name.find(only_) != name.npos; }
+
+    Medians compare(const Work& floor) const {
+        return measure(
+            runs_, [this] { return openOurs(book_); }, floor);
+    }
+
+    void order(Workload workload, bench::Order other, const std::string& what, double goal) const {
+        const std::string name = what + workload.name;
+        if (!isWanted(name)) return;
+        const std::string ordered = book_ + ".ordered.xlsx";
+        bench::writeWorkbook(ordered, workload);
+        workload.order = other;
+        bench::writeWorkbook(book_, workload);
+        const Medians medians = measure(
+            runs_, [this] { return openAndLoadOurs(book_); },
+            [&] { return openAndLoadOurs(ordered); });
+        printTimes(name, medians, goal);
+        endRow();
+    }
+
+    int runs_;
+    std::string only_;
+    std::string book_;
+    std::string document_;
+};
 
 }  // namespace
 
 int main(int argc, char** argv) {
-    const int runs = argc > 1 ? std::max(1, std::atoi(argv[1])) : 5;
-    const std::string only = argc > 2 ? argv[2] : "";
     const fs::path directory = fs::temp_directory_path() / fs::unique_path("bench-%%%%-%%%%");
     fs::create_directory(directory);
-    const std::string book = (directory / "book.xlsx").string();
-
-    const Workload& small = kGoals[5].workload;
-    bench::writeWorkbook(book, small);
-    const double idle = inProcess([&] { openOurs(book); }).bytes;
-
-    std::printf("%-28s %9s %9s %7s %6s %9s %6s\n", "open, close and clear", "ours ms", "floor ms",
-                "ratio", "goal", "B/cell", "goal");
-    for (const Goal& goal : kGoals) {
-        const std::string name = goal.workload.name;
-        const bool large = goal.workload.rows > 100000;
-        if (only.empty() ? large : name.find(only) == name.npos) continue;
-        bench::writeWorkbook(book, goal.workload);
-        const Medians medians = measure(
-            runs, [&] { openOurs(book); }, [&] { openFloor(book); });
-        const double bytes =
-            (medians.ours.bytes - idle) / static_cast<double>(goal.workload.cells());
-        printRow(name.c_str(), medians, goal.ratio, goal.bytesPerCell > 0 ? bytes : 0,
-                 goal.bytesPerCell);
-    }
-    const std::string listing = "worksheet names, mixed";
-    if (listing.find(only) != listing.npos) {
-        bench::writeWorkbook(book, kGoals[2].workload);
-        printRow(listing.c_str(),
-                 measure(
-                     runs, [&] { listOurs(book); }, [&] { listFloor(book); }),
-                 1.1, 0, 0);
-    }
-    const std::string older = "XML 2003, 100,000 x 10";
-    if (older.find(only) != older.npos) {
-        const std::string document = (directory / "book.xml").string();
-        bench::writeSpreadsheet2003(document, 100000, 10);
-        printRow(older.c_str(),
-                 measure(
-                     runs, [&] { readOurs2003(document); }, [&] { passFloor2003(document); }),
-                 1.5, 0, 0);
-    }
+    Program program(argc > 1 ? std::max(1, std::atoi(argv[1])) : 5, argc > 2 ? argv[2] : "",
+                    directory);
+    program.openings();
+    program.listing();
+    program.older();
+    program.orders();
     fs::remove_all(directory);
     return missed ? 1 : 0;
 }

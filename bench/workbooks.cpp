@@ -1,10 +1,14 @@
 #include "bench/workbooks.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
+#include <numeric>
 #include <string_view>
+#include <utility>
+#include <vector>
 
 #include <minizip/zip.h>
 
@@ -149,11 +153,24 @@ std::string cellRest(Content content, unsigned column, std::uint32_t random, uns
     }
 }
 
+// The row numbers (1-based) as they stand in the part.
+std::vector<unsigned> rowsOf(const Workload& workload) {
+    std::vector<unsigned> rows(workload.rows);
+    std::iota(rows.begin(), rows.end(), 1U);
+    if (workload.order == Order::Descending) std::reverse(rows.begin(), rows.end());
+    if (workload.order == Order::Random) {
+        Random random;
+        for (unsigned i = workload.rows; i > 1; --i)
+            std::swap(rows[i - 1], rows[random.next() % i]);
+    }
+    return rows;
+}
+
 void addWorksheet(Package& package, unsigned sheet, const Workload& workload, unsigned strings,
                   Random& random) {
     package.begin("xl/worksheets/sheet" + std::to_string(sheet) + ".xml");
     package.write(std::string(kHead).append("<worksheet ").append(kMain).append("><sheetData>"));
-    for (unsigned row = 1; row <= workload.rows; ++row) {
+    for (const unsigned row : rowsOf(workload)) {
         const std::string r = std::to_string(row);
         package.write("<row r=\"" + r + "\">");
         for (unsigned column = 0; column < workload.columns; ++column)

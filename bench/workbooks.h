@@ -6,6 +6,8 @@
 namespace bench {
 
 enum class Content { Numbers, Texts, Mixed };
+// In which order the rows stand in the worksheet part.
+enum class Order { Ascending, Descending, Random };
 
 struct Workload {
     const char* name;
@@ -13,6 +15,7 @@ struct Workload {
     unsigned sheets;
     unsigned rows;
     unsigned columns;
+    Order order = Order::Ascending;
 
     unsigned long cells() const { return 1UL * sheets * rows * columns; }
 };
