@@ -6,6 +6,7 @@
 #include "readers/excel_xml_reader.h"
 #include "readers/relationships.h"
 #include "readers/shared_string_table.h"
+#include "readers/text_budget.h"
 
 namespace dp {
 
@@ -56,6 +57,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     std::string packageDir;
     RelationshipIndex relationshipIndex;
     std::vector<NumberKind> numberKinds;  // by position in cellXfNumFmtIds
+    TextBudget textBudget;
 };
 
 namespace excel_xlsx {

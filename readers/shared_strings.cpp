@@ -63,6 +63,7 @@ void ExcelXLSXReader::mReadSharedStrings() {
     const std::string path = xlDir + "/sharedStrings.xml";
     XmlReader reader;
     reader.mInitialize(path);
+    textBudget.addPart(path);
     int uniqueCount = 0;
     if (!reader.mGotoElement("sst") || !reader.mReadAttribute(uniqueCount, "uniqueCount")) return;
     sharedStrings.reserve(

@@ -213,7 +213,7 @@ class WorksheetPass {
         value = text;
         if (ExcelXmlReader::IsStringAllBlank(value)) return;
         ExcelXLSXReader::mParseCharString(value);
-        deliverAt(place_.row(), place_.column(), text_);
+        deliverTextAt(place_.row(), place_.column());
     }
 
     // A shared string is anywhere in memory, which takes its time to answer. It is asked early, and
@@ -235,7 +235,9 @@ class WorksheetPass {
         const WaitingCell& cell = waiting_[oldest_];
         oldest_ = (oldest_ + 1) % kWaiting;
         --waitingCount_;
+        delivering_ = true;
         deliver(cell);
+        delivering_ = false;
     }
 
     void deliver(const WaitingCell& cell) {
@@ -247,15 +249,18 @@ class WorksheetPass {
         }
         const auto index = static_cast<std::size_t>(cell.sharedString);
         text_.cell.textValue = owner_.sharedStrings[index];
-        if (!text_.cell.textValue.empty()) deliverAt(cell.row, cell.column, text_);
+        if (!text_.cell.textValue.empty()) deliverTextAt(cell.row, cell.column);
+    }
+
+    void deliverTextAt(unsigned row, unsigned column) {
+        owner_.textBudget.spend(text_.cell.textValue.size());
+        deliverAt(row, column, text_);
     }
 
     void deliverAt(unsigned row, unsigned column, ExternalDataRecord& record) {
         record.row = row;
         record.column = column;
-        delivering_ = true;
         owner_.deliver(record);
-        delivering_ = false;
     }
 
     static constexpr std::size_t kWaiting = 16;
@@ -274,7 +279,9 @@ class WorksheetPass {
 };
 
 void ExcelXLSXReader::mReadExcel2007Worksheet(const std::string& target) {
-    WorksheetPass(*this, resolveTarget(packageDir, target)).run();
+    const std::string part = resolveTarget(packageDir, target);
+    textBudget.addPart(part);
+    WorksheetPass(*this, part).run();
 }
 
 }  // namespace dp

@@ -97,6 +97,22 @@ TEST_F(Packages, SharedStringTables) {
         EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", c[1])), c[2]) << c[0];
 }
 
+// One long string in many cells: as many as are in proportion to the package, and then no more.
+TEST_F(Packages, RepeatedTextsHaveALimit) {
+    const auto outcomeOf = [this](unsigned cells) {
+        std::string row = "<row>";
+        for (unsigned cell = 0; cell < cells; ++cell) row += "<c t='s'><v>0</v></c>";
+        auto package = PackageBuilder::of({row + "</row>"});
+        package.set("xl/sharedStrings.xml",
+                    "<sst uniqueCount='1'><si><t>" + std::string(2'000'000, 'x') + "</t></si></sst>");
+        package.write(file("book.xlsx"));
+        dp::xlsxDataProvider provider;
+        return provider.OpenFile(file("book.xlsx").c_str(), Access::Read);
+    };
+    EXPECT_EQ(outcomeOf(64), 0);
+    EXPECT_THROW(outcomeOf(200), CmXmlException);
+}
+
 TEST(Escapes, AreDecoded) {
     for (const auto& c : caseTable("escapes.txt")) {
         std::string text = c[1];
