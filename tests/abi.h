@@ -1,11 +1,16 @@
 #pragma once
 
+#include <cxxabi.h>
+#include <dlfcn.h>
+
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
+#include <cstdlib>
 #include <cstring>
 #include <iterator>
 #include <map>
+#include <memory>
 #include <sstream>
 #include <string>
 #include <string_view>
@@ -48,6 +53,18 @@ Result call(const void* object, std::size_t slot, Arguments... arguments) {
     using Function = Result (*)(const void*, Arguments...);
     void* const* table = *static_cast<void* const* const*>(object);
     return reinterpret_cast<Function>(table[slot])(object, arguments...);
+}
+
+// The operation that stands in a slot, "name(types)", as the symbols of the program call it.
+inline std::string operationIn(const void* object, std::size_t slot) {
+    void* const* table = *static_cast<void* const* const*>(object);
+    Dl_info symbol{};
+    if (!dladdr(table[slot], &symbol) || symbol.dli_saddr != table[slot]) return "no symbol";
+    const std::unique_ptr<char, void (*)(void*)> name(abi::__cxa_demangle(symbol.dli_sname, nullptr, nullptr, nullptr),
+                                                      std::free);
+    std::string text = name ? name.get() : "";
+    if (const auto tag = text.find("[abi:cxx11]"); tag != text.npos) text.erase(tag, 11);
+    return text.substr(text.rfind("::", text.find('(')) + 2);
 }
 
 // Size and alignment of a field by its type in the table.

@@ -1,4 +1,5 @@
 #include <functional>
+#include <map>
 
 #include "formats/date_time_variable_format.h"
 #include "model/host/entry_points.h"
@@ -151,6 +152,37 @@ TEST_F(ProviderContract, FilesAreOpenedAndClosed) {
     EXPECT_EQ(op<long>("OpenFile", "nowhere.xlsx", 1), -1);
     EXPECT_EQ(op<long>("CloseFile"), 0);
     EXPECT_EQ(op<std::string>("GetTempDirectoryPath"), "");
+}
+
+TEST_F(ProviderContract, EverySlotHoldsItsOperation) {
+    const std::map<std::string, std::string> overloads = {
+        {"AddWorksheetObject", "AddWorksheet(dp::IWorksheet*)"},
+        {"AddWorksheet", "AddWorksheet(char const*)"},
+        {"AddNumericColumn", "AddColumn(dp::INumericColumn*)"},
+        {"AddTextColumn", "AddColumn(dp::ITextColumn*)"},
+        {"AddNumericConstant", "AddConstant(dp::INumericConstant*)"},
+        {"AddTextConstant", "AddConstant(dp::ITextConstant*)"},
+        {"FindColumn", "FindColumn(int, dp::IColumn**, bool) const"},
+        {"FindColumnOfStorage",
+         "FindColumn(int, dp::IColumn**, dp::IVariable::StorageType, "
+         "dp::IVariableFormat::FormatType*, bool) const"},
+        {"FindColumnOfType",
+         "FindColumn(int, dp::IColumn**, dp::ColumnType, dp::IVariableFormat::FormatType*, bool) const"}};
+    // The finders are bases of their own, whose slots repeat a run of the provider's.
+    struct Table {
+        std::size_t offset;
+        std::string first, last;
+    };
+    for (const Table& table : {Table{0, "AddRef", kProvider.slots.back()},
+                               {8, "GetWorksheetPrimeKeys", "FindWorksheet"},
+                               {16, "GetColumnPrimeKeys", "RegisterSharedVariableBody"}})
+        for (std::size_t i = slotOf(kProvider, table.first), slot = 2; i <= slotOf(kProvider, table.last);
+             ++i, ++slot) {
+            const auto overload = overloads.find(kProvider.slots[i]);
+            const std::string expected = overload == overloads.end() ? kProvider.slots[i] + "(" : overload->second;
+            const void* facet = static_cast<const char*>(provider) + table.offset;
+            EXPECT_EQ(operationIn(facet, slot).substr(0, expected.size()), expected) << table.offset << ' ' << slot;
+        }
 }
 
 TEST_F(ProviderContract, WorksheetsAndColumnsComeThroughEveryRoad) {
