@@ -1,0 +1,149 @@
+#include "fuzz/host.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <cstring>
+
+#include "model/host/i_column.h"
+#include "model/host/i_string.h"
+#include "model/host/i_worksheet.h"
+
+#include "fuzz/checks.h"
+
+namespace fuzz {
+
+namespace {
+
+constexpr unsigned long kRows = 20'000;  // of all columns of one input
+constexpr unsigned long kShown = 3;      // values of a column
+
+// Every byte of the text must be there.
+unsigned long read(const dp::IString* text) { return text ? std::strlen(text->database_str()) : 0; }
+
+// Owned by us.
+void show(dp::IString* text) { read(std::unique_ptr<dp::IString>(text).get()); }
+
+void readNumbers(const dp::INumericColumn& column, unsigned long rows) {
+    const double* values = column.GetValues();
+    unsigned long infinite = 0;
+    for (unsigned long row = 0; row < rows; ++row) infinite += values[row] - values[row] != 0;
+    require(infinite <= rows, "no numbers");
+    for (unsigned long row = 0; row < std::min(rows, kShown); ++row) {
+        show(column.GetFormat()->FormatValue(values[row], row % 2 == 1));
+        show(column.GetFormattedValue(values[row], ','));
+    }
+}
+
+void readTexts(const dp::ITextColumn& column, unsigned long rows) {
+    const auto& texts = *column.GetTextValues();
+    require(texts.Count() == rows, "a column of another length");
+    for (unsigned long row = 0; row < rows; ++row) read(&texts.Item(row));
+}
+
+// Takes columns until there were kRows rows.
+class Taking {
+  public:
+    explicit Taking(dp::IDataProvider& provider) : finder_(*provider.GetVariableFinder()) {}
+
+    bool enough() const { return rows_ > kRows; }
+    void columns(int worksheet) {
+        std::vector<int> keys;
+        const auto& found = *finder_.GetColumnPrimeKeys(worksheet);
+        for (unsigned long i = 0; i < found.Count(); ++i) keys.push_back(found.Item(i));
+        for (const int key : keys) {
+            if (enough()) return;
+            dp::IColumn* column = nullptr;
+            if (finder_.FindColumn(key, &column, true)) take(column);
+            for (const auto storage :
+                 {dp::IVariable::StorageType::Numeric, dp::IVariable::StorageType::Text}) {
+                dp::IVariableFormat::FormatType type{};
+                if (finder_.FindColumn(key, &column, storage, &type, false)) take(column);
+            }
+        }
+    }
+
+  private:
+    void take(dp::IColumn* column) {
+        require(column != nullptr, "found and not given");
+        rows_ += read(*referenceTo(column));
+    }
+    static unsigned long read(dp::IColumn& column) { return fuzz::read(column); }
+
+    dp::IVariableFinder& finder_;
+    unsigned long rows_ = 0;
+};
+
+}  // namespace
+
+bool Helper::ConvertToDatetime(const dp::IString* format, dp::IString* text, double& value) const {
+    read(format);
+    char* end = nullptr;
+    const double number = std::strtod(text->database_str(), &end);
+    if (end == text->database_str()) return false;
+    value = number;
+    return true;
+}
+
+double Helper::GenerateTime(int year, int month, int day, int hour, int minute, int second,
+                            int millisecond) const {
+    return year * 365.25 + month * 30.5 + day + hour / 24.0 + minute / 1440.0 + second / 86400.0 +
+           millisecond / 864e5;
+}
+
+bool Helper::ValidVextralTime(double value) const { return value >= 0 && value < 2958466; }
+
+dp::IString* Helper::CovertVextralDateTimeToString(double value) const {
+    return FormatValue(value, false);
+}
+
+unsigned long read(dp::IColumn& column) {
+    const auto rows = static_cast<unsigned long>(column.GetRowCount());
+    require(column.GetRowCount() >= 0 && column.GetMissingCount() >= 0, "negative counts");
+    read(column.GetName());
+    read(column.GetDescription());
+    require(column.GetView() && column.GetFormat(), "a column without view or format");
+    if (const auto* numeric = dynamic_cast<dp::INumericColumn*>(&column))
+        readNumbers(*numeric, rows);
+    else
+        readTexts(dynamic_cast<dp::ITextColumn&>(column), rows);
+    return rows;
+}
+
+void takeEverything(dp::IDataProvider& provider) {
+    const dp::IWorksheetFinder& finder = *provider.GetWorksheetFinder();
+    std::vector<int> keys;
+    const auto& found = *finder.GetWorksheetPrimeKeys();
+    for (unsigned long i = 0; i < found.Count(); ++i) keys.push_back(found.Item(i));
+    Taking taking(provider);
+    for (const int key : keys) {
+        dp::IWorksheet* worksheet = nullptr;
+        require(finder.FindWorksheet(key, &worksheet), "a worksheet without its key");
+        const auto reference = referenceTo(worksheet);
+        require(worksheet->GetPrimeKey() == key, "another worksheet");
+        read(worksheet->GetView()->GetMissingValue());
+        if (!taking.enough()) taking.columns(key);
+    }
+}
+
+void ReadingProvider::read(std::unique_ptr<dp::ExcelXmlReader> reader) {
+    reader_ = std::move(reader);
+    reader_->mReadExcelWorkbook();
+}
+
+long ReadingProvider::GetWorksheets(const char*, std::vector<std::string>&) { return -1; }
+long ReadingProvider::OpenFile(const char*, FileAccess) { return -1; }
+long ReadingProvider::CloseFile() {
+    reader_.reset();
+    return 0;
+}
+
+dp::IVariableFormat* ReadingProvider::CreateVextralNumericFormat(
+    const dp::ExternalDataRecordCell& cell) const {
+    return reader_->createVextralNumericFormat(cell.formatIndex);
+}
+
+bool ReadingProvider::IsDateTimeFormatType(const dp::ExternalDataRecordCell& cell) const {
+    return reader_->IsDateTimeFormatType(reader_->GetExcelFormatType(cell.formatIndex));
+}
+
+}  // namespace fuzz

@@ -1,0 +1,138 @@
+// Packages, opened through the entry points as a host does it. An input whose first byte is odd is
+// the file itself. Any other describes entries of a package: the sound parts of a small workbook
+// stay where no entry replaces them, so that what is read does not end at the ZIP archive.
+
+#include <algorithm>
+#include <cstdint>
+#include <iterator>
+#include <string>
+#include <vector>
+
+#include <boost/filesystem.hpp>
+
+#include "model/host/entry_points.h"
+#include "readers/xml_reader.h"
+
+#include "fuzz/checks.h"
+#include "fuzz/host.h"
+#include "fuzz/input.h"
+#include "fuzz/parts.h"
+#include "fuzz/zip_writer.h"
+
+namespace {
+
+using fuzz::Input;
+using fuzz::require;
+
+constexpr const char* kNames[] = {"xl/workbook.xml",
+                                  "xl/_rels/workbook.xml.rels",
+                                  "xl/sharedStrings.xml",
+                                  "xl/styles.xml",
+                                  "xl/worksheets/sheet1.xml",
+                                  "xl/worksheets/sheet2.xml",
+                                  "[Content_Types].xml",
+                                  "xl/",
+                                  "xl/worksheets",
+                                  "xl/styles.xml/x",
+                                  "../escaped",
+                                  "/escaped",
+                                  "C:escaped",
+                                  "book.xlsx",
+                                  "./xl//./workbook.xml",
+                                  "xl\\styles.xml",
+                                  "XL/STYLES.XML",
+                                  ""};
+
+// Bits of the byte before an entry's content.
+enum EntryBit : unsigned { kStored = 1, kWrongSum = 2, kClaimed = 4, kRepeated = 8, kMany = 16 };
+
+std::string nameOf(Input& input) {
+    const unsigned which = input.byte();
+    return which < std::size(kNames) ? kNames[which] : input.text();
+}
+
+std::string repeated(const std::string& text, unsigned times) {
+    constexpr std::size_t kLargest = 1 << 20;  // bytes
+    std::string all;
+    for (; times > 0 && all.size() + text.size() <= kLargest; --times) all += text;
+    return all;
+}
+
+// The entries that the input describes, in their order; up to 65,535 more of an entry of which
+// there are many, under names of their own.
+void addEntries(Input& input, fuzz::ZipWriter& archive, std::vector<std::string>& names) {
+    for (unsigned left = 1 + input.byte() % 16; left > 0 && !input.empty(); --left) {
+        fuzz::ZipWriter::Entry entry;
+        entry.name = nameOf(input);
+        const unsigned bits = input.byte();
+        entry.deflated = (bits & kStored) == 0;
+        entry.wrongSum = (bits & kWrongSum) != 0;
+        if (bits & kClaimed) entry.claimedSize = input.index();
+        const unsigned times = bits & kRepeated ? input.word() : 1;
+        entry.content = repeated(input.take(input.word()), times);
+        archive.add(entry);
+        names.push_back(entry.name);
+        entry.content.clear();
+        const std::string stem = entry.name;
+        for (unsigned more = bits & kMany ? input.word() / 8 : 0; more > 0; --more) {
+            entry.name = stem + std::to_string(more);
+            archive.add(entry);
+        }
+    }
+}
+
+void overwrite(std::string& bytes, Input& input) {
+    for (unsigned left = input.byte() % 8; left > 0 && !bytes.empty(); --left) {
+        const std::size_t at = (input.word() | input.byte() << 16) % bytes.size();
+        bytes[at] = static_cast<char>(input.byte());
+    }
+    if (input.flag())
+        bytes.resize(bytes.size() - std::min<std::size_t>(bytes.size(), input.word()));
+}
+
+std::string packageOf(Input input) {
+    if (input.flag()) return input.rest();
+    fuzz::ZipWriter archive;
+    std::vector<std::string> names;
+    addEntries(input, archive, names);
+    for (const auto& [name, content] : fuzz::soundParts())
+        if (std::find(names.begin(), names.end(), name) == names.end())
+            archive.add({name, content});
+    std::string bytes = archive.finished();
+    overwrite(bytes, input);
+    return bytes + input.rest();
+}
+
+bool isResultOfOpening(long result) {
+    constexpr long kResults[] = {0, -1, -22, -25};  // what the file's bytes can lead to
+    return std::find(std::begin(kResults), std::end(kResults), result) != std::end(kResults);
+}
+
+void openPackage(const std::string& path) {
+    dp::IDataProvider* created = nullptr;
+    require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
+    const auto provider = fuzz::referenceTo(created);
+    provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
+    std::vector<std::string> names;
+    require(isResultOfOpening(provider->GetWorksheets(path.c_str(), names)), "another result");
+    try {
+        const long result = provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read);
+        require(isResultOfOpening(result), "another result");
+    } catch (const CmXmlException& e) {
+        require(e.code() == kXmlError, "another code");
+    }
+    fuzz::takeEverything(*provider);
+    provider->CloseFile();
+    fuzz::takeEverything(*provider);
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+    static const std::string path = fuzz::ownFiles() + "/book.xlsx";
+    fuzz::writeFile(path, packageOf(Input(data, size)));
+    fuzz::leavingNothing([] { openPackage(path); });
+    const boost::filesystem::directory_iterator files(fuzz::ownFiles());
+    require(std::distance(begin(files), end(files)) == 1, "a file beside the workbook");
+    return 0;
+}

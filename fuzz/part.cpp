@@ -1,0 +1,83 @@
+// One part of an otherwise sound package, in the directory that a package is unpacked into. The
+// first byte chooses the part, the others are its content.
+
+#include <cstdint>
+#include <iterator>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include <boost/filesystem.hpp>
+
+#include "formats/format_codes.h"
+#include "provider/package.h"
+#include "readers/excel_xlsx_reader.h"
+
+#include "fuzz/checks.h"
+#include "fuzz/host.h"
+#include "fuzz/input.h"
+#include "fuzz/parts.h"
+
+namespace {
+
+constexpr const char* kParts[] = {"xl/workbook.xml", "xl/_rels/workbook.xml.rels",
+                                  "xl/sharedStrings.xml", "xl/styles.xml",
+                                  "xl/worksheets/sheet1.xml"};
+
+// The directory of the package; the part that differed last is made sound again.
+class Package {
+  public:
+    Package() : directory_(fuzz::ownFiles()) {
+        for (const auto& [name, content] : fuzz::soundParts()) {
+            boost::filesystem::create_directories(path(name).parent_path());
+            fuzz::writeFile(path(name).string(), content);
+        }
+    }
+    void set(const std::string& name, const std::string& content) {
+        if (name != different_ && !different_.empty())
+            fuzz::writeFile(path(different_).string(), fuzz::soundParts().at(different_));
+        different_ = name;
+        fuzz::writeFile(path(name).string(), content);
+    }
+    const std::string& directory() const { return directory_; }
+
+  private:
+    boost::filesystem::path path(const std::string& name) const {
+        return boost::filesystem::path(directory_) / name;
+    }
+
+    std::string directory_;
+    std::string different_;
+};
+
+void readPackage(const std::string& directory) {
+    dp::checkWorkbook(directory);
+    const auto provider = fuzz::referenceTo(new fuzz::ReadingProvider);
+    provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
+    try {
+        provider->read(std::make_unique<dp::ExcelXLSXReader>(
+            directory, true, dp::GetShortDateMask(), provider->GetMissingVxlValue(), provider.get(),
+            provider->GetDateTimeVariableFormatHelper()));
+    } catch (const CmXmlException& e) {
+        fuzz::require(e.code() == kXmlError, "another code");
+    }
+    fuzz::takeEverything(*provider);
+    provider->CloseFile();
+    std::vector<std::string> names;
+    try {
+        dp::excel_xlsx::GetWorksheets(directory, names);
+    } catch (const CmXmlException& e) {
+        fuzz::require(e.code() == kXmlError, "another code");
+    }
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+    static Package package;
+    fuzz::Input input(data, size);
+    const char* part = kParts[input.byte() % std::size(kParts)];
+    package.set(part, input.rest());
+    fuzz::leavingNothing([] { readPackage(package.directory()); });
+    return 0;
+}

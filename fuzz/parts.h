@@ -1,0 +1,11 @@
+#pragma once
+
+#include <map>
+#include <string>
+
+namespace fuzz {
+
+// The parts of a small sound workbook by their names: two worksheets, shared strings, styles.
+const std::map<std::string, std::string>& soundParts();
+
+}  // namespace fuzz
