@@ -1,10 +1,47 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 
 // What a workbook may do to the machine. Every limit is far beyond what any program writes; what
 // trips one is refused at once. docs/security.md explains them to users.
 namespace dp {
+
+// --- The package, while it is unpacked ---
+
+// Entries. A workbook of 10,000 worksheets, each with drawings, comments and their relationships,
+// has 60,000; each costs the file system a file, however few bytes it holds.
+inline constexpr std::uint64_t kPackageEntries = 250'000;
+
+// Bytes unpacked per byte of the package. Single parts of honest workbooks reach 121, whole
+// packages stay far below; deflate cannot exceed 1,032, overlapping entries can.
+inline constexpr std::uint64_t kUnpackedGrowth = 200;
+// Bytes that count for nothing in that: what every machine can spare for a moment.
+inline constexpr std::uint64_t kUnpackedAllowance = 256ULL << 20;
+
+// The part of the temporary directory's free space that is left to others, as a divisor.
+inline constexpr std::uint64_t kSpareSpaceDivisor = 16;
+// Bytes written between two looks at the free space, which others use too.
+inline constexpr std::uint64_t kSpaceCheckInterval = 16ULL << 20;
+
+// --- The parts, while they are read ---
+
+// Elements one in the other, below the outermost. libxml2 stops there by itself unless told
+// otherwise; parts nest about ten.
+inline constexpr int kXmlDepth = 256;
+
+// Bytes of one tag, comment or other markup, beside what libxml2 reads ahead. Lists of thousands of
+// cell ranges stand in one attribute; but libxml2 compares every attribute of an element with every
+// other, and copies a whole comment for every error in it.
+inline constexpr std::size_t kMarkupSize = 256 << 10;
+// Bytes from which markup is looked at more closely, and how many attributes or hyphens it may have
+// then.
+inline constexpr std::size_t kLongMarkup = 16 << 10;
+inline constexpr std::size_t kLongMarkupMarks = 4096;
+
+// Bytes of an entity that a document declares. No part declares any; libxml2 limits how they nest
+// from this size on, but not how often a large one is used in attributes.
+inline constexpr int kEntitySize = 1000;
 
 // --- The texts, while they are copied into the store ---
 

@@ -9,6 +9,7 @@
 
 #include "readers/cm_xml_cast.h"
 #include "readers/file_copy.h"
+#include "readers/part_input.h"
 #include "readers/silence.h"
 
 namespace {
@@ -18,23 +19,9 @@ namespace fs = boost::filesystem;
 // libxml2 takes a path with a scheme for the address of another file, on another machine even.
 bool looksLikeAddress(const std::string& path) { return path.find("://") != path.npos; }
 
-// The path as libxml2 wants it: it takes a percent sign for the start of an escape, by which a name
-// could lead to another file, out of its directory even.
-std::string escaped(const std::string& path) {
-    std::string text;
-    for (const char byte : path) byte == '%' ? text.append("%25") : text.append(1, byte);
-    return text;
-}
-
 // Null for a path that libxml2 cannot open, or under which it would open something else.
 xmlTextReaderPtr openFile(const std::string& path) {
-    boost::system::error_code error;
-    if (looksLikeAddress(path) || !fs::exists(path, error)) return nullptr;
-    xmlTextReaderPtr reader =
-        xmlReaderForFile(escaped(path).c_str(), nullptr, XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
-    // The options alone do not keep libxml2 quiet: it still prints a line for a text of over 10 MB.
-    if (reader) xmlTextReaderSetStructuredErrorHandler(reader, dp::SilentLibxml2::ignore, nullptr);
-    return reader;
+    return looksLikeAddress(path) ? nullptr : dp::openDocument(path);
 }
 
 // The path of a private copy of `path`; empty when it could not be made. Throws the file system's
@@ -69,7 +56,8 @@ void XmlReader::mInitialize(const std::string& path) {
         tempCopy = !tempPath.empty();
         if (tempCopy) textReader = openFile(tempPath);
     }
-    if (!textReader || !readNode()) throw CmXmlException(kXmlError);
+    if (!textReader || !readNode() || dp::declaresTooMuch(textReader))
+        throw CmXmlException(kXmlError);
 }
 
 bool XmlReader::readNode() {

@@ -4,12 +4,14 @@
 #include <cstdlib>
 #include <cstring>
 #include <random>
+#include <regex>
 
 #include <gmock/gmock.h>
 #include <libxml/xmlerror.h>
 #include <libxml/xmlreader.h>
 
 #include "readers/cm_xml_cast.h"
+#include "readers/limits.h"
 #include "tests/case_table.h"
 #include "tests/temporary_files.h"
 
@@ -92,7 +94,14 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
         "<!DOCTYPE a [<!ENTITY a \"ha\"><!ENTITY b \"&a;&a;&a;&a;&a;&a;&a;&a;\">"
         "<!ENTITY c \"&b;&b;&b;&b;&b;&b;&b;&b;\"><!ENTITY d \"&c;&c;&c;&c;&c;&c;&c;&c;\">]>"
         "<a>&d;&d;&d;&d;</a>";
-    const std::string huge = "<a>" + std::string(12'000'000, 'x') + "</a>";
+    const auto repeated = [](int times, const std::string& text, const std::string& frame) {
+        std::string all;
+        for (; times > 0; --times) all += text + std::to_string(times) + "='' ";
+        return std::regex_replace(frame, std::regex("@"), all);
+    };
+    const auto sized = [](std::size_t size, const std::string& frame) {
+        return std::regex_replace(frame, std::regex("@"), std::string(size, 'x'));
+    };
     const struct {
         const char* name;
         std::string document;
@@ -101,11 +110,25 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
                  {"no XML", "PK", 13},
                  {"cut in half", "<a><b>text</b><b>te", 13},
                  {"well-formed", "<a><b>text</b></a>", 0},
-                 {"deep", nested(300), 13},
-                 {"less deep", nested(200), 0},
+                 {"deep", nested(dp::kXmlDepth + 2), 13},
+                 {"less deep", nested(dp::kXmlDepth + 1), 0},
                  {"external entity", external, 0},
                  {"nested entities", bomb, 13},
-                 {"12 MB of text", huge, 13}};
+                 {"12 MB of text", sized(12'000'000, "<a>@</a>"), 13},
+                 {"9 MB of text", sized(9'000'000, "<a>@</a>"), 0},
+                 {"9 MB of text in another encoding",
+                  sized(9'000'000, "<?xml version='1.0' encoding='windows-1252'?><a>@\xE9</a>"), 0},
+                 {"a long attribute", sized(dp::kMarkupSize - 10'000, "<a b='@'/>"), 0},
+                 {"an attribute too long", sized(dp::kMarkupSize + 10'000, "<a b='@'/>"), 13},
+                 {"a comment too long", sized(dp::kMarkupSize + 10'000, "<a><!--@--></a>"), 13},
+                 {"many attributes", repeated(1000, "b", "<a @/>"), 0},
+                 {"too many attributes", repeated(10'000, "b", "<a @/>"), 13},
+                 {"an entity", sized(dp::kEntitySize, "<!DOCTYPE a [<!ENTITY e '@'>]><a b='&e;'/>"), 0},
+                 {"a long entity", sized(dp::kEntitySize + 1, "<!DOCTYPE a [<!ENTITY e '@'>]><a b='&e;'/>"), 13},
+                 {"declared attributes", "<!DOCTYPE a [<!ATTLIST a b IDREF #IMPLIED>]><a b='c'/>", 13},
+                 {"a compressed document",
+                  {"\x1F\x8B\x08\0\0\0\0\0\x02\x03\xB3\x49\xD4\xB7\x03\0\xD4\x1C\xD1\x01\x04\0\0\0", 24},
+                  13}};
     testing::internal::CaptureStderr();
     for (const auto& c : cases) EXPECT_EQ(codeOfReading(c.document), c.code) << c.name;
     EXPECT_THROW(XmlReader().mInitialize(file("nowhere.xml")), CmXmlException);

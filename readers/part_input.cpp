@@ -1,0 +1,110 @@
+#include "readers/part_input.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstdint>
+#include <memory>
+
+#include <libxml/xmlreader.h>
+
+#include "readers/limits.h"
+#include "readers/silence.h"
+
+namespace dp {
+
+namespace {
+
+// The file behind a reader, and how far libxml2 has come in it.
+class PartInput {
+  public:
+    explicit PartInput(const std::string& path)
+        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)) {}
+    ~PartInput() {
+        if (isOpen()) ::close(descriptor_);
+    }
+    PartInput(const PartInput&) = delete;
+    PartInput& operator=(const PartInput&) = delete;
+
+    bool isOpen() const { return descriptor_ >= 0; }
+    void watch(xmlTextReaderPtr reader) { reader_ = reader; }
+
+    // Up to `size` bytes; 0 at the end, -1 on an error and for markup beyond the limits.
+    int read(char* bytes, int size) {
+        const std::size_t waiting = bytesWaiting();
+        if (waiting > kMarkupSize) return -1;
+        ssize_t count = -1;
+        do count = ::read(descriptor_, bytes, static_cast<std::size_t>(size));
+        while (count < 0 && errno == EINTR);
+        if (count <= 0) return static_cast<int>(count);
+        supplied_ += count;
+        marks_ = waiting > kLongMarkup ? marks_ + marksIn(bytes, bytes + count) : 0;
+        return marks_ > kLongMarkupMarks ? -1 : static_cast<int>(count);
+    }
+
+  private:
+    // What libxml2 has got and not used. It uses text as it comes, but keeps markup until that is
+    // complete.
+    std::size_t bytesWaiting() const {
+        const long used = reader_ ? xmlTextReaderByteConsumed(reader_) : supplied_;
+        return used < 0 || used > supplied_ ? 0 : static_cast<std::size_t>(supplied_ - used);
+    }
+    static std::size_t marksIn(const char* begin, const char* end) {
+        return static_cast<std::size_t>(
+            std::count_if(begin, end, [](char c) { return c == '=' || c == '-'; }));
+    }
+
+    int descriptor_;
+    xmlTextReaderPtr reader_ = nullptr;
+    std::int64_t supplied_ = 0;  // bytes
+    std::size_t marks_ = 0;      // in the long markup that is waiting
+};
+
+extern "C" {
+
+int readPart(void* input, char* bytes, int size) {
+    return static_cast<PartInput*>(input)->read(bytes, size);
+}
+
+int closePart(void* input) {
+    delete static_cast<PartInput*>(input);
+    return 0;
+}
+
+void noteLongEntity(void* payload, void* found, const xmlChar*) {
+    const auto* entity = static_cast<const xmlEntity*>(payload);
+    if (entity->content && entity->length > kEntitySize) *static_cast<bool*>(found) = true;
+}
+
+}  // extern "C"
+
+}  // namespace
+
+xmlTextReaderPtr openDocument(const std::string& path) {
+    auto input = std::make_unique<PartInput>(path);
+    if (!input->isOpen()) return nullptr;
+    PartInput* const watching = input.get();
+    // The reader closes the input, also when it cannot be made.
+    const xmlTextReaderPtr reader =
+        xmlReaderForIO(readPart, closePart, input.release(), nullptr, nullptr,
+                       XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
+    if (!reader) return nullptr;
+    watching->watch(reader);
+    // The options alone do not keep libxml2 quiet: it still prints a line for a text of over 10 MB.
+    xmlTextReaderSetStructuredErrorHandler(reader, SilentLibxml2::ignore, nullptr);
+    return reader;
+}
+
+bool declaresTooMuch(xmlTextReaderPtr reader) {
+    const xmlNode* node = xmlTextReaderCurrentNode(reader);
+    const xmlDtd* declarations = node && node->doc ? node->doc->intSubset : nullptr;
+    if (!declarations) return false;
+    bool tooMuch = declarations->attributes != nullptr;
+    if (declarations->entities)
+        xmlHashScan(static_cast<xmlHashTablePtr>(declarations->entities), noteLongEntity, &tooMuch);
+    return tooMuch;
+}
+
+}  // namespace dp
