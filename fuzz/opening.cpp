@@ -1,0 +1,45 @@
+#include "fuzz/opening.h"
+
+#include <algorithm>
+#include <iterator>
+#include <vector>
+
+#include "model/host/entry_points.h"
+#include "readers/xml_reader.h"
+
+#include "fuzz/checks.h"
+#include "fuzz/host.h"
+
+namespace fuzz {
+
+namespace {
+
+bool isResultOfOpening(long result) {
+    constexpr long kResults[] = {0, -1, -22, -25};  // what the file's bytes can lead to
+    return std::find(std::begin(kResults), std::end(kResults), result) != std::end(kResults);
+}
+
+}  // namespace
+
+long openAsHost(const std::string& path) {
+    dp::IDataProvider* created = nullptr;
+    require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
+    const auto provider = referenceTo(created);
+    provider->SetDateTimeVariableFormatHelper(new Helper);
+    std::vector<std::string> names;
+    require(isResultOfOpening(provider->GetWorksheets(path.c_str(), names)), "another result");
+    long result = 0;
+    try {
+        result = provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read);
+        require(isResultOfOpening(result), "another result");
+    } catch (const CmXmlException& e) {
+        require(e.code() == kXmlError, "another code");
+        result = e.code();
+    }
+    takeEverything(*provider);
+    provider->CloseFile();
+    takeEverything(*provider);
+    return result;
+}
+
+}  // namespace fuzz
