@@ -43,6 +43,7 @@ long resultCode(PackageStatus status) {
         case PackageStatus::NotAWorkbook:
             return -25;
         case PackageStatus::EntryError:
+        case PackageStatus::TooLarge:
         case PackageStatus::ArchiveNotClosed:
             return -1;
     }

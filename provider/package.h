@@ -10,6 +10,7 @@ enum class PackageStatus : int {
     Success = 0,
     SourceMissing = 3,      // no such file, or not a regular one
     EntryError = 5,         // an entry cannot be read, written or checked
+    TooLarge = 6,           // beyond a limit
     NotAPackage = 7,        // another extension, or not a ZIP archive
     DirectoryUnusable = 9,  // the temporary directory, or the copy in it, cannot be made
     ArchiveNotClosed = 10,
@@ -21,7 +22,8 @@ long resultCode(PackageStatus status);
 
 // Unpacks the archive at `archive` into `directory`, an absolute path that exists. Entries are
 // streamed; nothing outside the directory is written, and the archive itself is not overwritten.
-// What was written stays there after a failure.
+// What was written stays there after a failure. A package that claims more than the limits, or than
+// the file system has, is refused before anything is written.
 PackageStatus unpackArchive(const std::string& archive, const std::string& directory);
 
 // Whether the unpacked package in `directory` is a workbook. Throws the file system's error when

@@ -2,7 +2,9 @@
 
 #include <unistd.h>
 
+#include <limits>
 #include <sys/stat.h>
+#include <sys/statvfs.h>
 
 #include <boost/filesystem.hpp>
 
@@ -25,6 +27,14 @@ bool makeOwnDirectory(const std::string& path) {
     if (::chmod(path.c_str(), S_IRWXU) == 0) return true;
     ::rmdir(path.c_str());
     return false;
+}
+
+std::uint64_t freeSpace(const std::string& directory) {
+    struct statvfs status {};
+    // A file system without blocks has no limit, or one that it does not tell.
+    if (::statvfs(directory.c_str(), &status) != 0 || status.f_blocks == 0)
+        return std::numeric_limits<std::uint64_t>::max();
+    return std::uint64_t{status.f_bavail} * status.f_frsize;
 }
 
 void removeDirectoryAndContents(const std::string& path) {

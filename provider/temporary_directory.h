@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 
 #include "model/host/export.h"
@@ -14,6 +15,10 @@ std::string makePrivateDirectory();
 // Makes one directory that its owner alone may use, whatever the umask. False when it cannot be
 // made.
 bool makeOwnDirectory(const std::string& path);
+
+// Bytes that this process may still write into a directory; the largest number where the file
+// system does not tell.
+std::uint64_t freeSpace(const std::string& directory);
 
 // Removes a directory with everything below it; a path that names no directory is left alone, and
 // what cannot be removed stays.

@@ -1,8 +1,11 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
+#include <cstdint>
+#include <limits>
 #include <memory>
 #include <sys/stat.h>
 #include <utility>
@@ -13,6 +16,7 @@
 #include "provider/entry_name.h"
 #include "provider/package.h"
 #include "provider/temporary_directory.h"
+#include "readers/limits.h"
 
 // The archive's entries, one after the other, into the private directory.
 namespace dp {
@@ -60,22 +64,60 @@ class OutputFile {
     int descriptor_;
 };
 
+// What an archive claims to hold. Its entries unpack to no more bytes than they claim.
+struct Claims {
+    std::uint64_t entries = 0;
+    std::uint64_t bytes = 0;  // the largest number for more
+};
+
+// Of the entries up to the first damaged one; up to the first one too many.
+Claims claimsOf(unzFile archive) {
+    Claims claims;
+    for (int result = unzGoToFirstFile(archive); result == UNZ_OK;
+         result = unzGoToNextFile(archive)) {
+        unz_file_info64 info{};
+        if (unzGetCurrentFileInfo64(archive, &info, nullptr, 0, nullptr, 0, nullptr, 0) != UNZ_OK)
+            break;
+        const std::uint64_t room = std::numeric_limits<std::uint64_t>::max() - claims.bytes;
+        claims.bytes += std::min<std::uint64_t>(info.uncompressed_size, room);
+        if (++claims.entries > kPackageEntries) break;
+    }
+    return claims;
+}
+
+bool exceedsLimits(const Claims& claims, std::uint64_t packageSize, std::uint64_t space) {
+    return claims.entries > kPackageEntries || claims.bytes > space ||
+           claims.bytes > kUnpackedAllowance + kUnpackedGrowth * packageSize;
+}
+
 class Unpacking {
   public:
     Unpacking(unzFile archive, const std::string& archivePath, const std::string& directory)
         : archive_(archive), archivePath_(archivePath), directory_(directory) {}
 
     PackageStatus run() {
-        int result = unzGoToFirstFile(archive_);
-        while (result == UNZ_OK) {
-            result = unpackEntry();
-            if (result == UNZ_OK) result = unzGoToNextFile(archive_);
-        }
+        const std::uint64_t space = freeSpace(directory_);
+        spareSpace_ = space / kSpareSpaceDivisor;
+        boost::system::error_code unknown;  // the archive is open, so that it has a size
+        const std::uint64_t size = fs::file_size(archivePath_, unknown);
+        if (unknown || exceedsLimits(claimsOf(archive_), size, space - spareSpace_))
+            return PackageStatus::TooLarge;
+        const int result = unpackEntries();
+        if (spaceIsShort_) return PackageStatus::TooLarge;
         return result == UNZ_END_OF_LIST_OF_FILE ? PackageStatus::Success
                                                  : PackageStatus::EntryError;
     }
 
   private:
+    int unpackEntries() {
+        int result = unzGoToFirstFile(archive_);
+        while (result == UNZ_OK) {
+            result = unpackEntry();
+            if (result == UNZ_OK) result = unzGoToNextFile(archive_);
+        }
+        return result;
+    }
+
     int unpackEntry() {
         std::array<char, kLongestName + 1> name{};
         const int result = unzGetCurrentFileInfo64(archive_, nullptr, name.data(), kLongestName,
@@ -119,14 +161,27 @@ class Unpacking {
         std::array<char, kBufferSize> buffer;
         int size = 0;
         while ((size = unzReadCurrentFile(archive_, buffer.data(), kBufferSize)) > 0)
-            if (!file.write(buffer.data(), static_cast<std::size_t>(size))) return kEntryFailed;
+            if (!hasSpaceFor(size) || !file.write(buffer.data(), static_cast<std::size_t>(size)))
+                return kEntryFailed;
         if (!file.close()) return kEntryFailed;
         return size;
+    }
+
+    // Others write to the same file system.
+    bool hasSpaceFor(int size) {
+        unchecked_ += static_cast<std::uint64_t>(size);
+        if (unchecked_ < kSpaceCheckInterval) return true;
+        unchecked_ = 0;
+        spaceIsShort_ = freeSpace(directory_) < spareSpace_;
+        return !spaceIsShort_;
     }
 
     unzFile archive_;
     const std::string& archivePath_;
     const std::string& directory_;
+    std::uint64_t spareSpace_ = 0;  // bytes
+    std::uint64_t unchecked_ = 0;   // bytes written since the last look at the free space
+    bool spaceIsShort_ = false;
 };
 
 }  // namespace

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cctype>
+#include <new>
 
 #include <boost/filesystem.hpp>
 
@@ -20,7 +21,7 @@ xlsxDataProvider::xlsxDataProvider() = default;
 
 xlsxDataProvider::~xlsxDataProvider() {
     _reader.reset();
-    removeDirectoryAndContents(_tempDirectory);
+    removeUnpackedFile();
 }
 
 PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
@@ -34,17 +35,23 @@ PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     if (directory.empty()) return PackageStatus::DirectoryUnusable;
     _tempDirectory = std::move(directory);
     const fs::path copy = fs::path(_tempDirectory) / source.filename();
-    if (!copyFile(source.string(), copy.string())) {
+    // The disk is not filled first by what will not fit: a file of holes can be of any size.
+    boost::system::error_code unknown;
+    const bool fits = fs::file_size(source, unknown) <= freeSpace(_tempDirectory) || unknown;
+    if (!fits || !copyFile(source.string(), copy.string())) {
         removeDirectoryAndContents(_tempDirectory);
         return PackageStatus::DirectoryUnusable;
     }
     const PackageStatus status = unpackArchive(copy.string(), _tempDirectory);
+    if (status == PackageStatus::TooLarge) removeDirectoryAndContents(_tempDirectory);
     return status == PackageStatus::Success ? checkWorkbook(_tempDirectory) : status;
 }
 
-void xlsxDataProvider::removeUnpackedFile() {
+void xlsxDataProvider::removeUnpackedFile() try {
     removeDirectoryAndContents(_tempDirectory);
     _tempDirectory.clear();
+} catch (const std::bad_alloc&) {
+    // Closing cannot fail. The directory goes with the next open or close, or the last Release.
 }
 
 long xlsxDataProvider::OpenFile(const char* fileName, FileAccess access) {

@@ -1,5 +1,7 @@
 #include "readers/xml_reader.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 #include <cstring>
 #include <string_view>
@@ -44,8 +46,7 @@ XmlReader::XmlReader() = default;
 XmlReader::~XmlReader() {
     if (textReader) xmlFreeTextReader(textReader);
     textReader = nullptr;
-    boost::system::error_code ignored;
-    if (tempCopy) fs::remove(tempPath, ignored);
+    if (tempCopy) ::unlink(tempPath.c_str());
 }
 
 void XmlReader::mInitialize(const std::string& path) {
