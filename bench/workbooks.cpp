@@ -93,31 +93,64 @@ class Package {
     std::string buffer_;
 };
 
+constexpr std::string_view kRelations =
+    "<Relationships xmlns=\"http://schemas.openxmlformats.org/package/2006/relationships\">";
+
 void addStyles(Package& package) {
     std::string styles(kHead);
     styles.append("<styleSheet ").append(kMain).append(">");
     styles += "<numFmts count=\"1\"><numFmt numFmtId=\"164\" formatCode=\"#,##0.000\"/></numFmts>";
-    styles += "<cellXfs count=\"4\"><xf numFmtId=\"0\"/><xf numFmtId=\"2\"/><xf numFmtId=\"14\"/>";
-    styles += "<xf numFmtId=\"164\"/></cellXfs></styleSheet>";
-    package.add("xl/styles.xml", styles);
+    styles += "<fonts count=\"1\"><font><sz val=\"11\"/><name val=\"Calibri\"/></font></fonts>";
+    styles += "<fills count=\"1\"><fill><patternFill patternType=\"none\"/></fill></fills>";
+    styles += "<borders count=\"1\"><border><left/><right/><top/><bottom/></border></borders>";
+    styles += "<cellStyleXfs count=\"1\"><xf numFmtId=\"0\"/></cellStyleXfs><cellXfs count=\"4\">";
+    for (const char* format : {"0", "2", "14", "164"})
+        styles.append("<xf numFmtId=\"").append(format) +=
+            "\" fontId=\"0\" fillId=\"0\" borderId=\"0\" xfId=\"0\" applyNumberFormat=\"1\"/>";
+    package.add("xl/styles.xml", styles + "</cellXfs></styleSheet>");
 }
 
-void addWorkbook(Package& package, unsigned sheets) {
+std::string relation(const std::string& id, const char* type, const std::string& target) {
+    return "<Relationship Id=\"" + id +
+           "\" Type=\"http://schemas.openxmlformats.org/officeDocument/2006/relationships/" + type +
+           "\" Target=\"" + target + "\"/>";
+}
+
+std::string contentType(const std::string& part, const char* type) {
+    return "<Override PartName=\"/xl/" + part +
+           "\" ContentType=\"application/vnd.openxmlformats-officedocument.spreadsheetml." + type +
+           "+xml\"/>";
+}
+
+// The parts that hold the others together.
+void addWorkbook(Package& package, unsigned sheets, bool sharedStrings) {
     std::string workbook(kHead);
-    std::string relations(kHead);
+    std::string relations = std::string(kHead).append(kRelations);
+    std::string types(kHead);
+    types +=
+        "<Types xmlns=\"http://schemas.openxmlformats.org/package/2006/content-types\">"
+        "<Default Extension=\"rels\" "
+        "ContentType=\"application/vnd.openxmlformats-package.relationships+xml\"/>";
+    types += contentType("workbook.xml", "sheet.main") + contentType("styles.xml", "styles");
+    relations += relation("styles", "styles", "styles.xml");
+    if (sharedStrings) {
+        types += contentType("sharedStrings.xml", "sharedStrings");
+        relations += relation("strings", "sharedStrings", "sharedStrings.xml");
+    }
     workbook.append("<workbook ").append(kMain);
     workbook += " xmlns:r=\"http://schemas.openxmlformats.org/officeDocument/2006/relationships\">";
     workbook += "<bookViews><workbookView/></bookViews><sheets>";
-    relations +=
-        "<Relationships xmlns=\"http://schemas.openxmlformats.org/package/2006/relationships\">";
     for (unsigned i = 1; i <= sheets; ++i) {
         const std::string n = std::to_string(i);
+        const std::string part = "worksheets/sheet" + n + ".xml";
         workbook += "<sheet name=\"Sheet" + n + "\" sheetId=\"" + n + "\" r:id=\"rId" + n + "\"/>";
-        relations += "<Relationship Id=\"rId" + n +
-                     "\" Type=\"http://schemas.openxmlformats.org/officeDocument/2006/"
-                     "relationships/worksheet\" Target=\"worksheets/sheet" +
-                     n + ".xml\"/>";
+        relations += relation("rId" + n, "worksheet", part);
+        types += contentType(part, "worksheet");
     }
+    package.add("[Content_Types].xml", types + "</Types>");
+    package.add("_rels/.rels", std::string(kHead).append(kRelations) +
+                                   relation("rId1", "officeDocument", "xl/workbook.xml") +
+                                   "</Relationships>");
     package.add("xl/workbook.xml", workbook + "</sheets></workbook>");
     package.add("xl/_rels/workbook.xml.rels", relations + "</Relationships>");
 }
@@ -188,10 +221,10 @@ void writeWorkbook(const std::string& path, const Workload& workload) {
     Package package(path);
     Random random;
     const auto strings = static_cast<unsigned>(workload.cells() / 2 + 1);
-    package.add("[Content_Types].xml", std::string(kHead) + "<Types/>");
+    const bool sharedStrings = workload.content != Content::Numbers;
+    addWorkbook(package, workload.sheets, sharedStrings);
     addStyles(package);
-    addWorkbook(package, workload.sheets);
-    if (workload.content != Content::Numbers) addSharedStrings(package, strings);
+    if (sharedStrings) addSharedStrings(package, strings);
     for (unsigned sheet = 1; sheet <= workload.sheets; ++sheet)
         addWorksheet(package, sheet, workload, strings, random);
 }
