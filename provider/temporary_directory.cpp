@@ -14,11 +14,12 @@ namespace fs = boost::filesystem;
 
 std::string makePrivateDirectory() {
     boost::system::error_code error;
-    // Absolute, because the host may change its working directory before the file is closed.
-    const fs::path directory =
-        fs::absolute(fs::temp_directory_path()) / fs::unique_path("%%%%-%%%%", error);
-    if (error) return {};
-    return makeOwnDirectory(directory.string()) ? directory.string() : std::string();
+    // Absolute, because the host may change its working directory before the file is closed. The
+    // whole name before the directory: from then on nothing may fail.
+    std::string directory =
+        (fs::absolute(fs::temp_directory_path()) / fs::unique_path("%%%%-%%%%", error)).string();
+    if (error || !makeOwnDirectory(directory)) directory.clear();
+    return directory;
 }
 
 bool makeOwnDirectory(const std::string& path) {

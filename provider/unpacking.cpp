@@ -6,13 +6,13 @@
 #include <cerrno>
 #include <cstdint>
 #include <limits>
-#include <memory>
 #include <sys/stat.h>
 #include <utility>
 
 #include <boost/filesystem.hpp>
 #include <minizip/unzip.h>
 
+#include "provider/archive.h"
 #include "provider/entry_name.h"
 #include "provider/package.h"
 #include "provider/temporary_directory.h"
@@ -187,14 +187,11 @@ class Unpacking {
 }  // namespace
 
 PackageStatus unpackArchive(const std::string& archivePath, const std::string& directory) {
-    const unzFile archive = unzOpen64(archivePath.c_str());
-    if (!archive) return PackageStatus::NotAPackage;
-    // Closed when an allocation fails on the way.
-    std::unique_ptr<void, int (*)(unzFile)> owner(archive, unzClose);
-    const PackageStatus status = Unpacking(archive, archivePath, directory).run();
-    const int closed = unzClose(owner.release());
-    return status == PackageStatus::Success && closed != UNZ_OK ? PackageStatus::ArchiveNotClosed
-                                                                : status;
+    Archive archive(archivePath);
+    if (!archive.handle()) return PackageStatus::NotAPackage;
+    const PackageStatus status = Unpacking(archive.handle(), archivePath, directory).run();
+    const bool closed = archive.close() == UNZ_OK;
+    return status == PackageStatus::Success && !closed ? PackageStatus::ArchiveNotClosed : status;
 }
 
 }  // namespace dp

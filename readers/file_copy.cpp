@@ -1,5 +1,7 @@
 #include "readers/file_copy.h"
 
+#include <unistd.h>
+
 #include <filesystem>
 #include <system_error>
 
@@ -7,9 +9,17 @@ namespace dp {
 
 bool copyFile(const std::string& source, const std::string& target) {
     namespace fs = std::filesystem;
+    const fs::path from(source);
+    const fs::path to(target);
     std::error_code error;
-    if (!fs::copy_file(source, target, fs::copy_options::none, error) || error) return false;
-    fs::permissions(target, fs::perms::owner_read | fs::perms::owner_write, error);
+    try {
+        if (fs::copy_file(from, to, fs::copy_options::none, error) && !error)
+            fs::permissions(to, fs::perms::owner_read | fs::perms::owner_write, error);
+    } catch (...) {
+        ::unlink(to.c_str());
+        throw;
+    }
+    if (error && error != std::errc::file_exists) ::unlink(to.c_str());
     return !error;
 }
 

@@ -30,9 +30,9 @@ xmlTextReaderPtr openFile(const std::string& path) {
 // error when there is no temporary directory.
 std::string copyToTemporary(const std::string& path) {
     boost::system::error_code error;
-    const fs::path copy = fs::temp_directory_path() / fs::unique_path("%%%%-%%%%", error);
-    if (error) return {};
-    return dp::copyFile(path, copy.string()) ? copy.string() : std::string();
+    std::string copy = (fs::temp_directory_path() / fs::unique_path("%%%%-%%%%", error)).string();
+    if (!error && dp::copyFile(path, copy)) return copy;
+    return {};
 }
 
 }  // namespace
