@@ -2,6 +2,8 @@
 // 0xFF and with its top bit flipped; of every STRIDE bytes one. Each is opened as a host does it
 // and must leave nothing behind. In between, the sound workbook opens as before.
 
+#include <malloc.h>
+
 #include <cstdio>
 #include <cstdlib>
 #include <map>
@@ -48,6 +50,17 @@ void spoil(const std::string& bytes, std::size_t stride, Use use) {
     }
 }
 
+// Opens the sound workbook again and again; memory must stay as it was.
+void openOften() {
+    constexpr int kTimes = 300;
+    constexpr std::size_t kBytes = 4096;  // in which nothing adds up
+    const std::string sound = packageOf(fuzz::soundParts());
+    open(sound);
+    const std::size_t before = ::mallinfo2().uordblks;
+    for (int i = 0; i < kTimes; ++i) open(sound);
+    fuzz::require(::mallinfo2().uordblks < before + kBytes, "memory grows from open to open");
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
@@ -60,6 +73,7 @@ int main(int argc, char** argv) {
             parts[name] = spoilt;
             open(packageOf(parts));
         });
+    openOften();
     for (const auto& [result, count] : results) std::printf("%4ld: %d\n", result, count);
     return 0;
 }

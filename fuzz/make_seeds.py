@@ -104,6 +104,15 @@ def seeds_of_cases():
         yield "text", f"number-{i}", bytes([i % 2, 5]) + text
 
 
+    broken = b"<worksheet>\x80\xff\xfd" + b"\x81" * 5000 + b"</worksheet>"
+    for encoding in (b"Shift_JIS", b"UTF-7", b"UTF-16", b"windows-1252", b"nonsense"):
+        head = b"<?xml version='1.0' encoding='" + encoding + b"'?>"
+        for name in PARTS:
+            stem = f"{encoding.decode()}-{pathlib.PurePath(name).stem}"
+            yield "part", stem, part(name, head + broken)
+        yield "spreadsheet_2003", encoding.decode(), head + broken
+
+
 def seeds_of_packages():
     rows = b"<row><c><v>1</v></c><c t='s'><v>0</v></c></row>"
     yield "package", "described-sound", package(entry(4, worksheet(rows)))

@@ -1,5 +1,9 @@
 // replay PATH...: runs a fuzz target once over every file named, or below every directory named,
-// without a fuzzer. What is wrong ends the process; the name of the file is printed first.
+// without a fuzzer. What is wrong ends the process; the name of the file is printed first. As under
+// the fuzzer, the process's own streams lead nowhere meanwhile, so that what is printed is noticed.
+
+#include <fcntl.h>
+#include <unistd.h>
 
 #include <cstdint>
 #include <cstdio>
@@ -14,11 +18,24 @@ namespace {
 
 namespace fs = boost::filesystem;
 
+const int names = ::dup(STDOUT_FILENO);
+
+// Of the sanitizers, where there are any.
+extern "C" [[gnu::weak]] void __sanitizer_set_report_fd(void* descriptor);
+
+void closeStreams() {
+    static const std::intptr_t errors = ::dup(STDERR_FILENO);
+    if (__sanitizer_set_report_fd) __sanitizer_set_report_fd(reinterpret_cast<void*>(errors));
+    const int nowhere = ::open("/dev/null", O_WRONLY | O_CLOEXEC);
+    ::dup2(nowhere, STDOUT_FILENO);
+    ::dup2(nowhere, STDERR_FILENO);
+    ::close(nowhere);
+}
+
 void run(const fs::path& path) {
     std::string content;
     fs::load_string_file(path, content);
-    std::printf("%s\n", path.filename().c_str());
-    std::fflush(stdout);
+    ::dprintf(names, "%s\n", path.filename().c_str());
     LLVMFuzzerTestOneInput(reinterpret_cast<const std::uint8_t*>(content.data()), content.size());
 }
 
@@ -32,7 +49,8 @@ int main(int argc, char** argv) {
             for (const fs::path& entry : fs::recursive_directory_iterator(fs::absolute(argv[i])))
                 if (fs::is_regular_file(entry)) files.push_back(entry);
     }
+    closeStreams();
     for (const fs::path& file : files) run(file);
-    std::printf("%zu inputs\n", files.size());
+    ::dprintf(names, "%zu inputs\n", files.size());
     return files.empty() ? 1 : 0;
 }

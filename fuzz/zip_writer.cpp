@@ -2,6 +2,8 @@
 
 #include <zlib.h>
 
+#include <algorithm>
+
 namespace fuzz {
 
 namespace {
@@ -63,8 +65,9 @@ std::string ZipWriter::finished() const {
     std::string archive = local_ + directory_;
     put(archive, 0x06054b50, 4);
     put(archive, 0, 4);
-    put(archive, entries_, 2);
-    put(archive, entries_, 2);
+    const unsigned entries = std::min(entries_, 0xFFFFU);  // for that and more
+    put(archive, entries, 2);
+    put(archive, entries, 2);
     put(archive, directory_.size(), 4);
     put(archive, local_.size(), 4);
     put(archive, 0, 2);

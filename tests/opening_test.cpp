@@ -1,6 +1,5 @@
 #include <unistd.h>
 
-#include <clocale>
 #include <sys/stat.h>
 
 #include "model/host/entry_points.h"
@@ -220,29 +219,6 @@ TEST_F(Opening, StaysUsableAfterFailures) {
     EXPECT_EQ(provider.taken(), "+S1 @1 +S2 @2 0,0=1 +S3 @3 0,0=1 -1 @0");
     EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 3UL);
     EXPECT_EQ(provider.GetWorksheetRowCount(1), 1U);
-}
-
-TEST_F(Opening, ReportsAMissingTemporaryDirectory) {
-    ::setenv("TMPDIR", file("nowhere").c_str(), 1);
-    sound().write(file("book.xlsx"));
-    EXPECT_THROW(open(file("book.xlsx")), fs::filesystem_error);
-    ::setenv("TMPDIR", temporary().c_str(), 1);
-}
-
-TEST_F(Opening, PrintsNothingWhateverTheEncoding) {
-    const std::string bad = "<?xml version='1.0' encoding='Shift_JIS'?><worksheet>\x80\xff\xfd" +
-                            std::string(5000, '\x81') + "</worksheet>";
-    testing::internal::CaptureStderr();
-    testing::internal::CaptureStdout();
-    for (const char* part : {"xl/worksheets/sheet1.xml", "xl/workbook.xml", "xl/styles.xml", "xl/sharedStrings.xml"}) {
-        try {
-            openPackage(sound().set(part, bad));
-        } catch (const CmXmlException&) {
-        }
-        provider.CloseFile();
-    }
-    EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
-    EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
 }
 
 }  // namespace

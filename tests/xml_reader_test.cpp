@@ -7,7 +7,6 @@
 #include <regex>
 
 #include <gmock/gmock.h>
-#include <libxml/xmlerror.h>
 #include <libxml/xmlreader.h>
 
 #include "readers/cm_xml_cast.h"
@@ -140,20 +139,6 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
     while (reader.readNode())
         if (reader.nodeType() == XML_READER_TYPE_TEXT) text += reader.nodeValue();
     EXPECT_EQ(text, "") << "external entities are not fetched";
-}
-
-int errorsSeen = 0;
-void countErrors(void*, xmlErrorPtr) { ++errorsSeen; }
-
-TEST_F(XmlReading, LeavesTheHandlersOfTheHostAlone) {
-    int context = 0;
-    xmlSetStructuredErrorFunc(&context, countErrors);
-    EXPECT_THROW(XmlReader().mInitialize(file("nowhere.xml")), CmXmlException);
-    EXPECT_EQ(codeOfReading("<a><b></a>"), 13);
-    EXPECT_EQ(errorsSeen, 0);
-    EXPECT_EQ(xmlStructuredError, &countErrors);
-    EXPECT_EQ(xmlStructuredErrorContext, &context);
-    xmlSetStructuredErrorFunc(nullptr, nullptr);
 }
 
 TEST_F(XmlReading, ReadsAPrivateCopyWhereLibxml2CannotOpenThePath) {
