@@ -4,7 +4,9 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
+#include <cstddef>
 #include <cstdint>
 #include <memory>
 
@@ -35,16 +37,26 @@ class PartInput {
     int read(char* bytes, int size) {
         const std::size_t waiting = bytesWaiting();
         if (waiting > kMarkupSize) return -1;
-        ssize_t count = -1;
-        do count = ::read(descriptor_, bytes, static_cast<std::size_t>(size));
-        while (count < 0 && errno == EINTR);
-        if (count <= 0) return static_cast<int>(count);
+        if (next_ == end_ && !fill()) return -1;
+        const std::ptrdiff_t count = std::min<std::ptrdiff_t>(size, end_ - next_);
+        std::copy_n(next_, count, bytes);
+        next_ += count;
         supplied_ += count;
         marks_ = waiting > kLongMarkup ? marks_ + marksIn(bytes, bytes + count) : 0;
         return marks_ > kLongMarkupMarks ? -1 : static_cast<int>(count);
     }
 
   private:
+    // libxml2 asks for few bytes at a time. False on an error, and no bytes at the end.
+    bool fill() {
+        ssize_t count = -1;
+        do count = ::read(descriptor_, buffer_.data(), buffer_.size());
+        while (count < 0 && errno == EINTR);
+        next_ = buffer_.data();
+        end_ = next_ + std::max<ssize_t>(count, 0);
+        return count >= 0;
+    }
+
     // What libxml2 has got and not used. It uses text as it comes, but keeps markup until that is
     // complete.
     std::size_t bytesWaiting() const {
@@ -57,6 +69,9 @@ class PartInput {
     }
 
     int descriptor_;
+    std::array<char, std::size_t{32} << 10> buffer_;
+    const char* next_ = nullptr;  // behind what libxml2 has got
+    const char* end_ = nullptr;   // of what is in the buffer
     xmlTextReaderPtr reader_ = nullptr;
     std::int64_t supplied_ = 0;  // bytes
     std::size_t marks_ = 0;      // in the long markup that is waiting

@@ -94,7 +94,7 @@ bool ShortTexts::begin(std::string_view text) {
     *place = static_cast<char>(text.size());
     std::memcpy(place + 1, text.data(), text.size());
     waitingSize_ += size;
-    ++waitingCount_;
+    if (waitingCount_++ >= kFetched) fetchCandidate(waiting_[waitingCount_ - 1 - kFetched]);
     return true;
 }
 
@@ -106,8 +106,9 @@ void ShortTexts::deliverTo(std::uint64_t& place) noexcept {
 }
 
 void ShortTexts::settle() noexcept {
-    for (std::size_t i = 0; i < waitingCount_; ++i) fetchCandidate(waiting_[i]);
     if (!isWaiting()) return;
+    for (std::size_t i = waitingCount_ - std::min(waitingCount_, kFetched); i < waitingCount_; ++i)
+        fetchCandidate(waiting_[i]);
     const char* text = &pages_.back().bytes[pages_.back().used];
     for (std::size_t i = 0; i < waitingCount_; ++i) {
         recent_ = settleOne(waiting_[i], text);

@@ -56,6 +56,8 @@ class ShortTexts {
     static constexpr std::size_t kMostPages = std::size_t{1} << (32 - kUnitBits);
     // More than a processor can fetch at a time.
     static constexpr std::size_t kMostWaiting = 32;
+    // So many texts later, the slots that a text begins with have come in.
+    static constexpr std::size_t kFetched = 8;
 
     struct Page {
         std::unique_ptr<char[]> bytes;
