@@ -1,16 +1,22 @@
 // For comparisons with other programs, which are processes of their own:
 //
-// pull BOOK              opens a workbook as a host does and pulls every column of every worksheet
+// pull BOOK WORKSHEETS ROWS COLUMNS
+//                        opens a workbook as a host does, pulls every column of every worksheet and
+//                        looks at every value; fails when there are not as many as that
 // pull --write DIR [K]   writes the workloads as DIR/NAME.xlsx, with a K-th of the rows (1 by
-//                        default), and prints their names
+//                        default), and prints name, worksheets, rows and columns of each
 
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <string>
+#include <vector>
 
 #include "bench/workbooks.h"
+#include "model/host/i_column.h"
+#include "model/host/i_finders.h"
+#include "model/host/i_string.h"
 #include "provider/xlsx_data_provider.h"
 
 namespace {
@@ -26,39 +32,81 @@ int write(const std::string& directory, unsigned part) {
     for (bench::Workload workload : kWorkloads) {
         workload.rows = std::max(1U, workload.rows / part);
         bench::writeWorkbook(directory + "/" + workload.name + ".xlsx", workload);
-        std::puts(workload.name);
+        std::printf("%s %u %u %u\n", workload.name, workload.sheets, workload.rows,
+                    workload.columns);
     }
     return 0;
 }
 
-// What a host holds at the end: every column of the workbook, at once.
-int pull(const char* book) {
-    dp::xlsxDataProvider provider;
-    if (provider.OpenFile(book, dp::IDataProvider::FileAccess::Read) != 0) return 1;
-    std::vector<dp::IColumn*> columns;
-    const auto& worksheets = *provider.GetWorksheetFinder()->GetWorksheetPrimeKeys();
-    for (unsigned long sheet = 0; sheet < worksheets.Count(); ++sheet) {
-        const auto& keys =
-            *provider.GetVariableFinder()->GetColumnPrimeKeys(worksheets.Item(sheet));
-        for (unsigned long key = 0; key < keys.Count(); ++key) {
-            dp::IColumn* column = nullptr;
-            if (!provider.GetVariableFinder()->FindColumn(keys.Item(key), &column, false)) return 1;
-            column->AddRef();
-            columns.push_back(column);
+// Columns that a host holds, all at once.
+class Columns {
+  public:
+    Columns() = default;
+    ~Columns() {
+        for (dp::IColumn* column : held_) column->Release();
+    }
+    Columns(const Columns&) = delete;
+    Columns& operator=(const Columns&) = delete;
+
+    void pull(dp::IDataProvider& provider) {
+        const auto& worksheets = *provider.GetWorksheetFinder()->GetWorksheetPrimeKeys();
+        dp::IVariableFinder& finder = *provider.GetVariableFinder();
+        for (unsigned long sheet = 0; sheet < worksheets.Count(); ++sheet) {
+            const auto& keys = *finder.GetColumnPrimeKeys(worksheets.Item(sheet));
+            for (unsigned long key = 0; key < keys.Count(); ++key) {
+                dp::IColumn* column = nullptr;
+                if (finder.FindColumn(keys.Item(key), &column, false)) hold(column);
+            }
         }
     }
+
+    unsigned long values() const { return values_; }
+    double sum() const { return sum_; }
+
+  private:
+    void hold(dp::IColumn* column) {
+        column->AddRef();
+        held_.push_back(column);
+        values_ += static_cast<unsigned long>(column->GetRowCount() - column->GetMissingCount());
+        if (column->GetStorageType() == dp::IVariable::StorageType::Text)
+            look(*static_cast<const dp::ITextColumn*>(column)->GetTextValues());
+        else
+            look(static_cast<const dp::INumericColumn*>(column)->GetValues(),
+                 column->GetRowCount());
+    }
+
+    void look(const dp::IReadOnlyCollection<dp::IString&>& texts) {
+        for (unsigned long row = 0; row < texts.Count(); ++row)
+            sum_ += static_cast<double>(std::strlen(texts.Item(row).database_str()));
+    }
+
+    void look(const double* numbers, int count) {
+        for (int row = 0; row < count; ++row) sum_ += numbers[row];
+    }
+
+    std::vector<dp::IColumn*> held_;
+    unsigned long values_ = 0;  // those that are not missing
+    double sum_ = 0;            // of the numbers and the texts' bytes
+};
+
+bool pull(const char* book, unsigned long expected) {
+    dp::xlsxDataProvider provider;
+    provider.SetReadOptionDefaultUseVariableNameRow(dp::VNR_NONE);
+    if (provider.OpenFile(book, dp::IDataProvider::FileAccess::Read) != 0) return false;
+    Columns columns;
+    columns.pull(provider);
     provider.CloseFile();
-    for (dp::IColumn* column : columns) column->Release();
-    return 0;
+    return columns.values() == expected && columns.sum() != 0;
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
+    const auto number = [argv](int argument) { return std::strtoul(argv[argument], nullptr, 10); };
     if (argc >= 3 && std::strcmp(argv[1], "--write") == 0)
-        return write(argv[2],
-                     argc > 3 ? static_cast<unsigned>(std::max(1, std::atoi(argv[3]))) : 1);
-    if (argc == 2) return pull(argv[1]);
-    std::fputs("usage: pull BOOK | pull --write DIRECTORY [PART]\n", stderr);
+        return write(argv[2], argc > 3 ? std::max(1U, static_cast<unsigned>(number(3))) : 1);
+    if (argc >= 5) return pull(argv[1], number(2) * number(3) * number(4)) ? 0 : 1;
+    std::fputs("usage: pull BOOK WORKSHEETS ROWS COLUMNS | pull --write DIRECTORY [PART]\n",
+               stderr);
     return 2;
 }

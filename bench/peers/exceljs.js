@@ -1,4 +1,7 @@
-// All values of all worksheets, in the library's own model.
-const { Workbook } = require("exceljs");
-const book = new Workbook();
-book.xlsx.readFile(process.argv[2]).then(() => process.exit(book.worksheets[0].actualRowCount > 0 ? 0 : 1));
+// All values of all worksheets, in the library's own model:
+// exceljs.js BOOK WORKSHEETS ROWS COLUMNS LAST_CELL
+const [file, sheets, , , cell] = process.argv.slice(2);
+const book = new (require("exceljs").Workbook)();
+book.xlsx.readFile(file).then(() => {
+  if (book.worksheets[sheets - 1].getCell(cell).value === null) process.exit(1);
+});
