@@ -43,6 +43,10 @@ inline constexpr std::size_t kLongMarkupMarks = 4096;
 // from this size on, but not how often a large one is used in attributes.
 inline constexpr int kEntitySize = 1000;
 
+// Bytes of a number-format code. Spreadsheet programs allow 255 characters; every decimal of a code
+// is one of each text that is rendered with it.
+inline constexpr std::size_t kFormatCodeSize = 1024;
+
 // --- The texts, while they are copied into the store ---
 
 // Bytes copied per byte unpacked. One shared string is stored for every cell that shows it: an

@@ -3,6 +3,7 @@
 
 #include "readers/cell_reference.h"
 #include "readers/excel_xml_reader.h"
+#include "readers/limits.h"
 #include "readers/silence.h"
 
 // XML Spreadsheet 2003: the workbook, its styles and its worksheets.
@@ -49,6 +50,7 @@ void ExcelXmlReader::mReadExcelStyles() {
                 styleId = std::move(id);
         } else if (element == kNumberFormat) {
             if (std::string code = xmlReader.attributeText("ss:Format"); !code.empty()) {
+                if (code.size() > kFormatCodeSize) fail();
                 styles.push_back({std::exchange(styleId, {}), std::move(code), EXCEL_FORMAT_NONE});
                 mSetFmtType(styles.back());
             }

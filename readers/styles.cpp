@@ -3,6 +3,7 @@
 #include <string_view>
 
 #include "readers/excel_xlsx_reader.h"
+#include "readers/limits.h"
 
 // The style sheet of a package: number formats, and which of them the cell styles use.
 namespace dp {
@@ -90,6 +91,7 @@ class StyleSheetPass {
         xStyle style;
         style.styleId = reader_.attributeText("numFmtId");
         style.formatCode = reader_.attributeText("formatCode");
+        if (style.formatCode.size() > kFormatCodeSize) throw CmXmlException(kXmlError);
         const auto size = static_cast<std::int64_t>(styles_.size());
         if (style.formatCode.empty() || size >= std::int64_t{declared_} + kBuiltInCount) return;
         owner_.mSetFmtType(style);

@@ -161,8 +161,11 @@ void cellToText(const CellContent& cell, const ConversionSettings& settings, For
 }
 
 void cutToBytes(std::string& text, std::int32_t maxLength) {
-    if (maxLength >= 0 && text.size() > static_cast<std::size_t>(maxLength))
-        text.resize(static_cast<std::size_t>(maxLength));
+    if (maxLength < 0 || text.size() <= static_cast<std::size_t>(maxLength)) return;
+    text.resize(static_cast<std::size_t>(maxLength));
+    // A column of texts cut short would keep the memory of the long ones.
+    constexpr std::size_t kWorthReturning = 256;  // bytes
+    if (text.capacity() > text.size() + kWorthReturning) text.shrink_to_fit();
 }
 
 }  // namespace dp
