@@ -1,0 +1,306 @@
+// Workbooks whose numbers drive work: far corners, thousands of worksheets, relationships and
+// styles, long format codes. Each is opened and its columns are loaded at full size and at half of
+// it: a ratio far above 2 tells of a quadratic road. Each must take less than a second. Then many
+// opens one after the other, which must leave memory, descriptors and the temporary directory as
+// they were.
+//
+// hostile [OPENS]: OPENS of the last, 10,000 by default. The files are made in memory where there
+// is such a file system: a disk takes longer for 10,000 files than all the rest.
+
+#include <malloc.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <functional>
+#include <string>
+#include <sys/resource.h>
+#include <sys/wait.h>
+#include <vector>
+
+#include <boost/filesystem.hpp>
+
+#include "model/host/i_column.h"
+#include "provider/xlsx_data_provider.h"
+#include "readers/limits.h"
+#include "readers/xml_reader.h"
+#include "tests/package_builder.h"
+
+namespace {
+
+namespace fs = boost::filesystem;
+
+constexpr double kMostSeconds = 1.0;
+constexpr double kMostRatio = 3.0;
+
+struct Measurement {
+    double seconds = 0;
+    double megabytes = 0;  // the peak of the process, less what it began with
+    unsigned long rows = 0;
+};
+
+double peakMegabytes() {
+    rusage usage{};
+    getrusage(RUSAGE_SELF, &usage);
+    return static_cast<double>(usage.ru_maxrss) / 1024;
+}
+
+// Opens the workbook as a host that wants blank rows skipped and columns padded, and loads all.
+unsigned long openAndLoad(const std::string& path) {
+    dp::xlsxDataProvider provider;
+    provider.SetReadOptionIgnoreBlankRows(true);
+    provider.SetReadOptionPadColumnsWithMissingValues(true);
+    try {
+        if (provider.OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read) != 0) return 0;
+    } catch (const CmXmlException&) {
+        return 0;
+    }
+    unsigned long rows = 0;
+    const auto& sheets = *provider.GetWorksheetPrimeKeys();
+    for (unsigned long s = 0; s < sheets.Count(); ++s) {
+        const dp::ReadOnlyCollection<int> columns =
+            static_cast<dp::ReadOnlyCollection<int>&>(*provider.GetColumnPrimeKeys(sheets.Item(s)));
+        for (const int key : columns.items) {
+            dp::IColumn* column = nullptr;
+            if (!provider.FindColumn(key, &column, false)) continue;
+            column->AddRef();
+            rows += static_cast<unsigned long>(column->GetRowCount());
+            column->Release();
+        }
+    }
+    return rows;
+}
+
+// In a process of its own, so that no run finds the memory of another.
+Measurement measure(const std::string& path) {
+    int ends[2];
+    if (pipe(ends) != 0) std::abort();
+    const pid_t child = fork();
+    if (child == 0) {
+        Measurement result;
+        const double before = peakMegabytes();
+        const auto start = std::chrono::steady_clock::now();
+        result.rows = openAndLoad(path);
+        result.seconds =
+            std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+        result.megabytes = peakMegabytes() - before;
+        _exit(write(ends[1], &result, sizeof result) == sizeof result ? 0 : 1);
+    }
+    Measurement result;
+    const bool complete = read(ends[0], &result, sizeof result) == sizeof result;
+    waitpid(child, nullptr, 0);
+    close(ends[0]);
+    close(ends[1]);
+    if (!complete) {
+        std::fprintf(stderr, "hostile: a run failed\n");
+        std::exit(1);
+    }
+    return result;
+}
+
+Measurement bestOf(int runs, const std::string& path) {
+    Measurement best = measure(path);
+    for (; runs > 1; --runs) {
+        const Measurement other = measure(path);
+        if (other.seconds < best.seconds) best = other;
+    }
+    return best;
+}
+
+// --- the workbooks ---
+
+const std::string kRow = "<row><c><v>1</v></c></row>";
+
+std::string repeat(unsigned count, const std::function<std::string(const std::string&)>& piece) {
+    std::string all;
+    for (unsigned i = 0; i < count; ++i) all += piece(std::to_string(i));
+    return all;
+}
+
+std::string columnName(unsigned column) {
+    std::string name(1, static_cast<char>('A' + column % 26));
+    return column < 26 ? name : columnName(column / 26 - 1) + name;
+}
+
+PackageBuilder farCorners(unsigned columns) {
+    std::string cells;
+    for (unsigned column = 0; column < columns; ++column)
+        cells += "<c r='" + columnName(column) + "1048576'><v>1</v></c>";
+    return PackageBuilder::of({"<row r='1048576'>" + cells + "</row>"});
+}
+
+// As above, each column's cell in a row of its own, so that few rows are blank in all columns.
+PackageBuilder diagonal(unsigned columns) {
+    std::string rows;
+    for (unsigned column = 0; column < columns; ++column) {
+        const std::string row = std::to_string((column + 1) * (1048576 / columns));
+        rows += "<row r='" + row + "'><c r='" + columnName(column) + row + "'><v>1</v></c></row>";
+    }
+    return PackageBuilder::of({rows});
+}
+
+PackageBuilder manyWorksheets(unsigned sheets) {
+    return PackageBuilder::of(std::vector<std::string>(sheets, kRow));
+}
+
+PackageBuilder manyEmptyWorksheets(unsigned sheets) {
+    return PackageBuilder::of(std::vector<std::string>(sheets, ""));
+}
+
+PackageBuilder manyRelationships(unsigned count) {
+    const auto relation = [](const std::string& i) {
+        return PackageBuilder::relation("x" + i, "worksheet", "worksheets/none" + i + ".xml");
+    };
+    const auto sheet = [](const std::string& i) {
+        return "<sheet name='" + i + "' r:id='unknown" + i + "'/>";
+    };
+    return PackageBuilder::of({kRow})
+        .set("xl/workbook.xml",
+             PackageBuilder::workbook(repeat(count, sheet) + "<sheet name='S' r:id='r1'/>"))
+        .set("xl/_rels/workbook.xml.rels",
+             PackageBuilder::relationships(
+                 repeat(count, relation) +
+                 PackageBuilder::relation("r1", "worksheet", "worksheets/sheet1.xml")));
+}
+
+// Each style has a number format of its own, and a cell that uses it.
+PackageBuilder manyStyles(unsigned count) {
+    const auto code = [](const std::string& i) {
+        return "<numFmt numFmtId='" + i + "' formatCode='yyyy\\-mm&quot;" + i + "&quot;'/>";
+    };
+    const auto style = [](const std::string& i) { return "<xf numFmtId='" + i + "'/>"; };
+    const auto cell = [](const std::string& i) {
+        return "<row><c s='" + i + "'><v>1</v></c></row>";
+    };
+    return PackageBuilder::of({repeat(count, cell)})
+        .set("xl/styles.xml", "<styleSheet><numFmts count='" + std::to_string(count) + "'>" +
+                                  repeat(count, code) + "</numFmts><cellXfs>" +
+                                  repeat(count, style) + "</cellXfs></styleSheet>");
+}
+
+// A text column, for which each number is shown in its format of as many decimals as may be.
+PackageBuilder longFormat(unsigned rows) {
+    const auto cell = [](const std::string& i) {
+        return "<row><c s='0'><v>" + i + ".5</v></c></row>";
+    };
+    const std::string code = "0." + std::string(dp::kFormatCodeSize - 2, '0');
+    return PackageBuilder::of({"<row/><row><c t='str'><v>text</v></c></row>" + repeat(rows, cell)})
+        .set("xl/styles.xml",
+             "<styleSheet><numFmts count='1'><numFmt numFmtId='164' formatCode='" + code +
+                 "'/></numFmts><cellXfs><xf numFmtId='164'/></cellXfs></styleSheet>");
+}
+
+// A text of 10,000 bytes in many cells, cut to 80 when they are loaded.
+PackageBuilder longText(unsigned rows) {
+    const auto cell = [](const std::string&) {
+        return std::string("<row><c t='s'><v>0</v></c></row>");
+    };
+    return PackageBuilder::of({repeat(rows, cell)})
+        .set("xl/sharedStrings.xml",
+             "<sst uniqueCount='1'><si><t>" + std::string(10000, 'a') + "</t></si></sst>");
+}
+
+PackageBuilder manyStrings(unsigned count) {
+    const auto text = [](const std::string& i) { return "<si><t>" + i + "</t></si>"; };
+    const auto cell = [](const std::string& i) {
+        return "<row><c t='s'><v>" + i + "</v></c></row>";
+    };
+    return PackageBuilder::of({repeat(count, cell)})
+        .set("xl/sharedStrings.xml",
+             "<sst uniqueCount='2147483647'>" + repeat(count, text) + "</sst>");
+}
+
+// Columns from the last to the first, rows from the last to the first.
+PackageBuilder backwards(unsigned side) {
+    std::string rows;
+    for (unsigned row = side; row > 0; --row) {
+        rows += "<row r='" + std::to_string(row) + "'>";
+        for (unsigned column = side; column > 0; --column)
+            rows += "<c r='" + columnName(column - 1) + "1'><v>1</v></c>";
+        rows += "</row>";
+    }
+    return PackageBuilder::of({rows});
+}
+
+struct Case {
+    const char* name;
+    PackageBuilder (*build)(unsigned size);
+    unsigned size;
+    double scale;  // by how much the work grows with twice the size
+};
+
+constexpr Case kCases[] = {
+    {"1 cell far below in 200 columns", farCorners, 200, 2},
+    {"1 cell in each of 200 columns", diagonal, 200, 4},
+    {"10,000 worksheets", manyWorksheets, 10000, 2},
+    {"10,000 empty worksheets", manyEmptyWorksheets, 10000, 2},
+    {"10,000 relationships and sheets", manyRelationships, 10000, 2},
+    {"65,000 styles", manyStyles, 65000, 2},
+    {"100,000 strings", manyStrings, 100000, 2},
+    {"1,000 decimals in 100,000 cells", longFormat, 100000, 2},
+    {"10,000 bytes in 5,000 cells", longText, 5000, 2},
+    {"500 x 500 cells backwards", backwards, 500, 4},
+};
+
+bool missed = false;
+
+void run(const Case& c, const std::string& path) {
+    c.build(c.size / 2).write(path);
+    const Measurement half = bestOf(3, path);
+    c.build(c.size).write(path);
+    const Measurement whole = bestOf(3, path);
+    const double ratio = whole.seconds / half.seconds / (c.scale / 2);
+    const bool slow = whole.seconds > kMostSeconds || (whole.seconds > 0.05 && ratio > kMostRatio);
+    missed = missed || slow;
+    std::printf("%-34s %9.1f %9.1f %7.2f %9.1f %10lu%s\n", c.name, half.seconds * 1e3,
+                whole.seconds * 1e3, ratio, whole.megabytes, whole.rows, slow ? "  missed" : "");
+    std::fflush(stdout);
+}
+
+// --- many opens ---
+
+long openDescriptors() {
+    const fs::directory_iterator entries("/proc/self/fd");
+    return std::distance(begin(entries), end(entries));
+}
+
+void openOften(unsigned times, const std::string& path, const fs::path& temporary) {
+    PackageBuilder::of({kRow, kRow}).write(path);
+    openAndLoad(path);
+    const long descriptors = openDescriptors();
+    const std::size_t memory = ::mallinfo2().uordblks;
+    const double peak = peakMegabytes();
+    const auto start = std::chrono::steady_clock::now();
+    for (unsigned i = 0; i < times; ++i) openAndLoad(path);
+    const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - start;
+    const auto bytes = static_cast<long>(::mallinfo2().uordblks - memory);
+    const long more = openDescriptors() - descriptors;
+    const bool clean = fs::is_empty(temporary);
+    std::printf(
+        "%u opens: %.2f ms each, %ld bytes and %ld descriptors more, peak %.1f MB more, "
+        "temporary directory %s\n",
+        times, taken.count() * 1e3 / times, bytes, more, peakMegabytes() - peak,
+        clean ? "empty" : "not empty");
+    missed = missed || bytes > 4096 || more != 0 || !clean;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    const unsigned opens = argc > 1 ? static_cast<unsigned>(std::atoi(argv[1])) : 10000;
+    const fs::path memory = "/dev/shm";
+    const fs::path base = ::access(memory.c_str(), W_OK) == 0 ? memory : fs::temp_directory_path();
+    const fs::path root = base / fs::unique_path("bench-%%%%-%%%%");
+    const fs::path temporary = root / "tmp";
+    fs::create_directories(temporary);
+    ::setenv("TMPDIR", temporary.c_str(), 1);
+    const std::string path = (root / "book.xlsx").string();
+    std::printf("%-34s %9s %9s %7s %9s %10s\n", "open and load", "half ms", "whole ms", "ratio",
+                "MB more", "rows");
+    for (const Case& c : kCases) run(c, path);
+    openOften(opens, path, temporary);
+    fs::remove_all(root);
+    return missed ? 1 : 0;
+}
