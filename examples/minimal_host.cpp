@@ -1,0 +1,49 @@
+// minimal_host BOOK.xlsx [LIBRARY]: loads the import library at run time and prints the columns of
+// the workbook's first worksheet.
+#include <dlfcn.h>
+
+#include <cstdio>
+
+#include "model/host/entry_points.h"
+#include "model/host/i_column.h"
+#include "model/host/i_data_provider.h"
+#include "model/host/i_finders.h"
+#include "model/host/i_string.h"
+
+static long printColumns(dp::IDataProvider& provider, const char* book) {
+    const long result = provider.OpenFile(book, dp::IDataProvider::FileAccess::Read);
+    if (result != 0) return result;
+    const auto& sheets = *provider.GetWorksheetFinder()->GetWorksheetPrimeKeys();
+    if (sheets.Count() == 0) return 0;
+    const dp::IVariableFinder& finder = *provider.GetVariableFinder();
+    const auto& keys = *finder.GetColumnPrimeKeys(sheets.Item(0));
+    for (unsigned long i = 0; i < keys.Count(); ++i) {
+        dp::IColumn* column = nullptr;
+        if (!finder.FindColumn(keys.Item(i), &column, false)) continue;
+        column->AddRef();
+        std::printf("%s: type %d, %d rows, %d missing\n", column->GetName()->application_str(),
+                    column->GetDataType(), column->GetRowCount(), column->GetMissingCount());
+        column->Release();
+    }
+    return 0;
+}
+
+int main(int count, char** arguments) {
+    if (count < 2) return 2;
+    void* const library = dlopen(count > 2 ? arguments[2] : "libdpxlsx.so.1", RTLD_NOW);
+    void* const entry = library == nullptr ? nullptr : dlsym(library, "CreateDataProvider");
+    if (entry == nullptr) return std::fprintf(stderr, "%s\n", dlerror()), 1;
+    const auto create = reinterpret_cast<decltype(&dp::CreateDataProvider)>(entry);
+    dp::IDataProvider* provider = nullptr;
+    if (create("xlsx", &provider) != 0) return 1;
+    provider->AddRef();
+    long result = -1;
+    try {
+        result = printColumns(*provider, arguments[1]);
+    } catch (...) {  // a part that cannot be read, the file system, or memory
+    }
+    if (result != 0) std::fprintf(stderr, "%s: result %ld\n", arguments[1], result);
+    provider->CloseFile();
+    provider->Release();
+    return result == 0 ? 0 : 1;
+}

@@ -1,0 +1,124 @@
+#!/usr/bin/env python3
+"""Uses the installed library as the engineer of a host would, with nothing but what is installed.
+
+Usage: host_kit_test.py CMAKE BUILD_FOLDER SOURCE_FOLDER [TEST...]. BUILD_FOLDER may also be a folder
+in which a package is unpacked: then its usr/ is taken instead of an installation.
+"""
+
+import multiprocessing.pool
+import os
+import pathlib
+import re
+import shutil
+import subprocess
+import sys
+import unittest
+
+CMAKE = sys.argv.pop(1)
+BUILD = pathlib.Path(sys.argv.pop(1)).resolve()
+SOURCE = pathlib.Path(sys.argv.pop(1)).resolve()
+SAMPLE = SOURCE / "samples" / "sample.xlsx"
+COMPILERS = ("g++", "clang++")
+WARNINGS = ["-Wall", "-Wextra", "-Wpedantic", "-Werror"]
+ROADS = """cmake_minimum_required(VERSION 3.16)
+project(hosts CXX)
+find_package(dpxlsx 1 CONFIG REQUIRED)
+add_executable(minimal_host minimal_host.cpp)
+target_link_libraries(minimal_host dpxlsx::dpxlsx)
+add_executable(linked_host linked_host.cpp)
+target_link_libraries(linked_host dpxlsx::dpxlsx)
+"""
+
+
+def run(*command, expected=0, **options):
+    done = subprocess.run([str(part) for part in command], capture_output=True, text=True,
+                          check=False, timeout=300, **options)
+    if done.returncode != expected:
+        raise AssertionError(f"{command}: {done.returncode}\n{done.stdout}{done.stderr}")
+    return done.stdout
+
+
+class HostKitTest(unittest.TestCase):
+    @classmethod
+    def setUpClass(cls):
+        cls.work = BUILD / "host-kit"
+        shutil.rmtree(cls.work, ignore_errors=True)
+        cls.work.mkdir()
+        cls.prefix = BUILD / "usr"
+        if not cls.prefix.exists():
+            cls.prefix = cls.work / "moved"
+            run(CMAKE, "--install", BUILD, "--prefix", cls.work / "installed")
+            (cls.work / "installed").rename(cls.prefix)  # nothing may depend on the place
+        cls.headers = cls.prefix / "include" / "dpxlsx"
+        pkgconfig = next(cls.prefix.glob("lib/**/pkgconfig"))
+        cls.libraries = pkgconfig.parent
+        cls.environment = {"PATH": os.environ["PATH"], "PKG_CONFIG_PATH": str(pkgconfig),
+                           "CMAKE_PREFIX_PATH": str(cls.prefix)}
+
+    def flags(self, option):
+        return run("pkg-config", option, "dpxlsx", env=self.environment).split()
+
+    def columns_by(self, host, *arguments):
+        return run(host, SAMPLE, *arguments,
+                   env={**self.environment, "LD_LIBRARY_PATH": str(self.libraries)})
+
+    def test_every_header_compiles_alone(self):
+        exporting = {str(path.relative_to(SOURCE)) for folder in
+                     ("model", "formats", "store", "readers", "provider")
+                     for path in SOURCE.glob(f"{folder}/**/*.h") if "DPXLSX_API" in path.read_text()}
+        installed = {str(path.relative_to(self.headers)) for path in self.headers.glob("**/*.h")}
+        self.assertEqual(exporting - installed, set(), "export something, but are not installed")
+
+        def compiled(job):
+            compiler, header = job
+            standard = "c++17" if header.startswith("model/") else "c++20"
+            return run(compiler, f"-std={standard}", *WARNINGS, "-fsyntax-only", "-x", "c++",
+                       "-include", header, "-I", self.headers, "/dev/null", cwd=self.work)
+
+        jobs = [("g++", header) for header in sorted(installed)]
+        jobs += [("clang++", header) for header in sorted(installed) if header.startswith("model/host")]
+        with multiprocessing.pool.ThreadPool(2) as pool:
+            pool.map(compiled, jobs)
+
+    def test_examples_print_the_same_by_every_road(self):
+        outputs = {}
+        for compiler in COMPILERS:
+            made = self.work / compiler
+            made.mkdir()
+            for name in ("minimal_host", "linked_host"):
+                shutil.copy(SOURCE / "examples" / f"{name}.cpp", made)
+                self.assertLess((made / f"{name}.cpp").read_text().count("\n"), 60)
+                # The first gets no library to link with: it loads it.
+                run(compiler, "-std=c++17", *WARNINGS, *self.flags("--cflags"), "-o", made / name,
+                    made / f"{name}.cpp", *(self.flags("--libs") if name == "linked_host" else []))
+                outputs[compiler, name, "pkg-config"] = self.columns_by(made / name)
+            library = next(self.libraries.glob("libdpxlsx.so.?"))
+            outputs[compiler, "dlopen"] = self.columns_by(made / "minimal_host", library)
+
+            (made / "CMakeLists.txt").write_text(ROADS)
+            run(CMAKE, "-G", "Ninja", "-S", made, "-B", made / "build", env={**self.environment, "CXX": compiler})
+            run(CMAKE, "--build", made / "build", env=self.environment)
+            for name in ("minimal_host", "linked_host"):
+                outputs[compiler, name, "find_package"] = run(made / "build" / name, SAMPLE)
+        wanted = outputs["g++", "dlopen"]
+        self.assertIn("Day: type 2, 12 rows, ", wanted)
+        self.assertEqual(wanted.count("\n"), 14)
+        for road, output in outputs.items():
+            self.assertEqual(output, wanted, road)
+
+    def test_tool_finds_its_library_and_its_page_names_every_option(self):
+        tool = self.prefix / "bin" / "dpxlsx"
+        self.assertIn("Measurements", run(tool, "--list", SAMPLE, env=self.environment))
+        version = run(tool, "--version").split()[-1]
+        self.assertEqual(run("pkg-config", "--modversion", "dpxlsx", env=self.environment).strip(), version)
+        self.assertTrue((self.libraries / f"libdpxlsx.so.{version}").is_file())
+        page = next(self.prefix.glob("share/man/man1/dpxlsx.1*"))
+        text = run("man", "--warnings", "-l", page, env={**self.environment, "MANROFFOPT": "-c", "MANWIDTH": "100",
+                                           "LC_ALL": "C"})
+        options = set(re.findall(r"--[a-z][a-z-]*", run(tool, "--help")))
+        self.assertGreater(len(options), 20)
+        self.assertEqual({option for option in options if option not in text}, set())
+
+
+if __name__ == "__main__":
+    unittest.main()
