@@ -110,7 +110,8 @@ class CellBlocks {
 // The cells of one worksheet column, an ordered map from row (0-based) to cell. Cells that come in
 // ascending order of rows are appended; others are put in their places by the next read, which may
 // then throw std::bad_alloc and leaves the column as it was. Any change invalidates iterators and
-// views. Not to be changed while another thread uses it; after settle() reads change nothing.
+// views. Columns that share a pool are one object to threads: none may change while another thread
+// uses any, and reads change nothing once all are settled.
 class DPXLSX_API CellColumn {
   public:
     struct Entry {
@@ -161,6 +162,7 @@ class DPXLSX_API CellColumn {
   private:
     using RareCells = std::unordered_map<const RareCell*, std::unique_ptr<const RareCell>>;
 
+    // Before cells are read, move, are replaced or go: the pool may still owe them their texts.
     void settleTexts() const noexcept {
         if (texts_) texts_->settle();
     }

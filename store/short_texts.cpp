@@ -10,7 +10,7 @@ namespace dp {
 
 namespace {
 
-constexpr std::size_t kFirstSlots = 16;
+constexpr std::size_t kFirstSlots = 64;
 constexpr std::size_t kFirstPage = 512;  // bytes; few texts take little room
 __extension__ using Product = unsigned __int128;
 
@@ -128,7 +128,9 @@ void ShortTexts::fetchCandidate(const Waiting& waiting) const {
     if (table_.tags[index] == 0) return;
     const char* stored = at(table_.ids[index]);
     __builtin_prefetch(stored);
-    __builtin_prefetch(stored + waiting.length);  // it may reach into another line
+    // It may reach into another line, and a shorter text's end lies behind that of the page.
+    __builtin_prefetch(
+        reinterpret_cast<const void*>(reinterpret_cast<std::uintptr_t>(stored) + waiting.length));
 }
 
 // The stored text that equals the one at `text`, which is behind the used bytes; when it is new it
@@ -144,6 +146,11 @@ const char* ShortTexts::settleOne(const Waiting& waiting, const char* text) {
     page.used += size;
     ++size_;
     return place;
+}
+
+const char* ShortTexts::find(std::string_view text) noexcept {
+    settle();
+    return table_.tags.empty() ? nullptr : find(text, hash_(text));
 }
 
 const char* ShortTexts::find(std::string_view text, std::uint64_t hash) const {
@@ -174,11 +181,11 @@ bool ShortTexts::makeRoom(std::size_t size) {
 // Keeps a quarter of the slots free, the texts that wait included.
 void ShortTexts::growTable() {
     const std::size_t count = table_.tags.size();
-    if (size_ + waitingCount_ < count / 4 * 3) return;
-    if (isWaiting()) {
-        settle();
-        return growTable();
-    }
+    const std::size_t most = count / 4 * 3;
+    if (size_ + waitingCount_ < most) return;
+    settle();
+    // Not many texts at a time would wait just below the limit.
+    if (size_ + kMostWaiting < most) return;
     Table larger(std::max(kFirstSlots, count * 2));
     rehash(larger);
     table_ = std::move(larger);

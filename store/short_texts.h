@@ -32,11 +32,13 @@ class ShortTexts {
     ShortTexts& operator=(const ShortTexts&) = delete;
 
     // Begins to look for `text`, which has 1 to kLongest bytes; it is copied. False when there is
-    // no room for more texts, which are kept elsewhere then. Throws std::bad_alloc. In both cases
-    // nothing has begun.
+    // no room for one more text. Throws std::bad_alloc. In both cases nothing has begun.
     bool begin(std::string_view text);
-    // Where the text that was begun last will be written as an address, if it is still waiting.
+    // Where the address of the text that was begun last is written: now, with any later begin, or
+    // with settle. The place must stay until then.
     void deliverTo(std::uint64_t& place) noexcept;
+    // The text that equals `text`, null if there is none; settles all that wait.
+    const char* find(std::string_view text) noexcept;
     // Finds or adds all texts that wait. The last one that was found stays known as recent().
     void settle() noexcept;
     bool isWaiting() const { return waitingCount_ != 0; }

@@ -20,17 +20,20 @@ PooledText TextPool::intern(std::string_view text) {
     return std::bit_cast<PooledText>(bits);
 }
 
-// A text often is the one before; then it need not be searched for.
+// A text that often repeats the one before need not be searched for.
 void TextPool::begin(std::string_view text) {
     if (!isRecent_ && !short_.isWaiting()) recent_ = PooledText(short_.recent());
     isRecent_ = true;
     if (text == recent_.view()) return;
     if (text.empty())
         recent_ = {};
-    else if (text.size() <= ShortTexts::kLongest && short_.begin(text))
-        isRecent_ = false;
-    else
+    else if (text.size() > ShortTexts::kLongest)
         recent_ = internLong(text);
+    else if (short_.begin(text))
+        isRecent_ = false;
+    else  // 16 GB of texts, and no room for another
+        recent_ = PooledText(short_.find(text));
+    if (isRecent_ && recent_ == PooledText() && !text.empty()) recent_ = internLong(text);
 }
 
 void TextPool::deliverTo(std::uint64_t& bits) noexcept {

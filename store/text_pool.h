@@ -51,7 +51,8 @@ class TextPool {
     PooledText intern(std::string_view text);
 
     // The same in two steps that many texts can be in at a time: after begin, which throws as
-    // intern does, deliverTo names where the bits of the handle go. They are there after settle().
+    // intern does, deliverTo names where the bits of the handle go. They are written now, with any
+    // later call, or with settle: the place must stay until then.
     void begin(std::string_view text);
     void deliverTo(std::uint64_t& bits) noexcept;
     // Delivers what is still to be delivered.
@@ -68,8 +69,8 @@ class TextPool {
     ShortTexts short_;
     // The long ones, and those for which the other table has no room.
     std::unordered_map<std::string_view, std::unique_ptr<char[]>, TextHash> long_;
-    PooledText recent_;     // the last text
-    bool isRecent_ = true;  // recent_ is what was begun last; else the short texts know it
+    PooledText recent_;     // the last text that was known when the next one was begun
+    bool isRecent_ = true;  // it is the one to deliver; else the short texts know it
 };
 
 }  // namespace dp

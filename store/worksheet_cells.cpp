@@ -34,6 +34,7 @@ CellColumn& WorksheetCells::operator[](unsigned column) {
 
 void WorksheetCells::clear() noexcept {
     columns_.clear();
+    recent_ = {};
     inOrder_.clear();
 }
 
