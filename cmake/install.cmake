@@ -101,10 +101,9 @@ set(CPACK_STRIP_FILES ON)
 set(CPACK_PACKAGING_INSTALL_PREFIX /usr)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_SECTION libs)
-set(CPACK_DEBIAN_PACKAGE_DESCRIPTION
-"Import plug-in that reads .xlsx workbooks
- A shared library that a desktop statistics application loads to read Excel
- workbooks as typed columns, with its headers, and the command-line tool dpxlsx.")
+set(CPACK_PACKAGE_DESCRIPTION
+"A shared library that a desktop statistics application loads to read Excel
+workbooks as typed columns, with its headers, and the command-line tool dpxlsx.")
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS ON)  # with the trigger that tells the loader
 include(CPack)
