@@ -29,6 +29,16 @@ add_executable(linked_host linked_host.cpp)
 target_link_libraries(linked_host dpxlsx::dpxlsx)
 """
 
+FRAGMENT = """#include <dlfcn.h>
+#include <cstdio>
+#include "model/host/entry_points.h"
+#include "model/host/i_data_provider.h"
+#include "model/host/i_finders.h"
+void fragment(dp::IDataProvider& provider);
+void fragment([[maybe_unused]] dp::IDataProvider& provider) {
+%s}
+"""
+
 
 def run(*command, expected=0, **options):
     done = subprocess.run([str(part) for part in command], capture_output=True, text=True,
@@ -105,6 +115,39 @@ class HostKitTest(unittest.TestCase):
         self.assertEqual(wanted.count("\n"), 14)
         for road, output in outputs.items():
             self.assertEqual(output, wanted, road)
+
+    def test_guide_is_true_code(self):
+        guide = (SOURCE / "docs" / "host-guide.md").read_text()
+        blocks = re.findall(r"^```(\w+)\n(.*?)^```", guide, re.MULTILINE | re.DOTALL)
+        made = self.work / "guide"
+        made.mkdir()
+        cpp = [code for language, code in blocks if language == "cpp"]
+        files = {match[1]: code for code in cpp if (match := re.match(r"// (\S+)\n", code))}
+        self.assertEqual(set(files), {"host.cpp", "date_times.h"})
+        for name, code in files.items():
+            (made / name).write_text(code)
+        for i, code in enumerate(code for code in cpp if code not in files.values()):
+            fragment = made / f"fragment{i}.cpp"
+            fragment.write_text(FRAGMENT % code)
+            for compiler in COMPILERS:
+                run(compiler, "-std=c++17", *WARNINGS, *self.flags("--cflags"), "-fsyntax-only", fragment)
+        for compiler in COMPILERS:
+            for command in (code for language, code in blocks if language == "sh"):
+                run("sh", "-ec", command.replace("c++ ", compiler + " ").replace(".cpp ", ".cpp -Wall -Wextra -Werror "),
+                    cwd=made, env=self.environment)
+            shown = self.columns_by(made / "host")
+            self.assertIn("  Day, 12 rows: [Feb 26, 2024] [Feb 27, 2024] [Feb 28, 2024]\n", shown)
+            self.assertIn("  Fixed, 12 rows: [-3.00] [-0.50] [2.00]\n", shown)
+            self.assertIn("Readings 2024\n", shown)
+        (made / "CMakeLists.txt").write_text(*[code for language, code in blocks if language == "cmake"])
+        run(CMAKE, "-G", "Ninja", "-S", made, "-B", made / "build", env=self.environment)
+        run(CMAKE, "--build", made / "build", env=self.environment)
+        self.assertEqual(run(made / "build" / "host", SAMPLE), shown)
+        run(made / "host", "/no.xlsx", expected=1, env={**self.environment, "LD_LIBRARY_PATH": str(self.libraries)})
+        # Every operation of the provider that sets something is explained.
+        settings = set(re.findall(r"\b((?:Set|Clear)\w+)\(", (self.headers / "model/host/i_data_provider.h").read_text()))
+        inner = {"SetWorksheetIndex"}  # is the readers' own
+        self.assertEqual({name for name in settings - inner if f"{name}" not in guide}, set())
 
     def test_tool_finds_its_library_and_its_page_names_every_option(self):
         tool = self.prefix / "bin" / "dpxlsx"
