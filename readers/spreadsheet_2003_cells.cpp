@@ -101,7 +101,8 @@ void ExcelXmlReader::setCurrentStyle(const char* id) {
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    const char* typeName = Attributes(xmlReader).find("Type", "ss");
+    Attributes attributes(xmlReader);  // keeps a value with references
+    const char* typeName = attributes.find("Type", "ss");
     record_.initialize();
     record_.cell.type = typeName ? typeOfData(typeName) : CELL_EMPTY;
     xmlReader.readNode();
