@@ -25,15 +25,16 @@ void TextPool::begin(std::string_view text) {
     if (!isRecent_ && !short_.isWaiting()) recent_ = PooledText(short_.recent());
     isRecent_ = true;
     if (text == recent_.view()) return;
-    if (text.empty())
+    if (text.empty()) {
         recent_ = {};
-    else if (text.size() > ShortTexts::kLongest)
-        recent_ = internLong(text);
-    else if (short_.begin(text))
-        isRecent_ = false;
-    else  // 16 GB of texts, and no room for another
-        recent_ = PooledText(short_.find(text));
-    if (isRecent_ && recent_ == PooledText() && !text.empty()) recent_ = internLong(text);
+        return;
+    }
+    const bool isShort = text.size() <= ShortTexts::kLongest;
+    isRecent_ = !isShort || !short_.begin(text);
+    if (!isRecent_) return;
+    // Short texts join the long ones behind 16 GB of others, those that are not among these.
+    const char* kept = isShort ? short_.find(text) : nullptr;
+    recent_ = kept ? PooledText(kept) : internLong(text);
 }
 
 void TextPool::deliverTo(std::uint64_t& bits) noexcept {
