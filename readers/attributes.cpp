@@ -21,7 +21,7 @@ Attributes::Attributes(XmlReader& reader) : first_(nullptr) {
     if (element && element->type == XML_ELEMENT_NODE) first_ = element->properties;
 }
 
-const char* Attributes::find(const char* name, const char* prefix) {
+const char* Attributes::find(const char* name, const char* prefix) & {
     for (const xmlAttr* attribute = first_; attribute; attribute = attribute->next) {
         const xmlChar* own = attribute->ns ? attribute->ns->prefix : nullptr;
         const bool samePrefix = prefix ? own && equal(own, prefix) : !own;
@@ -30,7 +30,7 @@ const char* Attributes::find(const char* name, const char* prefix) {
     return nullptr;
 }
 
-const char* Attributes::valueOf(const xmlAttr* attribute) {
+const char* Attributes::valueOf(const xmlAttr* attribute) & {
     const xmlNode* value = attribute->children;
     if (!value) return "";
     if (value->type == XML_TEXT_NODE && !value->next)

@@ -15,12 +15,12 @@ class Attributes {
     explicit Attributes(XmlReader& reader);
 
     // The value of an attribute without prefix, or of `prefix`:`name`; null when there is none.
-    // Valid until the next call or read.
-    const char* find(const char* name, const char* prefix = nullptr);
+    // Valid until the next call or read, and no longer than this object.
+    const char* find(const char* name, const char* prefix = nullptr) &;
 
     const _xmlAttr* first() const { return first_; }
     // The value of one of the element's attributes; valid until the next call or read.
-    const char* valueOf(const _xmlAttr* attribute);
+    const char* valueOf(const _xmlAttr* attribute) &;
 
   private:
     const _xmlAttr* first_;

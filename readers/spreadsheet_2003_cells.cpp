@@ -88,30 +88,29 @@ void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
     if (index > column) column = index - 1;
     // Wider than a worksheet, or negative: it would hide the cells behind it.
     if (mergeAcross >= kWorksheetColumns) mergeAcross = 0;
-    if (!hasStyle) setCurrentStyle("");
+    if (hasStyle) return;
+    currentStyleId.clear();
+    currentStyle = nullptr;
 }
 
 void ExcelXmlReader::setCurrentStyle(const char* id) {
     if (currentStyle && currentStyleId == id) return;
     currentStyleId = id;
-    currentStyle = nullptr;
     int ignored = -1;
-    if (!currentStyleId.empty()) mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);
+    mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);
 }
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    Attributes attributes(xmlReader);  // keeps a value with references
+    Attributes attributes(xmlReader);
     const char* typeName = attributes.find("Type", "ss");
     record_.initialize();
     record_.cell.type = typeName ? typeOfData(typeName) : CELL_EMPTY;
     xmlReader.readNode();
-    if (!hasContent) return;
-
     const bool inPreview = !provider->IsPreviewing() ||
                            (row < static_cast<unsigned>(provider->GetPreviewNumberOfRows()) &&
                             column < static_cast<unsigned>(provider->GetPreviewNumberOfColumns()));
-    if (!readData(inPreview)) return;
+    if (!hasContent || !readData(inPreview)) return;
     if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
     record_.row = row;
     record_.column = column;
