@@ -49,6 +49,7 @@ set(class_headers
     readers/first_entry_index.h
     readers/limits.h
     readers/relationships.h
+    readers/repeated_parts.h
     readers/shared_string_table.h
     readers/text_budget.h
     readers/xml_reader.h

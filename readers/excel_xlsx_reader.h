@@ -5,6 +5,7 @@
 
 #include "readers/excel_xml_reader.h"
 #include "readers/relationships.h"
+#include "readers/repeated_parts.h"
 #include "readers/shared_string_table.h"
 #include "readers/text_budget.h"
 
@@ -58,6 +59,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     RelationshipIndex relationshipIndex;
     std::vector<NumberKind> numberKinds;  // by position in cellXfNumFmtIds
     TextBudget textBudget;
+    RepeatedParts repeatedParts;
 };
 
 namespace excel_xlsx {

@@ -30,18 +30,27 @@ inline constexpr std::uint64_t kSpaceCheckInterval = 16ULL << 20;
 // otherwise; parts nest about ten.
 inline constexpr int kXmlDepth = 256;
 
-// Bytes of one tag, comment or other markup, beside what libxml2 reads ahead. Lists of thousands of
-// cell ranges stand in one attribute; but libxml2 compares every attribute of an element with every
-// other, and copies a whole comment for every error in it.
+// Bytes of one tag, comment, CDATA section or other markup, beside what libxml2 reads ahead. Lists
+// of thousands of cell ranges stand in one attribute; but libxml2 compares every attribute of an
+// element with every other, and copies a whole comment for every error in it.
 inline constexpr std::size_t kMarkupSize = 256 << 10;
 // Bytes from which markup is looked at more closely, and how many attributes or hyphens it may have
 // then.
 inline constexpr std::size_t kLongMarkup = 16 << 10;
 inline constexpr std::size_t kLongMarkupMarks = 4096;
 
-// Bytes of an entity that a document declares. No part declares any; libxml2 limits how they nest
-// from this size on, but not how often a large one is used in attributes.
-inline constexpr int kEntitySize = 1000;
+// Bytes without an element among them, which libxml2 keeps all at once and comments twentyfold. It
+// allows texts of 10 MB.
+inline constexpr std::int64_t kRunSize = 12 << 20;
+
+// Bytes read of worksheet parts that were read before, each time as many as a page of memory at
+// least: every worksheet has a part of its own, but any number of sheets may name the same one.
+inline constexpr std::uint64_t kRepeatedReading = 64ULL << 20;
+inline constexpr std::uint64_t kLeastReading = 4096;
+
+// Bytes of the path in a relationship, as long as the system's own may be. Every sheet that names
+// the relationship resolves it.
+inline constexpr std::size_t kTargetSize = 4096;
 
 // Bytes of a number-format code. Spreadsheet programs allow 255 characters; every decimal of a code
 // is one of each text that is rendered with it.

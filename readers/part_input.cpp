@@ -22,8 +22,8 @@ namespace {
 // The file behind a reader, and how far libxml2 has come in it.
 class PartInput {
   public:
-    explicit PartInput(const std::string& path)
-        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)) {}
+    PartInput(const std::string& path, const std::uint64_t& moves)
+        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)), moves_(moves) {}
     ~PartInput() {
         if (isOpen()) ::close(descriptor_);
     }
@@ -33,10 +33,10 @@ class PartInput {
     bool isOpen() const { return descriptor_ >= 0; }
     void watch(xmlTextReaderPtr reader) { reader_ = reader; }
 
-    // Up to `size` bytes; 0 at the end, -1 on an error and for markup beyond the limits.
+    // Up to `size` bytes; 0 at the end, -1 on an error and for what is beyond the limits.
     int read(char* bytes, int size) {
         const std::size_t waiting = bytesWaiting();
-        if (waiting > kMarkupSize) return -1;
+        if (waiting > kMarkupSize || runSize() > kRunSize) return -1;
         if (next_ == end_ && !fill()) return -1;
         const std::ptrdiff_t count = std::min<std::ptrdiff_t>(size, end_ - next_);
         std::copy_n(next_, count, bytes);
@@ -63,12 +63,22 @@ class PartInput {
         const long used = reader_ ? xmlTextReaderByteConsumed(reader_) : supplied_;
         return used < 0 || used > supplied_ ? 0 : static_cast<std::size_t>(supplied_ - used);
     }
+    // What libxml2 has got in the present move; nothing while a host moves the reader itself.
+    std::int64_t runSize() {
+        const bool moves = moves_ % 2 == 1;
+        if (!moves || moves_ != movesBefore_) runStart_ = supplied_;
+        movesBefore_ = moves_;
+        return supplied_ - runStart_;
+    }
     static std::size_t marksIn(const char* begin, const char* end) {
         return static_cast<std::size_t>(
             std::count_if(begin, end, [](char c) { return c == '=' || c == '-'; }));
     }
 
     int descriptor_;
+    const std::uint64_t& moves_;
+    std::uint64_t movesBefore_ = 0;
+    std::int64_t runStart_ = 0;
     std::array<char, std::size_t{32} << 10> buffer_;
     const char* next_ = nullptr;  // behind what libxml2 has got
     const char* end_ = nullptr;   // of what is in the buffer
@@ -88,17 +98,16 @@ int closePart(void* input) {
     return 0;
 }
 
-void noteLongEntity(void* payload, void* found, const xmlChar*) {
-    const auto* entity = static_cast<const xmlEntity*>(payload);
-    if (entity->content && entity->length > kEntitySize) *static_cast<bool*>(found) = true;
+void noteText(void* payload, void* found, const xmlChar*) {
+    if (static_cast<const xmlEntity*>(payload)->content) *static_cast<bool*>(found) = true;
 }
 
 }  // extern "C"
 
 }  // namespace
 
-xmlTextReaderPtr openDocument(const std::string& path) {
-    auto input = std::make_unique<PartInput>(path);
+xmlTextReaderPtr openDocument(const std::string& path, const std::uint64_t& moves) {
+    auto input = std::make_unique<PartInput>(path, moves);
     if (!input->isOpen()) return nullptr;
     PartInput* const watching = input.get();
     // The reader closes the input, also when it cannot be made.
@@ -118,7 +127,7 @@ bool declaresTooMuch(xmlTextReaderPtr reader) {
     if (!declarations) return false;
     bool tooMuch = declarations->attributes != nullptr;
     if (declarations->entities)
-        xmlHashScan(static_cast<xmlHashTablePtr>(declarations->entities), noteLongEntity, &tooMuch);
+        xmlHashScan(static_cast<xmlHashTablePtr>(declarations->entities), noteText, &tooMuch);
     return tooMuch;
 }
 

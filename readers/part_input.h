@@ -1,18 +1,21 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 
 struct _xmlTextReader;  // libxml2's own name; NOLINT(bugprone-reserved-identifier)
 
 namespace dp {
 
-// A reader of the document at `path`, owned by the caller; null when it cannot be opened. libxml2
-// gets the file's bytes as they are: by a path of its own it would unpack a compressed file on the
-// way, past every limit. Markup beyond the limits is a read error.
-_xmlTextReader* openDocument(const std::string& path);
+// A reader of the document at `path`, owned by the caller; null when it cannot be opened.
+// `moves` is odd while the reader moves, another number in each move, and outlives it. libxml2 gets
+// the file's bytes as they are: by a path of its own it would unpack a compressed file on the way,
+// past every limit. Markup beyond the limits is a read error.
+_xmlTextReader* openDocument(const std::string& path, const std::uint64_t& moves);
 
-// True for a document with declarations that make libxml2 work out of proportion: long entities, or
-// attributes, which it keeps as cross-references. The reader stands on the first node.
+// True for a document with declarations that make libxml2 work out of proportion: entities, which
+// attributes may repeat any number of times, or attributes, which it keeps as cross-references. The
+// reader stands on the first node.
 bool declaresTooMuch(_xmlTextReader* reader);
 
 }  // namespace dp

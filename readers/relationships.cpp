@@ -1,5 +1,6 @@
 #include "readers/relationships.h"
 
+#include "readers/limits.h"
 #include "readers/xml_reader.h"
 
 namespace dp {
@@ -68,6 +69,7 @@ std::ptrdiff_t RelationshipIndex::find(const std::string& id) const {
 }
 
 std::string resolveTarget(const std::string& dir, const std::string& target) {
+    if (target.size() > kTargetSize) throw CmXmlException(kXmlError);
     std::vector<std::string_view> segments;
     std::string_view rest = target;
     if (target.empty() || target.front() != '/') segments.emplace_back("xl");

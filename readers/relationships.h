@@ -28,7 +28,8 @@ class RelationshipIndex {
 
 // The path of the part that the workbook's relationship target names, "." and ".." resolved within
 // the package directory `dir`; a target that starts with a slash is taken from the package's root,
-// others from its xl folder. Throws CmXmlException for a target that leaves the package.
+// others from its xl folder. Throws CmXmlException for a target that leaves the package or is too
+// long.
 std::string resolveTarget(const std::string& dir, const std::string& target);
 
 }  // namespace dp

@@ -66,15 +66,6 @@ long sharedStringIndex(const char* text) {
 
 }  // namespace
 
-// A cell on its way to the provider.
-struct WaitingCell {
-    unsigned row;
-    unsigned column;
-    long sharedString;  // its index, or -1 for a number
-    double number;
-    NumberKind kind;
-};
-
 // The state of one pass over a worksheet part.
 class WorksheetPass {
   public:
@@ -96,6 +87,15 @@ class WorksheetPass {
     }
 
   private:
+    // A cell on its way to the provider.
+    struct WaitingCell {
+        unsigned row;
+        unsigned column;
+        long sharedString;  // its index, or -1 for a number
+        double number;
+        NumberKind kind;
+    };
+
     void readCells() {
         const Names names(reader_.textReader);
         if (reader_.nodeType() != XML_READER_TYPE_ELEMENT && !reader_.readToElement()) return;
@@ -280,6 +280,7 @@ class WorksheetPass {
 
 void ExcelXLSXReader::mReadExcel2007Worksheet(const std::string& target) {
     const std::string part = resolveTarget(packageDir, target);
+    repeatedParts.visit(part);
     textBudget.addPart(part);
     WorksheetPass(*this, part).run();
 }

@@ -18,12 +18,13 @@ namespace {
 
 namespace fs = boost::filesystem;
 
-// libxml2 takes a path with a scheme for the address of another file, on another machine even.
+// libxml2 takes a path with a scheme for the address of another file, on another machine even: no
+// file opens under such a name, but a copy of it does.
 bool looksLikeAddress(const std::string& path) { return path.find("://") != path.npos; }
 
-// Null for a path that libxml2 cannot open, or under which it would open something else.
-xmlTextReaderPtr openFile(const std::string& path) {
-    return looksLikeAddress(path) ? nullptr : dp::openDocument(path);
+// Null for a path that cannot be opened, or that names something else to libxml2.
+xmlTextReaderPtr openFile(const std::string& path, const std::uint64_t& moves) {
+    return looksLikeAddress(path) ? nullptr : dp::openDocument(path, moves);
 }
 
 // The path of a private copy of `path`; empty when it could not be made. Throws the file system's
@@ -51,18 +52,20 @@ XmlReader::~XmlReader() {
 
 void XmlReader::mInitialize(const std::string& path) {
     const dp::SilentLibxml2 silent;
-    textReader = openFile(path);
+    textReader = openFile(path, moves_);
     if (!textReader) {
         tempPath = copyToTemporary(path);
         tempCopy = !tempPath.empty();
-        if (tempCopy) textReader = openFile(tempPath);
+        if (tempCopy) textReader = openFile(tempPath, moves_);
     }
     if (!textReader || !readNode() || dp::declaresTooMuch(textReader))
         throw CmXmlException(kXmlError);
 }
 
 bool XmlReader::readNode() {
+    ++moves_;
     const int result = xmlTextReaderRead(textReader);
+    ++moves_;
     endOfFile = result == 0;
     if (result == -1) throw CmXmlException(kXmlError);
     return !endOfFile;

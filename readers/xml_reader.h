@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -68,6 +69,8 @@ class DPXLSX_API XmlReader {
 
   private:
     bool moveToAttribute(const char* name);
+
+    std::uint64_t moves_ = 0;  // twice the moves so far, and one more during one
 };
 
 namespace dp::xml {

@@ -113,6 +113,26 @@ TEST_F(Packages, RepeatedTextsHaveALimit) {
     EXPECT_THROW(outcomeOf(200), CmXmlException);
 }
 
+// Many sheets that name one part, and one name that is longer than any path.
+TEST_F(Packages, SheetsOfOnePartHaveALimit) {
+    const auto outcomeOf = [this](unsigned sheets, const std::string& target) {
+        std::string list;
+        for (unsigned sheet = 0; sheet < sheets; ++sheet) list += "<sheet name='S' r:id='r1'/>";
+        auto package = PackageBuilder::of({"<row><c><v>1</v></c></row>"});
+        package.set("xl/workbook.xml", PackageBuilder::workbook(list));
+        package.set("xl/_rels/workbook.xml.rels",
+                    PackageBuilder::relationships(PackageBuilder::relation("r1", "worksheet", target)));
+        package.write(file("book.xlsx"));
+        dp::xlsxDataProvider provider;
+        return provider.OpenFile(file("book.xlsx").c_str(), Access::Read);
+    };
+    EXPECT_EQ(outcomeOf(100, "worksheets/sheet1.xml"), 0);
+    EXPECT_THROW(outcomeOf(17'000, "worksheets/sheet1.xml"), CmXmlException);
+    std::string dots;
+    for (unsigned i = 0; i < 2100; ++i) dots += "./";
+    EXPECT_THROW(outcomeOf(1, dots + "worksheets/sheet1.xml"), CmXmlException);
+}
+
 TEST(Escapes, AreDecoded) {
     for (const auto& c : caseTable("escapes.txt")) {
         std::string text = c[1];
