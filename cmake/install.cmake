@@ -3,6 +3,9 @@
 include(GNUInstallDirs)
 include(CMakePackageConfigHelpers)
 
+# The library and the tool are all that is installed; tests and fuzz targets need not be built for it.
+set(CMAKE_SKIP_INSTALL_ALL_DEPENDENCY ON)
+
 # Debian's loader, pkg-config and CMake look into the folder of the architecture below every prefix.
 if(EXISTS /etc/debian_version AND CMAKE_LIBRARY_ARCHITECTURE AND CMAKE_INSTALL_LIBDIR STREQUAL "lib")
     set(CMAKE_INSTALL_LIBDIR lib/${CMAKE_LIBRARY_ARCHITECTURE})
