@@ -34,6 +34,14 @@ std::optional<unsigned> columnNumber(std::string_view text) {
     return number && *number >= 1 && *number <= kLastColumn ? number : std::nullopt;
 }
 
+std::string columnLetters(unsigned number) {
+    std::string letters;
+    for (; number > 0; number = (number - 1) / 26) {
+        letters.insert(letters.begin(), static_cast<char>('A' + (number - 1) % 26));
+    }
+    return letters;
+}
+
 std::optional<ColumnReference> parseColumnReference(std::string_view text) {
     const size_t mark = text.rfind('!');
     const bool every = mark == std::string_view::npos;

@@ -21,6 +21,9 @@ struct ColumnAssignment {
 // The 1-based number of "A" to "XFD" in any letter case or of "1" to "16384", else none.
 std::optional<unsigned> columnNumber(std::string_view text);
 
+// The letters of a column, the first being 1.
+std::string columnLetters(unsigned number);
+
 // None when the text is no such reference or assignment.
 std::optional<ColumnReference> parseColumnReference(std::string_view text);
 std::optional<ColumnAssignment> parseColumnAssignment(std::string_view text);

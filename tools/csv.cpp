@@ -97,9 +97,9 @@ void writeCsv(Workbook& workbook, const Options& options) {
     if (meansFolder(options.target)) return writeFolder(workbook, options, sheets);
     if (sheets.empty()) return Output(options.target).finish();
     if (sheets.size() > 1) {
-        throw Failure(kUsage, options.book + ": has " + std::to_string(sheets.size()) +
-                                  " worksheets to write; choose one with --sheet, or name a "
-                                  "folder: --csv FOLDER/");
+        throw Failure(kUsage, options.book + ": " + worksheetsText(sheets) +
+                                  "; add --sheet and the name or number of one, or name a folder "
+                                  "for all: --csv FOLDER/");
     }
     writeWorksheet(workbook.load(sheets.front()), options, options.target);
 }

@@ -64,7 +64,7 @@ Failure currentFailure(const std::string& book) {
     }
 }
 
-void printFailure(const std::string& text) {
+void printLine(const std::string& text) {
     std::fprintf(stderr, "dpxlsx: %s\n", printable(text).c_str());
 }
 

@@ -38,7 +38,7 @@ Failure readFailure(const std::string& book, long result);
 // to be called from a catch block.
 Failure currentFailure(const std::string& book);
 
-// Prints the text as one line on standard error, with the program's name before it.
-void printFailure(const std::string& text);
+// Prints a failure or a note as one line on standard error, with the program's name before it.
+void printLine(const std::string& text);
 
 }  // namespace dp::tool

@@ -1,14 +1,8 @@
 #pragma once
 
-#include <string>
-
-namespace CLI {
-class App;
-}
-
 namespace dp::tool {
 
-// Usage, the options by group, one line each, and the exit codes.
-std::string helpText(const CLI::App& app);
+// Usage, every option by group, and the exit codes, for a screen of 40 lines of 80 characters.
+const char* helpText();
 
 }  // namespace dp::tool

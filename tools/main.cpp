@@ -2,6 +2,7 @@
 
 #include "tools/csv.h"
 #include "tools/exit_code.h"
+#include "tools/explain.h"
 #include "tools/interrupt.h"
 #include "tools/json_view.h"
 #include "tools/library.h"
@@ -32,28 +33,52 @@ void refuseToOverwrite(const Options& options) {
 }
 
 void show(Workbook& workbook, const Options& options) {
-    if (options.view != View::Names) workbook.open();
+    workbook.open();
     if (options.view == View::Csv) return writeCsv(workbook, options);
     Output output(options.target);
-    if (options.view == View::Names) showNames(workbook, output);
     if (options.view == View::Json) writeJson(workbook, options, output);
     if (options.view == View::Tables) showTables(workbook, options, output);
     output.finish();
 }
 
+// What the user would not notice in the output.
+void printNotes(const Workbook& workbook, const Options& options) {
+    for (const std::string& note :
+         {importNote(options.book, workbook.folder()), workbook.losses().text()}) {
+        if (!note.empty()) printLine(note);
+    }
+}
+
+void importBook(const Library& library, const Options& options) {
+    Workbook workbook(library, options);
+    if (options.view != View::Names) {
+        show(workbook, options);
+        return printNotes(workbook, options);
+    }
+    Output output(options.target);
+    showNames(workbook, output);
+    output.finish();
+}
+
+void explainBook(const Library& library, const Options& options) {
+    Output output(options.target);
+    explain(library, options, output);
+    output.finish();
+}
+
 // What the library throws becomes a failure that says what to do.
-void importBook(const Options& options) {
+void carryOut(const Options& options) {
     refuseToOverwrite(options);
     const Library library(options.library);
     try {
-        Workbook workbook(library, options);
-        show(workbook, options);
+        if (options.explain) return explainBook(library, options);
+        importBook(library, options);
     } catch (const ClosedPipe&) {
         throw;
     } catch (const Interrupted&) {
         throw;
     } catch (...) {
-        throw currentFailure(options.book);
+        throw explained(currentFailure(options.book), options.book);
     }
 }
 
@@ -63,7 +88,7 @@ int run(int count, const char* const* arguments) {
     try {
         const Request request = parseOptions(count, arguments);
         if (request.answer.empty()) {
-            importBook(request.options);
+            carryOut(request.options);
         } else {
             print(request.answer);
         }
@@ -72,10 +97,10 @@ int run(int count, const char* const* arguments) {
     } catch (const Interrupted& interrupt) {
         return kSignalBase + interrupt.signal;
     } catch (const Failure& failure) {
-        printFailure(failure.what());
+        printLine(failure.what());
         return failure.code();
     } catch (const std::exception& error) {
-        printFailure(error.what());
+        printLine(error.what());
         return kSystemFailure;
     }
     return kSuccess;

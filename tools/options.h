@@ -55,6 +55,7 @@ struct Options {
     std::vector<std::string> sheets;  // names or keys; empty for all
     std::optional<size_t> head;       // rows
     bool asShown = false;
+    bool explain = false;  // instead of an import; the view is Tables or Json
     ReadSettings settings;
 };
 

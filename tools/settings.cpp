@@ -10,7 +10,6 @@
 #include "model/host/i_worksheet.h"
 #include "tools/counted.h"
 #include "tools/date_time_helper.h"
-#include "tools/exit_code.h"
 
 namespace dp::tool {
 
@@ -28,10 +27,6 @@ void applyMissing(IDataProvider& provider, const ReadSettings& settings) {
     if (settings.missingText) {
         const auto& [from, to] = *settings.missingText;
         provider.SetMissingText(from.c_str(), to.c_str());
-    }
-    if (settings.missingNumber) {
-        const auto& [from, to] = *settings.missingNumber;
-        provider.SetMissingNumeric(numberOr(from, settings), numberOr(to, settings));
     }
     if (settings.missingWord) {
         const auto& [from, to] = *settings.missingWord;
@@ -53,32 +48,21 @@ bool isNamed(const SheetEntry& sheet, const std::string& name) {
     return sheet.title == name || std::to_string(sheet.key) == name;
 }
 
-[[noreturn]] void noSuchSheet(const Options& options, const std::vector<SheetEntry>& sheets,
-                              const std::string& name) {
-    std::string list;
-    for (const SheetEntry& sheet : sheets) {
-        list += (list.empty() ? "" : ", ") + sheet.title + " (" + std::to_string(sheet.key) + ")";
-    }
-    throw Failure(kUsage, options.book + ": there is no worksheet \"" + name + "\"; " +
-                              (list.empty() ? "it has none with cells" : "it has " + list));
-}
-
 // The key of the worksheet with this name, else of the one with this key.
-int keyOf(const Options& options, const std::vector<SheetEntry>& sheets, const std::string& name) {
+int keyOf(const std::vector<SheetEntry>& sheets, const std::string& name) {
     const auto titled = [&](const SheetEntry& sheet) { return sheet.title == name; };
     auto found = std::find_if(sheets.begin(), sheets.end(), titled);
     if (found == sheets.end()) {
         found = std::find_if(sheets.begin(), sheets.end(),
                              [&](const SheetEntry& sheet) { return isNamed(sheet, name); });
     }
-    if (found == sheets.end()) noSuchSheet(options, sheets, name);
+    if (found == sheets.end()) throw UnknownWorksheet(name, worksheetsText(sheets));
     return found->key;
 }
 
-std::set<int> keysOf(const Options& options, const std::vector<SheetEntry>& sheets,
-                     const std::vector<std::string>& names) {
+std::set<int> keysOf(const std::vector<SheetEntry>& sheets, const std::vector<std::string>& names) {
     std::set<int> keys;
-    for (const std::string& name : names) keys.insert(keyOf(options, sheets, name));
+    for (const std::string& name : names) keys.insert(keyOf(sheets, name));
     return keys;
 }
 
@@ -127,7 +111,7 @@ class ColumnOptions {
     template <class Act>
     void forEach(const ColumnReference& column, Act act) const {
         const bool every = column.worksheet.empty();
-        const int wanted = every ? 0 : keyOf(options_, sheets_, column.worksheet);
+        const int wanted = every ? 0 : keyOf(sheets_, column.worksheet);
         for (const SheetEntry& sheet : sheets_) {
             if (every || sheet.key == wanted) act(static_cast<unsigned>(sheet.key), column.column);
         }
@@ -164,8 +148,8 @@ class ColumnOptions {
 
 void excludeSheets(IDataProvider& provider, const Options& options,
                    const std::vector<SheetEntry>& sheets) {
-    const std::set<int> wanted = keysOf(options, sheets, options.sheets);
-    const std::set<int> unwanted = keysOf(options, sheets, options.settings.excludedSheets);
+    const std::set<int> wanted = keysOf(sheets, options.sheets);
+    const std::set<int> unwanted = keysOf(sheets, options.settings.excludedSheets);
     for (const SheetEntry& sheet : sheets) {
         const bool left =
             unwanted.count(sheet.key) != 0 || (!wanted.empty() && wanted.count(sheet.key) == 0);
@@ -174,6 +158,18 @@ void excludeSheets(IDataProvider& provider, const Options& options,
 }
 
 }  // namespace
+
+std::string worksheetsText(const std::vector<SheetEntry>& sheets) {
+    constexpr size_t kMost = 10;
+    if (sheets.empty()) return "it has none with cells";
+    std::string text;
+    for (size_t i = 0; i < std::min(sheets.size(), kMost); ++i) {
+        text += (i == 0 ? "it has \"" : ", \"") + sheets[i].title + "\" (" +
+                std::to_string(sheets[i].key) + ")";
+    }
+    const size_t more = sheets.size() - std::min(sheets.size(), kMost);
+    return more == 0 ? text : text + " and " + std::to_string(more) + " more";
+}
 
 std::vector<SheetEntry> listSheets(IDataProvider& provider) {
     IWorksheetFinder& finder = *provider.GetWorksheetFinder();
@@ -188,14 +184,21 @@ std::vector<SheetEntry> listSheets(IDataProvider& provider) {
     return sheets;
 }
 
+void applyNumbers(IDataProvider& provider, const ReadSettings& settings) {
+    if (settings.range) provider.SetNumericRange(settings.range->first, settings.range->second);
+    if (!settings.missingNumber) return;
+    const auto& [from, to] = *settings.missingNumber;
+    provider.SetMissingNumeric(numberOr(from, settings), numberOr(to, settings));
+}
+
 void applySettings(IDataProvider& provider, const ReadSettings& settings) {
     auto helper = std::make_unique<DateTimeHelper>();
     provider.SetDateTimeVariableFormatHelper(helper.release());
     provider.SetReadOptionDefaultUseVariableNameRow(settings.names.value_or(VNR_GIVEN));
     provider.SetPreviewing(settings.preview);
     if (settings.decimal) provider.SetInputDecimal(*settings.decimal);
-    if (settings.range) provider.SetNumericRange(settings.range->first, settings.range->second);
     applyMissing(provider, settings);
+    applyNumbers(provider, settings);
     applyTexts(provider, settings);
 }
 

@@ -5,17 +5,35 @@
 #include <vector>
 
 #include "model/host/i_data_provider.h"
+#include "tools/exit_code.h"
 #include "tools/options.h"
 
 namespace dp::tool {
 
 // The library's own mark of a missing number, until a host sets another one.
 constexpr double kDefaultMissing = 1.23456e30;
+// The library's own limit of numbers on both sides.
+constexpr double kDefaultRange = 1.001e18;
 
 struct SheetEntry {
     int key;
     std::string title;
 };
+
+// A worksheet that the user named is none of those with cells. The text says which there are.
+class UnknownWorksheet : public Failure {
+  public:
+    UnknownWorksheet(std::string name, const std::string& text)
+        : Failure(kUsage, text), name_(std::move(name)) {}
+
+    const std::string& name() const { return name_; }
+
+  private:
+    std::string name_;
+};
+
+// "it has", followed by the first few worksheets with their keys.
+std::string worksheetsText(const std::vector<SheetEntry>& sheets);
 
 // The worksheets that are not excluded, in workbook order.
 std::vector<SheetEntry> listSheets(IDataProvider& provider);
@@ -23,8 +41,12 @@ std::vector<SheetEntry> listSheets(IDataProvider& provider);
 // Settings that must stand when the workbook is opened.
 void applySettings(IDataProvider& provider, const ReadSettings& settings);
 
-// Options that name worksheets and columns of the open workbook. Throws a Failure when there is no
-// such worksheet. Answers, by key, the 1-based row of the variable names, 0 for none.
+// Those of them that turn numbers into missing ones: the range and the number that marks one. What
+// is not set stays as it is.
+void applyNumbers(IDataProvider& provider, const ReadSettings& settings);
+
+// Options that name worksheets and columns of the open workbook. Throws UnknownWorksheet when there
+// is no such one. Answers, by key, the 1-based row of the variable names, 0 for none.
 std::map<int, unsigned> applyReadOptions(IDataProvider& provider, const Options& options);
 
 }  // namespace dp::tool

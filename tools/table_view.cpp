@@ -35,9 +35,9 @@ std::string layoutText(const LoadedWorksheet& worksheet) {
 const char* kindText(Kind kind) {
     switch (kind) {
         case Kind::Number:
-            return "number";
+            return "numeric";
         case Kind::DateTime:
-            return "date-time";
+            return "datetime";
         case Kind::Text:
             break;
     }

@@ -85,6 +85,15 @@ std::string cutToWidth(const std::string& text, int width) {
     return width <= 0 ? std::string() : encoded(beginning(given, width - 1)) + kEllipsis;
 }
 
+std::string shellWord(const std::string& text) {
+    constexpr const char* kPlain =
+        "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ0123456789_.-=/";
+    if (!text.empty() && text.find_first_not_of(kPlain) == std::string::npos) return text;
+    std::string quoted = "'";
+    for (const char c : text) quoted += c == '\'' ? "'\\''" : std::string(1, c);
+    return quoted + "'";
+}
+
 std::string padded(const std::string& text, int width, bool toTheRight) {
     const int missing = width - displayWidth(text);
     const std::string spaces(missing > 0 ? static_cast<size_t>(missing) : 0, ' ');

@@ -26,7 +26,9 @@ std::vector<int> columnKeys(IVariableFinder& finder, int sheet) {
 }  // namespace
 
 Workbook::Workbook(const Library& library, const Options& options)
-    : options_(options), provider_(library.createProvider(providerType(library, options.book))) {}
+    : options_(options),
+      provider_(library.createProvider(providerType(library, options.book))),
+      losses_(options) {}
 
 Workbook::~Workbook() { provider_->CloseFile(); }
 
@@ -44,8 +46,24 @@ void Workbook::open() {
     const long result = provider_->OpenFile(options_.book.c_str(), IDataProvider::FileAccess::Read);
     if (result != 0) throw readFailure(options_.book, result);
     stopIfInterrupted();
-    nameRows_ = applyReadOptions(*provider_, options_);
+    try {
+        nameRows_ = applyReadOptions(*provider_, options_);
+    } catch (const UnknownWorksheet& unknown) {
+        refuse(unknown);
+    }
     progress_.erase();
+}
+
+// A worksheet without cells is in the workbook, but no host gets to see it.
+void Workbook::refuse(const UnknownWorksheet& unknown) {
+    provider_->CloseFile();
+    const std::vector<std::string> names = worksheetNames();
+    const bool empty = std::find(names.begin(), names.end(), unknown.name()) != names.end();
+    throw Failure(kUsage, options_.book + ": " +
+                              (empty ? "the worksheet \"" + unknown.name() +
+                                           "\" has no cells and is not imported"
+                                     : "there is no worksheet \"" + unknown.name() + "\"") +
+                              "; " + unknown.what());
 }
 
 std::vector<SheetEntry> Workbook::worksheets() { return listSheets(*provider_); }
@@ -72,6 +90,7 @@ void Workbook::loadColumns(LoadedWorksheet& worksheet) {
         IColumn* column = nullptr;
         if (finder.FindColumn(keys[i], &column, false)) {
             worksheet.columns.emplace_back(column, missing(), options_.settings.preview);
+            losses_.note(*provider_, worksheet.title, worksheet.columns.back());
         } else {
             ++worksheet.excludedColumns;
         }

@@ -9,6 +9,7 @@
 #include "tools/column.h"
 #include "tools/counted.h"
 #include "tools/library.h"
+#include "tools/losses.h"
 #include "tools/options.h"
 #include "tools/progress.h"
 #include "tools/settings.h"
@@ -41,7 +42,7 @@ class Workbook {
     Workbook(const Workbook&) = delete;
     Workbook& operator=(const Workbook&) = delete;
 
-    // The names of all worksheets, without reading any cell. Not after open().
+    // The names of all worksheets, without reading any cell. Not while the workbook is open.
     std::vector<std::string> worksheetNames();
 
     // Hands the settings over, reads the workbook and hands over the options of its worksheets.
@@ -50,10 +51,16 @@ class Workbook {
     std::vector<SheetEntry> worksheets();
     LoadedWorksheet load(const SheetEntry& sheet);
 
+    // What became missing in the columns loaded so far.
+    const Losses& losses() const { return losses_; }
+    // Where the library has unpacked the open workbook.
+    std::string folder() const { return provider_->GetTempDirectoryPath(); }
+
     // The number that marks a missing value.
     double missing() const { return options_.settings.missing.value_or(kDefaultMissing); }
 
   private:
+    [[noreturn]] void refuse(const UnknownWorksheet& unknown);
     Counted<IWorksheet> findWorksheet(int key);
     void loadColumns(LoadedWorksheet& worksheet);
     Layout layoutOf(const LoadedWorksheet& worksheet) const;
@@ -61,6 +68,7 @@ class Workbook {
     const Options& options_;
     Counted<IDataProvider> provider_;
     Progress progress_;
+    Losses losses_;
     std::map<int, unsigned> nameRows_;  // by worksheet key
 };
 

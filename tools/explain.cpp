@@ -1,0 +1,114 @@
+#include "tools/explain.h"
+
+#include <algorithm>
+#include <cctype>
+#include <optional>
+#include <vector>
+
+#include <nlohmann/json.hpp>
+
+#include "tools/inspection.h"
+#include "tools/interrupt.h"
+#include "tools/text.h"
+#include "tools/traits.h"
+#include "tools/workbook.h"
+
+namespace dp::tool {
+
+namespace {
+
+constexpr const char* kNothing = "nothing to explain";
+
+// The failure of an import; none when it goes well.
+std::optional<Failure> tryImport(const Library& library, const Options& options) {
+    try {
+        Workbook(library, options).open();
+    } catch (const Interrupted&) {
+        throw;
+    } catch (...) {
+        return currentFailure(options.book);
+    }
+    return std::nullopt;
+}
+
+// Failures that say nothing about the book.
+bool isOfTheSystem(const Failure& failure) {
+    const int code = failure.code();
+    return code == kNoSuchFile || code == kTemporaryDirectory || code == kSystemFailure ||
+           code == kLibraryFailure;
+}
+
+std::vector<Trait> allTraits(const Library& library, const Options& options) {
+    const std::optional<Failure> failure = tryImport(library, options);
+    if (failure && isOfTheSystem(*failure)) throw *failure;
+    const Findings findings = inspect(options.book);
+    std::vector<Trait> traits =
+        traitsOf(findings, askForStyles(library, options.book, findings.formats));
+    const bool explained =
+        std::any_of(traits.begin(), traits.end(), [](const Trait& trait) { return trait.fatal; });
+    if (failure && !explained) {
+        const std::string text = failure->what();
+        traits.push_back(unreadableTrait(findings, text.substr(options.book.size() + 2)));
+    }
+    return traits;
+}
+
+// Nothing when the look fails: the import's own outcome stands.
+Findings quickFindings(const std::string& book, const std::string& folder) {
+    try {
+        return inspectQuickly(book, folder);
+    } catch (const std::exception&) {
+        Findings nothing;
+        nothing.kind = FileKind::Workbook;
+        return nothing;
+    }
+}
+
+std::string line(const Trait& trait) {
+    std::string text = printable(trait.found + ": " + trait.effect + "; " + trait.advice);
+    text[0] = static_cast<char>(std::toupper(static_cast<unsigned char>(text[0])));
+    return text + "\n";
+}
+
+std::string jsonText(const std::string& book, const std::vector<Trait>& traits) {
+    using Json = nlohmann::ordered_json;
+    Json list = Json::array();
+    for (const Trait& trait : traits) {
+        list.push_back({{"trait", trait.key},
+                        {"found", validUtf8(trait.found)},
+                        {"effect", validUtf8(trait.effect)},
+                        {"advice", validUtf8(trait.advice)},
+                        {"importFails", trait.fatal}});
+    }
+    return Json({{"file", validUtf8(book)}, {"traits", list}}).dump() + "\n";
+}
+
+}  // namespace
+
+void explain(const Library& library, const Options& options, Output& output) {
+    const std::vector<Trait> traits = allTraits(library, options);
+    if (options.view == View::Json) return output.write(jsonText(options.book, traits));
+    for (const Trait& trait : traits) output.write(line(trait));
+    if (traits.empty()) output.write(printable(options.book) + ": " + kNothing + "\n");
+}
+
+std::string importNote(const std::string& book, const std::string& folder) {
+    std::string text;
+    for (const Trait& trait : quickTraitsOf(quickFindings(book, folder))) {
+        text += (text.empty() ? "" : "; ") + trait.note;
+    }
+    return text.empty() ? text : book + ": " + text + "; see dpxlsx --explain";
+}
+
+Failure explained(const Failure& failure, const std::string& book) {
+    const int code = failure.code();
+    if (code != kMalformedWorkbook && code != kNoPackage && code != kNoWorkbook) return failure;
+    for (const Trait& trait : traitsOf(quickFindings(book, ""), {})) {
+        if (!trait.fatal) continue;
+        return {failure.code(),
+                book + ": " + trait.found + "; " + trait.advice + "; see dpxlsx --explain"};
+    }
+    return failure;
+}
+
+}  // namespace dp::tool

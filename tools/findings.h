@@ -1,0 +1,77 @@
+#pragma once
+
+#include <cstddef>
+#include <map>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "tools/file_kind.h"
+
+namespace dp::tool {
+
+// Cells, ranges or texts with one trait. Only the first place is kept, however many there are.
+struct Places {
+    size_t count = 0;
+    std::string first;  // such as "Sheet1!B2"; the worksheet alone when the cell names no place
+
+    void add(const std::string& place) {
+        if (count++ == 0) first = place;
+    }
+};
+
+// A part that the package has, but not under the name at which the import looks.
+struct MovedPart {
+    std::string wanted;
+    std::string found;
+};
+
+// A number format of cells with numbers.
+struct UsedFormat {
+    std::string code;  // "built-in 30" for one that has none
+    Places cells;
+    bool isDate;  // by the rules of spreadsheet programs
+};
+
+// Names of which the first few are kept.
+struct Names {
+    size_t count = 0;
+    std::vector<std::string> first;
+
+    void add(const std::string& name) {
+        constexpr size_t kMost = 3;
+        if (count++ < kMost) first.push_back(name);
+    }
+};
+
+// What a look into a file found.
+struct Findings {
+    FileKind kind = FileKind::Unknown;
+    bool namedXlsx = true;
+
+    Names prefixedParts;
+    std::string prefixedName;  // the first one, such as "x:workbook"
+    bool workbookPrefixed = false;
+    bool relationshipPrefixed = false;  // a worksheet's id is written otherwise than r:id
+    bool stringsPrefixed = false;
+    bool stylesPrefixed = false;
+    Names prefixedWorksheets;
+
+    bool stringsWithoutCount = false;
+    size_t sharedTexts = 0;  // cells
+    Places isoDates;
+    bool datesFrom1904 = false;
+    bool hasStyles = true;
+    std::vector<MovedPart> moved;
+
+    std::map<int, UsedFormat> formats;  // by index of the cell style
+    Places mergedRanges;
+    size_t phoneticTexts = 0;  // shared texts
+    Places phoneticCells;      // inline texts
+    Places errors;
+    Names hiddenWorksheets;           // those with cells
+    Places runs;                      // inline texts of several runs
+    std::vector<std::string> broken;  // parts that are missing or break off
+};
+
+}  // namespace dp::tool

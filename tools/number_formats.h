@@ -1,0 +1,32 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <vector>
+
+#include "tools/findings.h"
+#include "tools/package.h"
+
+namespace dp::tool {
+
+// The number formats of a package as spreadsheet programs read them.
+class NumberFormats {
+  public:
+    // Reads the style sheet in the entry of this name and notes what it finds there.
+    void read(Package& package, const std::string& name, Findings& findings);
+
+    // How many cell styles there are.
+    size_t size() const { return formatIds_.size(); }
+    // The format of a cell style, 0-based and below size(), used by no cell yet.
+    UsedFormat of(int style) const;
+
+  private:
+    std::map<int, std::string> codes_;
+    std::vector<int> formatIds_;  // by cell style
+};
+
+// Whether spreadsheet programs show numbers under this code as dates or times: its first section
+// has a letter of a date, in any case, that is not quoted, escaped or the name of a colour.
+bool isDateCode(const std::string& code);
+
+}  // namespace dp::tool
