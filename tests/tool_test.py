@@ -3,6 +3,7 @@
 
 import csv
 import fcntl
+import html
 import io
 import json
 import os
@@ -11,6 +12,7 @@ import pty
 import re
 import resource
 import signal
+import shlex
 import shutil
 import struct
 import subprocess
@@ -20,9 +22,142 @@ import termios
 import unittest
 import zipfile
 
-TOOL = sys.argv.pop(1)
-SOURCE = pathlib.Path(sys.argv.pop(1))
+import jsonschema
+
+TOOL = os.path.abspath(sys.argv.pop(1))
+SOURCE = pathlib.Path(sys.argv.pop(1)).absolute()
 SAMPLE = SOURCE / "samples" / "sample.xlsx"
+
+
+SCHEMA = jsonschema.Draft202012Validator(
+    json.loads((SOURCE / "docs" / "tool.schema.json").read_text()))
+SPREADSHEET = "http://schemas.openxmlformats.org/spreadsheetml/2006/main"
+RELATIONSHIPS = "http://schemas.openxmlformats.org/officeDocument/2006/relationships"
+WORKBOOK, LINKS, STYLES, STRINGS, SHEET = (
+    "xl/workbook.xml", "xl/_rels/workbook.xml.rels", "xl/styles.xml", "xl/sharedStrings.xml",
+    "xl/worksheets/sheet1.xml")
+# A small workbook without a surprise: a name and a text, a name and a date.
+PARTS = {
+    WORKBOOK: f'<workbook xmlns="{SPREADSHEET}" xmlns:r="{RELATIONSHIPS}"><workbookPr/><sheets>'
+              '<sheet name="My Data" sheetId="1" r:id="a"/></sheets></workbook>',
+    LINKS: '<Relationships xmlns="http://schemas.openxmlformats.org/package/2006/relationships">'
+           f'<Relationship Id="a" Type="{RELATIONSHIPS}/worksheet" Target="worksheets/sheet1.xml"/>'
+           '</Relationships>',
+    STYLES: f'<styleSheet xmlns="{SPREADSHEET}"><numFmts count="1">'
+            '<numFmt numFmtId="164" formatCode="m/d/yyyy"/></numFmts>'
+            '<cellXfs count="2"><xf numFmtId="0"/><xf numFmtId="164"/></cellXfs></styleSheet>',
+    STRINGS: f'<sst xmlns="{SPREADSHEET}" uniqueCount="2"><si><t>Name</t></si>'
+             '<si><t>Oslo</t></si></sst>',
+    SHEET: f'<worksheet xmlns="{SPREADSHEET}"><sheetData>'
+           '<row r="1"><c r="A1" t="s"><v>0</v></c><c r="B1" t="s"><v>0</v></c></row>'
+           '<row r="2"><c r="A2" t="s"><v>1</v></c><c r="B2" s="1"><v>45296</v></c></row>'
+           '</sheetData></worksheet>',
+}
+CELL = '<c r="B2" s="1"><v>45296</v></c>'
+
+
+def packed(target, parts, packing=zipfile.ZIP_STORED):
+    """Writes a package of these parts, those that are None left out."""
+    with zipfile.ZipFile(target, "w", packing) as made:
+        for name, content in parts.items():
+            if content is not None:
+                made.writestr(name, content)
+    return target
+
+
+def prefixed(*names):
+    """The small workbook with a prefix on all elements of some parts."""
+    return {**PARTS, **{name: re.sub("<(/?)(?=[A-Za-z])", r"<\1x:", PARTS[name]).replace(
+        "xmlns=", "xmlns:x=") for name in names}}
+
+
+def changed(name, old, new):
+    assert old in PARTS[name]
+    return {**PARTS, name: PARTS[name].replace(old, new)}
+
+
+def renamed(old, new, **more):
+    return {**PARTS, old: None, new: PARTS[old], **more}
+
+
+def with_format(code):
+    return changed(STYLES, "m/d/yyyy", html.escape(code))
+
+
+def compound(stream):
+    """As much of a compound file as its stream's name needs."""
+    name = (stream + "\0").encode("utf-16-le")
+    entry = name.ljust(64, b"\0") + bytes([len(name), 0, 2])
+    return b"\xd0\xcf\x11\xe0\xa1\xb1\x1a\xe1".ljust(1024, b"\0") + entry.ljust(128, b"\0")
+
+
+# The traits of a book, the book, what the line about it says, and how a plain import ends.
+TRAITS = [
+    ("", PARTS, "nothing to explain", 0),
+    ("namespace-prefix", prefixed(WORKBOOK), "elements of xl/workbook.xml have.*<x:sheets>", 13),
+    ("namespace-prefix", prefixed(LINKS), "<x:Relationships>.*the import fails", 13),
+    ("namespace-prefix", changed(WORKBOOK, "r:", "q:") | {
+        WORKBOOK: PARTS[WORKBOOK].replace("xmlns:r", "xmlns:q").replace("r:id", "q:id")},
+     "r:id has another prefix", 13),
+    ("namespace-prefix", prefixed(SHEET), 'worksheet "My Data" comes out empty', 0),
+    ("namespace-prefix", prefixed(STRINGS, STYLES),
+     "shared texts are missing, dates arrive as day numbers", 0),
+    ("shared-strings-without-count", changed(STRINGS, ' uniqueCount="2"', ""),
+     r"missing \(3 cells\)", 0),
+    ("iso-dates", changed(SHEET, CELL, '<c r="B2" t = \'d\'><v>2024-01-05</v></c>'),
+     r"1 date \(My Data!B2\).*number of the year", 0),
+    ("date-system-1904", changed(WORKBOOK, "<workbookPr", '<workbookPr date1904="true"'),
+     "1,462 days early; add 1462", 0),
+    ("password-protected", compound("EncryptedPackage"), "protected with a password", 22),
+    ("old-workbook", compound("Workbook"), "binary workbook of old", 22),
+    ("old-workbook", compound("Book"), "binary workbook of old", 22),
+    ("not-a-package", compound("WordDocument"), "old office program", 22),
+    ("spreadsheet-2003", '<?xml version="1.0"?><Workbook xmlns="urn:schemas-microsoft-com:office:'
+     'spreadsheet"/>', "XML Spreadsheet 2003", 22),
+    ("web-page", "<HTML><body><table/>", "web page", 22),
+    ("plain-text", "a;b\n1;2\n", "plain text", 22),
+    ("not-a-package", "\0\1\2", "no workbook of any known kind", 22),
+    ("empty-file", "", "file is empty", 22),
+    ("cut-package", "PK\3\4...", "cut off", 22),
+    ("open-document", {"mimetype": "x", "content.xml": "<x/>"}, r"\.ods", 25),
+    ("text-document", {"word/document.xml": "<x/>"}, r"\.docx", 25),
+    ("presentation", {"ppt/presentation.xml": "<x/>"}, r"\.pptx", 25),
+    ("binary-workbook", {"xl/workbook.bin": "x"}, r"\.xlsb", 25),
+    ("other-archive", {"photo.jpg": "x"}, "ZIP archive without a workbook", 25),
+    ("no-style-sheet", {**PARTS, STYLES: None}, "no style sheet", 25),
+    ("part-names", renamed(STRINGS, "xl/SharedStrings.xml"), "shared texts are missing", 0),
+    ("part-names", renamed(SHEET, "XL\\worksheets\\Sheet1.xml"), "the import fails", 13),
+    ("part-names", renamed(WORKBOOK, "book/main.xml", **{
+        LINKS: None, "book/_rels/main.xml.rels": PARTS[LINKS], "book/worksheets/sheet1.xml":
+        PARTS[SHEET], "_rels/.rels": PARTS[LINKS].replace(
+            "worksheets/sheet1", "/book/main").replace("worksheet", "officeDocument")}),
+     'has "book/main.xml" where "xl/workbook.xml" belongs', 25),
+    ("taken-for-dates", with_format("[Red]0.00"), "--type 'My Data!B=numeric'", 0),
+    ("taken-for-dates", with_format('0" days"'), '"0" days""', 0),
+    ("not-taken-for-dates", with_format("DD/MM/YYYY"), "--type 'My Data!B=datetime'", 0),
+    ("not-taken-for-dates", changed(STYLES, '<xf numFmtId="164"/>', '<xf numFmtId="31"/>'),
+     "built-in 31", 0),
+    ("not-taken-for-dates", changed(STYLES, ' count="1"', ""), "day numbers arrive", 0),
+    ("default-date-style", with_format("dd\\.mm\\.yyyy"), '"dd.mm.yyyy".*default date style', 0),
+    ("default-date-style", with_format("[HH]:mm"), "values are right", 0),
+    ("taken-for-dates", with_format('0.0_h"dmy"\\s*y[>5]'), "0.0_h", 0),
+    ("merged-cells", changed(SHEET, "</sheetData>", '</sheetData><mergeCells>'
+     '<mergeCell ref="A1:B1"/><mergeCell ref="A2:B2"/></mergeCells>'),
+     r"2 merged ranges \(first: My Data!A1:B1\)", 0),
+    ("phonetic-texts", changed(STRINGS, "Oslo</t>", "Oslo</t><rPh><t>o</t></rPh>"
+     "<rPh><t>s</t></rPh>"), "1 shared text with.*follow", 0),
+    ("phonetic-texts", changed(SHEET, CELL, '<c r="B2" t="inlineStr"><is><t>a</t><rPh><t>b</t>'
+     '</rPh></is></c>'), "1 inline text .*replace", 0),
+    ("error-cells", changed(SHEET, CELL, '<c r="B2" t="e"><v>#N/A</v></c>'), "1 cell ", 0),
+    ("hidden-worksheets", changed(WORKBOOK, "<sheet ", '<sheet state="veryHidden" '),
+     "--exclude-sheet 'My Data'", 0),
+    ("inline-runs", changed(SHEET, CELL, '<c r="B2" t="inlineStr"><is><r><t>a</t></r><r><t>b</t>'
+     '</r></is></c>'), "only the last piece", 0),
+    ("unreadable", changed(SHEET, "</sheetData>", ""), '"xl/worksheets/sheet1.xml" is .*damaged', 13),
+    ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
+]
+# Those that a plain import tells of when it goes well.
+WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904")
 
 
 def repacked(target, change, packing=zipfile.ZIP_STORED):
@@ -50,15 +185,29 @@ class ToolTest(unittest.TestCase):
         return {**kept, "TMPDIR": str(self.temporary), **more}
 
     def run_tool(self, *arguments, expected=0, **more):
+        """What the tool prints, on standard error when it is to fail; notes go to self.notes."""
         done = subprocess.run([TOOL, *map(str, arguments)], capture_output=True, timeout=120,
                               cwd=self.folder, env=self.environment(**more), check=False)
         errors = done.stderr.decode()
         self.assertEqual(done.returncode, expected, f"{arguments}: {errors}")
-        self.assertEqual(errors.count("\n"), 0 if expected == 0 else 1, errors)
+        self.notes = errors.splitlines()
+        for line in self.notes:
+            self.assertRegex(line, "^dpxlsx: ")
+        if expected != 0:
+            self.assertEqual(len(self.notes), 1, errors)
         return done.stdout.decode() if expected == 0 else errors
 
+    def book(self, content, name="book.xlsx"):
+        path = self.folder / name
+        if isinstance(content, dict):
+            return packed(path, content)
+        path.write_bytes(content if isinstance(content, bytes) else content.encode())
+        return path
+
     def read(self, *arguments):
-        return json.loads(self.run_tool(SAMPLE, "--json", *arguments))["worksheets"]
+        book = json.loads(self.run_tool(SAMPLE, "--json", *arguments))
+        SCHEMA.validate(book)
+        return book["worksheets"]
 
     def columns(self, *arguments):
         return {c["name"]: c for c in self.read(*arguments)[0]["columns"]}
@@ -67,7 +216,7 @@ class ToolTest(unittest.TestCase):
         text = self.run_tool(SAMPLE)
         for line in ("Worksheet 1: Measurements",
                      "14 columns, 12 rows of data; variable names in row 1, data from row 2",
-                     "  9         9  Taken       date-time    12        2          0  "
+                     "  9         9  Taken       datetime    12        2          0  "
                      "date-time, M/d/yy H:mm",
                      "and 2 more rows", "Worksheet 2: Readings 2024"):
             self.assertIn(line, text)
@@ -103,6 +252,7 @@ class ToolTest(unittest.TestCase):
         self.assertTrue(shown.startswith("\r\x1b[KOpening "))
         lines = re.sub("(\r\x1b\\[K[^\r\n]*)?\r\x1b\\[K", "", shown).replace("\r", "").splitlines()
         self.assertIn("Worksheet 1: Measurements", lines)
+        self.assertTrue(lines.pop().startswith("dpxlsx: "))  # a note goes whole
         plain = [line for line in lines if line.isascii() or line.endswith("…")]
         self.assertLessEqual(max(map(len, plain)), 60)
 
@@ -144,8 +294,8 @@ class ToolTest(unittest.TestCase):
         self.run_tool(SAMPLE, "--csv", "out/")
         self.assertEqual(sorted(p.name for p in (self.folder / "out").iterdir()),
                          ["Measurements.csv", "Readings 2024.csv"])
-        self.assertIn("choose one with --sheet",
-                      self.run_tool(SAMPLE, "--csv", "one.csv", expected=2))
+        self.assertRegex(self.run_tool(SAMPLE, "--csv", "one.csv", expected=2),
+                         r'"Measurements" \(1\), "Readings 2024" \(2\); add --sheet')
 
     def test_worksheet_titles_make_safe_file_names(self):
         title = b"../../up"
@@ -209,13 +359,15 @@ class ToolTest(unittest.TestCase):
                  [SAMPLE, "--names", "none", "--name-row", "3"], [SAMPLE, "--type", "A=colour"],
                  [SAMPLE, "--exclude", "XFE"], [SAMPLE, "--rename", "A"], [SAMPLE, "--range", "5"],
                  [SAMPLE, "--range", "2:1"], [SAMPLE, "--decimal", "1"], [SAMPLE, "--list", "--csv"],
-                 [SAMPLE, "--csv", "--json"], [SAMPLE, "--rows", "0"], [SAMPLE, "--missing", "nan"],
+                 [SAMPLE, "--csv", "--json"], [SAMPLE, "--list", "--sheet", "1"],
+                 [SAMPLE, "--explain", "--csv"], [SAMPLE, "--explain", "--list"], [SAMPLE, "--rows", "0"], [SAMPLE, "--missing", "nan"],
                  [SAMPLE, "--exclude", "Nowhere!A"], [SAMPLE, SAMPLE], [SAMPLE, "--as-shown"],
                  [SAMPLE, "--missing-word", "a=1", "--missing-number", "1=2"],
                  [SAMPLE, "--json", SAMPLE]]
         for arguments in cases:
             with self.subTest(arguments):
                 self.run_tool(*arguments, expected=2)
+        self.assertIn("has no cells", self.run_tool(SAMPLE, "--sheet", "Empty", expected=2))
 
     def damaged(self, name):
         """A workbook for the row `name` of the table of failures."""
@@ -268,6 +420,12 @@ class ToolTest(unittest.TestCase):
                               env=self.environment(), check=False)
         os.close(writer)
         self.assertEqual((done.returncode, done.stderr), (0, b""))
+        child = subprocess.Popen([TOOL, str(self.many_rows()), "--csv"], stdout=subprocess.PIPE,
+                                 stderr=subprocess.PIPE, env=self.environment())
+        self.assertEqual(child.stdout.readline(), b"1.5\n")
+        child.stdout.close()
+        self.assertEqual((child.stderr.read(), child.wait()), (b"", 0))
+        child.stderr.close()
 
     def test_an_interrupt_leaves_nothing_behind(self):
         # The pipe is never read: the program waits in the middle of its output.
@@ -338,12 +496,135 @@ class ToolTest(unittest.TestCase):
 
     def test_the_help_fits_a_screen_and_the_manual_has_every_option(self):
         text = self.run_tool("--help")
-        self.assertLessEqual(text.count("\n"), 50)
-        self.assertLessEqual(max(map(len, text.splitlines())), 100)
+        self.assertLessEqual(text.count("\n"), 40)
+        self.assertLessEqual(max(map(len, text.splitlines())), 80)
         manual = (SOURCE / "docs" / "tool.md").read_text()
-        for option in re.findall(r"--[a-z-]+", text):
-            self.assertIn(f"`{option}", manual)
+        options = set(re.findall(r"--[a-z-]+", text))
+        self.assertEqual(options, set(re.findall(r"`(--[a-z-]+)", manual)))
         self.assertRegex(self.run_tool("--version"), r"^dpxlsx \d+\.\d+\.\d+\n$")
+
+    def test_traits_are_explained(self):
+        for key, content, text, code in TRAITS:
+            with self.subTest(key=key, text=text):
+                book = self.book(content)
+                self.assertRegex(self.run_tool(book, "--explain"), f"(?i){text}")
+                explained = json.loads(self.run_tool(book, "--explain", "--json"))
+                SCHEMA.validate(explained)
+                self.assertEqual([t["trait"] for t in explained["traits"]], [key] if key else [])
+                fails = [t["importFails"] for t in explained["traits"]]
+                self.assertEqual(fails, [code != 0] if key else [])
+                self.run_tool(book, expected=code)
+                noted = [note for note in self.notes if note.endswith("see dpxlsx --explain")]
+                told = key in WORST if code == 0 else key != "unreadable"
+                self.assertEqual(len(noted), told, self.notes)
+
+    def test_traits_come_in_order_and_each_says_where(self):
+        book = self.book(renamed(WORKBOOK, "x.xml") | {WORKBOOK: PARTS[WORKBOOK].replace(
+            "<workbookPr", '<workbookPr date1904="1"'), STRINGS: changed(
+                STRINGS, ' uniqueCount="2"', "")[STRINGS], SHEET: PARTS[SHEET].replace(
+                    CELL, CELL + '<c t="e"><v>#REF!</v></c>')})
+        self.assertEqual([line.split(":")[0] for line in
+                          self.run_tool(book, "--explain").splitlines()],
+                         ["The table of shared texts does not say how many there are (uniqueCount)",
+                          "The book counts its dates from 1904",
+                          "1 cell (My Data) with an error such as #DIV/0!"])
+        self.run_tool(book)
+        self.assertIn("texts are missing; dates arrive 1,462 days early", self.notes[0])
+        self.run_tool(self.folder / "none.xlsx", "--explain", expected=17)
+        self.assertIn("does not end in .xlsx",
+                      self.run_tool(book.rename(self.folder / "a.xlsm"), "--explain"))
+
+    def test_cells_lost_on_conversion_are_counted(self):
+        lost = r": 1 cell became missing on conversion: 1 in Measurements!L \(Count\); to keep " \
+               "them: --type 'Measurements!L=text'$"
+        cases = [([], lost), (["--sheet", "1", "--position", "L=30"], lost),
+                 (["--type", "L=text"], ""), (["--missing-word", "n/a=-1"], ""),
+                 (["--missing-word", "n/a=missing"], ""), (["--missing-number", "5=missing"], lost),
+                 (["--type", "L=numeric", "--missing-number", "5=0"], lost),
+                 (["--missing-number", "missing=0"], ""), (["--range", "-1:8"], lost),
+                 (["--exclude", "L"], ""), (["--preview"], lost), (["--list"], ""),
+                 (["--type", "A=datetime", "--type", "J=numeric", "--type", "M=numeric"],
+                  r"11 in Measurements!J \(City\), 1 in"),
+                 (["--names", "none", "--first-row", "2", "--type", "1!J=numeric", "--type",
+                   "1!M=numeric", "--type", "2!E=numeric"],
+                  ": 25 cells .*!M and 3 in 1 more column; to")]
+        for arguments, text in cases:
+            with self.subTest(arguments):
+                self.run_tool(SAMPLE, *arguments)
+                self.assertEqual(len(self.notes), text != "", self.notes)
+                self.assertRegex("".join(self.notes), text or "^$")
+
+    def cell(self, place, text, codes):
+        """A cell as the examples write it; its number format goes to `codes`."""
+        number = re.fullmatch(r"(-?[\d.]+)(?: as (.*))?", text)
+        if number:
+            codes += [number[2]] if number[2] else []
+            style = f' s="{len(codes)}"' if number[2] else ""
+            return f'<c r="{place}"{style}><v>{number[1]}</v></c>'
+        if text in ("TRUE", "FALSE"):
+            return f'<c r="{place}" t="b"><v>{text == "TRUE":d}</v></c>'
+        if text.startswith("#"):
+            return f'<c r="{place}" t="e"><v>{text}</v></c>'
+        text = html.escape(re.sub('^"(.*)"$', r"\1", text))
+        return f'<c r="{place}" t="inlineStr"><is><t>{text}</t></is></c>' if text else ""
+
+    def example_book(self, rows):
+        codes = []
+        cells = "".join(f'<row r="{row[0]}">' + "".join(
+            self.cell(f"{letter}{row[0]}", text, codes)
+            for letter, text in zip("ABCDEFGH", row[1:])) + "</row>" for row in rows[2:])
+        formats = "".join(f'<numFmt numFmtId="{164 + i}" formatCode="{html.escape(code)}"/>'
+                          for i, code in enumerate(codes))
+        styles = "".join(f'<xf numFmtId="{164 + i}"/>' for i in range(len(codes)))
+        return self.book({**PARTS, STYLES: f'<styleSheet xmlns="{SPREADSHEET}">'
+                          f'<numFmts count="{len(codes)}">{formats}</numFmts><cellXfs count="1">'
+                          f'<xf numFmtId="0"/>{styles}</cellXfs></styleSheet>',
+                          SHEET: f'<worksheet xmlns="{SPREADSHEET}"><sheetData>{cells}</sheetData>'
+                          '</worksheet>'})
+
+    def test_the_examples_of_the_import_rules_hold(self):
+        def table(text):
+            return [[field.strip() for field in line.split("|")[1:-1]]
+                    for line in text.splitlines()]
+        def listed(values):
+            return ", ".join("*missing*" if value is None else str(value) for value in values)
+        page = (SOURCE / "docs" / "import-rules.md").read_text()
+        examples = re.findall(r"<!-- example(?:: (.*?))? -->\n((?:\|.*\n)+)\n((?:\|.*\n)+)", page)
+        self.assertEqual(len(examples), page.count("<!-- example"))
+        for options, given, wanted in examples:
+            wanted = table(wanted)
+            with self.subTest(wanted):
+                book = self.example_book(table(given))
+                columns = json.loads(self.run_tool(book, "--json", *shlex.split(options)))
+                rows = [{"name": c["name"], "kind": c["kind"], "missing": str(c["missing"]),
+                         "values": listed(c.get("iso", c["values"])),
+                         "shown": listed(c.get("shown", [])), "format": c["format"]["words"]}
+                        for c in columns["worksheets"][0]["columns"]]
+                self.assertEqual([[row[head] for head in wanted[0]] for row in rows], wanted[2:])
+
+    def test_the_commands_of_the_pages_run(self):
+        scripts = self.folder / "scripts"
+        (self.folder / "build" / "release" / "bin").mkdir(parents=True)
+        scripts.mkdir()
+        shutil.copy(SOURCE / "scripts" / "import", scripts)
+        shutil.copytree(SOURCE / "samples", self.folder / "samples")
+        shutil.copy(SAMPLE, self.folder / "BOOK.xlsx")
+        tool = self.folder / "build" / "release" / "bin" / "dpxlsx"
+        tool.symlink_to(TOOL)
+        for name in ("setup", "build"):  # this build stands in for what they would make
+            (scripts / name).write_text("#!/bin/sh\n")
+            (scripts / name).chmod(0o755)
+        commands = []
+        for page in ("README.md", "docs/tool.md", "docs/import-rules.md"):
+            commands += re.findall(r"^    ((?:dpxlsx|scripts/import)\b.*?)(?:  .*)?$",
+                                   (SOURCE / page).read_text(), re.M)
+        self.assertGreater(len(commands), 8)
+        for command in commands:
+            with self.subTest(command):
+                done = subprocess.run(command.replace(" [WORKBOOK]", ""), shell=True, check=False,
+                                      env=self.environment(PATH=f"{tool.parent}:/usr/bin:/bin"),
+                                      cwd=self.folder, capture_output=True)
+                self.assertEqual(done.returncode, 0, done.stderr.decode())
 
 
 if __name__ == "__main__":
