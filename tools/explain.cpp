@@ -41,7 +41,9 @@ bool isOfTheSystem(const Failure& failure) {
 std::vector<Trait> allTraits(const Library& library, const Options& options) {
     const std::optional<Failure> failure = tryImport(library, options);
     if (failure && isOfTheSystem(*failure)) throw *failure;
-    const Findings findings = inspect(options.book);
+    // A package that the library does not unpack is not read any further either.
+    const bool unpacked = !failure || failure->code() != kReadFailure;
+    const Findings findings = unpacked ? inspect(options.book) : Findings();
     std::vector<Trait> traits =
         traitsOf(findings, askForStyles(library, options.book, findings.formats));
     const bool explained =
@@ -58,9 +60,7 @@ Findings quickFindings(const std::string& book, const std::string& folder) {
     try {
         return inspectQuickly(book, folder);
     } catch (const std::exception&) {
-        Findings nothing;
-        nothing.kind = FileKind::Workbook;
-        return nothing;
+        return {};
     }
 }
 

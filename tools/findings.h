@@ -46,7 +46,7 @@ struct Names {
 
 // What a look into a file found.
 struct Findings {
-    FileKind kind = FileKind::Unknown;
+    FileKind kind = FileKind::Workbook;
     bool namedXlsx = true;
 
     Names prefixedParts;

@@ -170,7 +170,7 @@ class Inspector {
 
     std::string partOf(const std::string& wanted) {
         if (package_.has(wanted)) return wanted;
-        const std::string found = package_.similarTo(wanted);
+        std::string found = package_.similarTo(wanted);
         if (!found.empty()) noteMoved(wanted, found);
         return found;
     }

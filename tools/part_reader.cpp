@@ -33,24 +33,57 @@ std::optional<std::string> taken(xmlChar* text) {
     return std::string(view(text));
 }
 
-int readEntry(void* entry, char* buffer, int size) {
-    return static_cast<Entry*>(entry)->read(buffer, static_cast<unsigned>(size));
+void ignoreError(void*, xmlErrorPtr) {}
+void ignoreText(void*, const char*, ...) {}
+
+// Errors are told by results. The options of a reader alone do not keep libxml2 quiet.
+void silence() {
+    xmlSetStructuredErrorFunc(nullptr, ignoreError);
+    xmlSetGenericErrorFunc(nullptr, ignoreText);
 }
 
 }  // namespace
 
-PartReader::PartReader(Package& package, const std::string& name)
-    : entry_(package, name),
-      reader_(xmlReaderForIO(readEntry, nullptr, &entry_, nullptr, nullptr,
-                             XML_PARSE_NOERROR | XML_PARSE_NOWARNING | XML_PARSE_NONET)),
-      broken_(reader_ == nullptr) {}
+PartReader::PartReader(Package& package, const std::string& name) : entry_(package, name) {
+    silence();
+    reader_.reset(xmlReaderForIO(supply, nullptr, this, nullptr, nullptr,
+                                 XML_PARSE_NOERROR | XML_PARSE_NOWARNING | XML_PARSE_NONET));
+    broken_ = reader_ == nullptr;
+}
+
+int PartReader::supply(void* self, char* buffer, int size) {
+    auto& reader = *static_cast<PartReader*>(self);
+    const int count = reader.entry_.read(buffer, static_cast<unsigned>(size));
+    reader.supplied_ += std::max(count, 0);
+    const auto isMark = [](char c) { return c == '=' || c == '-'; };
+    reader.marks_ += std::count_if(buffer, buffer + std::max(count, 0), isMark);
+    return reader.holdsTooMuch() ? -1 : count;
+}
+
+// libxml2 uses texts as they come, but keeps markup until it is complete. Lists of cell ranges make
+// long tags; only hostile ones have thousands of attributes, which libxml2 compares with each
+// other, or of hyphens in a comment.
+bool PartReader::holdsTooMuch() {
+    constexpr long kLongMarkup = 16 << 10;      // bytes
+    constexpr long kLongestMarkup = 256 << 10;  // bytes
+    constexpr long kMostMarks = 4096;
+    const long used = reader_ ? xmlTextReaderByteConsumed(reader_.get()) : supplied_;
+    const long waiting = used < 0 ? 0 : supplied_ - used;
+    if (waiting <= kLongMarkup) marks_ = 0;
+    return waiting > kLongestMarkup || marks_ > kMostMarks;
+}
+
+bool PartReader::hasDeclarations() const {
+    const xmlNode* node = xmlTextReaderCurrentNode(reader_.get());
+    return node != nullptr && node->doc != nullptr && node->doc->intSubset != nullptr;
+}
 
 bool PartReader::next() {
     while (!broken_) {
         stopIfInterrupted();
         const int result = xmlTextReaderRead(reader_.get());
-        broken_ = result < 0;
-        if (result <= 0) return false;
+        broken_ = result < 0 || hasDeclarations();
+        if (broken_ || result == 0) return false;
         const int type = xmlTextReaderNodeType(reader_.get());
         if (type == XML_READER_TYPE_ELEMENT || isText()) return true;
     }

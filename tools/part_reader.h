@@ -10,7 +10,8 @@
 
 namespace dp::tool {
 
-// Walks the elements of an XML part of a spreadsheet package, forward and in little memory.
+// Walks the elements of an XML part of a spreadsheet package, forward and in little memory: a part
+// with a document type or with markup that only a hostile one has counts as broken there.
 // Elements go by their local names within the namespaces of spreadsheets, whatever their prefix,
 // and by their names alone when they have no prefix.
 class PartReader {
@@ -51,7 +52,13 @@ class PartReader {
         void operator()(xmlTextReaderPtr reader) const { xmlFreeTextReader(reader); }
     };
 
-    Entry entry_;  // outlives the reader, which draws from it
+    static int supply(void* self, char* buffer, int size);
+    bool holdsTooMuch();
+    bool hasDeclarations() const;
+
+    Entry entry_;        // outlives the reader, which draws from it
+    long supplied_ = 0;  // bytes
+    long marks_ = 0;     // equal signs and hyphens in long markup that waits to be complete
     std::unique_ptr<xmlTextReader, Free> reader_;
     bool broken_ = false;
 };
