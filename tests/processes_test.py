@@ -18,7 +18,8 @@ def start(temporary):
 
 with tempfile.TemporaryDirectory() as temporary:
     alone = start(temporary).communicate()
-    assert alone[0] and not alone[1], alone
+    # The sample has one cell that does not fit its column, which is noted.
+    assert alone[0] and alone[1].count(b"\n") == 1 and b"became missing" in alone[1], alone
     for _ in range(ROUNDS):
         running = [start(temporary) for _ in range(PROCESSES)]
         for process in running:
