@@ -126,11 +126,12 @@ void ShortTexts::fetchCandidate(const Waiting& waiting) const {
     while (table_.tags[index] != 0 && table_.tags[index] != tagOf(waiting.hash))
         index = (index + 1) & mask;
     if (table_.tags[index] == 0) return;
-    const char* stored = at(table_.ids[index]);
-    __builtin_prefetch(stored);
-    // It may reach into another line, and a shorter text's end lies behind that of the page.
-    __builtin_prefetch(
-        reinterpret_cast<const void*>(reinterpret_cast<std::uintptr_t>(stored) + waiting.length));
+    const Id id = table_.ids[index];
+    const Page& page = pages_[id >> kUnitBits];
+    const std::size_t begin = (id & ((Id{1} << kUnitBits) - 1)) * kUnit;
+    __builtin_prefetch(&page.bytes[begin]);
+    // A text may reach into another line.
+    __builtin_prefetch(&page.bytes[std::min(begin + waiting.length, page.used - 1)]);
 }
 
 // The stored text that equals the one at `text`, which is behind the used bytes; when it is new it
