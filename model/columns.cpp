@@ -1,8 +1,9 @@
 #include "model/columns.h"
 
+#include <langinfo.h>
+#include <locale.h>
+
 #include <algorithm>
-#include <locale>
-#include <stdexcept>
 #include <string>
 
 #include "model/reference_count.h"
@@ -11,21 +12,14 @@ namespace dp {
 
 namespace {
 
-// The environment may name a locale that the machine does not have.
-std::locale environmentLocale() {
-    try {
-        return std::locale("");
-    } catch (const std::runtime_error&) {
-        return std::locale::classic();
-    }
-}
-
-// The decimal point of the environment's locale, asked for once in the life of the process.
+// The decimal point of the environment's numbers, asked for once in the life of the process; only
+// its LC_NUMERIC counts, and a locale that the machine does not have gives the point.
 char environmentDecimalPoint() {
     static std::string output_decimal;
     if (output_decimal.empty()) {
-        const std::locale environment = environmentLocale();
-        output_decimal.assign(1, std::use_facet<std::numpunct<char>>(environment).decimal_point());
+        const locale_t numbers = newlocale(LC_NUMERIC_MASK, "", nullptr);
+        output_decimal.assign(1, numbers ? *nl_langinfo_l(RADIXCHAR, numbers) : '.');
+        if (numbers) freelocale(numbers);
     }
     return output_decimal[0];
 }
