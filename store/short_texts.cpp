@@ -74,11 +74,14 @@ std::uint64_t TextHash::operator()(std::string_view text) const {
     return mix(hash ^ secret_[2], secret_[1] ^ length);
 }
 
-void ShortTexts::Table::add(std::uint64_t hash, Id id) {
-    std::size_t index = hash & mask();
-    while (tags[index] != 0) index = (index + 1) & mask();
-    tags[index] = tagOf(hash);
-    ids[index] = id;
+std::size_t ShortTexts::Table::candidate(std::size_t slot, std::uint8_t tag) const {
+    while (tags[slot] != 0 && tags[slot] != tag) slot = (slot + 1) & mask();
+    return slot;
+}
+
+void ShortTexts::Table::set(std::size_t slot, std::uint64_t hash, Id id) {
+    tags[slot] = tagOf(hash);
+    ids[slot] = id;
 }
 
 bool ShortTexts::begin(std::string_view text) {
@@ -87,7 +90,7 @@ bool ShortTexts::begin(std::string_view text) {
     const std::size_t size = sizeOf(text.size(), kUnit);
     if (!makeRoom(size)) return false;
     Waiting& waiting = waiting_[waitingCount_];
-    waiting = {hash_(text), nullptr, text.size()};
+    waiting = {hash_(text), nullptr, text.size(), 0};
     __builtin_prefetch(&table_.tags[waiting.hash & table_.mask()]);
     __builtin_prefetch(&table_.ids[waiting.hash & table_.mask()]);
     char* place = &pages_.back().bytes[pages_.back().used + waitingSize_];
@@ -119,14 +122,11 @@ void ShortTexts::settle() noexcept {
     waitingCount_ = 0;
 }
 
-// Asks for the first text that may be the wanted one.
-void ShortTexts::fetchCandidate(const Waiting& waiting) const {
-    const std::size_t mask = table_.mask();
-    std::size_t index = waiting.hash & mask;
-    while (table_.tags[index] != 0 && table_.tags[index] != tagOf(waiting.hash))
-        index = (index + 1) & mask;
-    if (table_.tags[index] == 0) return;
-    const Id id = table_.ids[index];
+// Asks for the first text that may be the wanted one, and notes where the search goes on.
+void ShortTexts::fetchCandidate(Waiting& waiting) const {
+    waiting.slot = table_.candidate(waiting.hash & table_.mask(), tagOf(waiting.hash));
+    if (table_.tags[waiting.slot] == 0) return;
+    const Id id = table_.ids[waiting.slot];
     const Page& page = pages_[id >> kUnitBits];
     const std::size_t begin = (id & ((Id{1} << kUnitBits) - 1)) * kUnit;
     __builtin_prefetch(&page.bytes[begin]);
@@ -137,13 +137,14 @@ void ShortTexts::fetchCandidate(const Waiting& waiting) const {
 // The stored text that equals the one at `text`, which is behind the used bytes; when it is new it
 // moves up to them.
 const char* ShortTexts::settleOne(const Waiting& waiting, const char* text) {
-    if (const char* found = find(textAt(text), waiting.hash)) return found;
+    const std::size_t slot = find(textAt(text), waiting.hash, waiting.slot);
+    if (table_.tags[slot] != 0) return at(table_.ids[slot]);
     Page& page = pages_.back();
     char* place = &page.bytes[page.used];
     const std::size_t size = sizeOf(waiting.length, kUnit);
     if (place != text) std::memmove(place, text, size);
     const Id number = static_cast<Id>(pages_.size() - 1) << kUnitBits;
-    table_.add(waiting.hash, number | static_cast<Id>(page.used / kUnit));
+    table_.set(slot, waiting.hash, number | static_cast<Id>(page.used / kUnit));
     page.used += size;
     ++size_;
     return place;
@@ -151,17 +152,19 @@ const char* ShortTexts::settleOne(const Waiting& waiting, const char* text) {
 
 const char* ShortTexts::find(std::string_view text) noexcept {
     settle();
-    return table_.tags.empty() ? nullptr : find(text, hash_(text));
+    if (table_.tags.empty()) return nullptr;
+    const std::uint64_t hash = hash_(text);
+    const std::size_t slot = find(text, hash, hash & table_.mask());
+    return table_.tags[slot] == 0 ? nullptr : at(table_.ids[slot]);
 }
 
-const char* ShortTexts::find(std::string_view text, std::uint64_t hash) const {
-    const std::size_t mask = table_.mask();
-    for (std::size_t index = hash & mask; table_.tags[index] != 0; index = (index + 1) & mask) {
-        if (table_.tags[index] != tagOf(hash)) continue;
-        const char* stored = at(table_.ids[index]);
-        if (textAt(stored) == text) return stored;
+// The slot of the text, or the free one where it belongs, from `slot` on.
+std::size_t ShortTexts::find(std::string_view text, std::uint64_t hash, std::size_t slot) const {
+    while (true) {
+        slot = table_.candidate(slot, tagOf(hash));
+        if (table_.tags[slot] == 0 || textAt(at(table_.ids[slot])) == text) return slot;
+        slot = (slot + 1) & table_.mask();
     }
-    return nullptr;
 }
 
 // Room for `size` bytes behind the texts that wait. False when all pages are full.
@@ -198,7 +201,9 @@ void ShortTexts::rehash(Table& table) const {
         const Page& page = pages_[number];
         for (std::size_t place = 0; place < page.used;) {
             const std::string_view text = textAt(&page.bytes[place]);
-            table.add(hash_(text), static_cast<Id>(number << kUnitBits | place / kUnit));
+            const std::uint64_t hash = hash_(text);
+            table.set(table.candidate(hash & table.mask(), 0), hash,
+                      static_cast<Id>(number << kUnitBits | place / kUnit));
             place += sizeOf(text.size(), kUnit);
         }
     }

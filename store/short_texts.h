@@ -69,6 +69,7 @@ class ShortTexts {
         std::uint64_t hash;
         std::uint64_t* place;
         std::size_t length;
+        std::size_t slot;  // the first that can be the text's, as known when it was fetched
     };
     // A hash table with open addressing. The tags are few enough for the processor's caches, and
     // they alone tell that a text is new.
@@ -76,7 +77,9 @@ class ShortTexts {
         explicit Table(std::size_t count = 0) : tags(count), ids(count) {}
 
         std::size_t mask() const { return tags.size() - 1; }
-        void add(std::uint64_t hash, Id id);
+        // The first slot from `slot` on that is free or has the tag.
+        std::size_t candidate(std::size_t slot, std::uint8_t tag) const;
+        void set(std::size_t slot, std::uint64_t hash, Id id);
 
         std::vector<std::uint8_t> tags;  // 0 for a free slot, else bits of the hash
         std::vector<Id> ids;             // as many, none or a power of two
@@ -85,8 +88,8 @@ class ShortTexts {
     const char* at(Id id) const {
         return &pages_[id >> kUnitBits].bytes[(id & ((Id{1} << kUnitBits) - 1)) * kUnit];
     }
-    const char* find(std::string_view text, std::uint64_t hash) const;
-    void fetchCandidate(const Waiting& waiting) const;
+    std::size_t find(std::string_view text, std::uint64_t hash, std::size_t slot) const;
+    void fetchCandidate(Waiting& waiting) const;
     const char* settleOne(const Waiting& waiting, const char* text);
     bool makeRoom(std::size_t size);
     void growTable();
