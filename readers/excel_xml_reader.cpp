@@ -38,6 +38,9 @@ ExcelXmlReader::ExcelXmlReader(std::string path, std::string shortDate, double m
       dateTimeHelper(helper) {
     xmlReader.mInitialize(path);
     mInitialize();
+    cellNames_ = xml::KnownNames(xmlReader, elementNames);
+    rowNames_ = xml::KnownNames(xmlReader, {"Row", "WorksheetOptions"});
+    attributeNames_ = xml::KnownNames(xmlReader, {"StyleID", "Index", "MergeAcross", "Type"});
 }
 
 ExcelXmlReader::~ExcelXmlReader() = default;

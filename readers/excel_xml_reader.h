@@ -12,6 +12,8 @@
 #include "readers/xml_reader.h"
 #include "store/external_data_record.h"
 
+struct _xmlAttr;  // libxml2's own name; NOLINT(bugprone-reserved-identifier)
+
 namespace dp {
 
 // Reads a workbook into a provider. This class reads XML Spreadsheet 2003 documents and owns what
@@ -91,6 +93,8 @@ class DPXLSX_API ExcelXmlReader {
     void readRow(unsigned row, unsigned columnCount);
     void beginCell(unsigned& column, unsigned& mergeAcross);
     void setCurrentStyle(const char* id);
+    int attributeName(const _xmlAttr* attribute) const;
+    ExternalCellType dataType();
     bool readData(bool inPreview);
     void readStringData(std::string& text);
     // Announces a worksheet to the provider and makes it the current one.
@@ -121,6 +125,9 @@ class DPXLSX_API ExcelXmlReader {
 
   private:
     ExternalDataRecord record_{0, 0, 0, 0};  // the one being read
+    xml::KnownNames cellNames_;              // elementNames
+    xml::KnownNames rowNames_;
+    xml::KnownNames attributeNames_;
     FirstEntryIndex<xStyle, std::string> styleById_{&xStyle::styleId};
     FirstEntryIndex<xStyleRange, unsigned> styleByColumn_{&xStyleRange::column};
     FirstEntryIndex<xStyleRange, unsigned> styleByRow_{&xStyleRange::row};

@@ -1,7 +1,9 @@
 #include <string_view>
 #include <utility>
 
+#include "readers/attributes.h"
 #include "readers/cell_reference.h"
+#include "readers/cm_xml_cast.h"
 #include "readers/excel_xml_reader.h"
 #include "readers/limits.h"
 #include "readers/silence.h"
@@ -116,10 +118,14 @@ void ExcelXmlReader::mReadExcelWorksheetData(unsigned columnCount, unsigned rowC
     if (rowCount == 0) return;
     unsigned row = 0;
     int element = 0;
-    while ((element = xml::mReadForElements(xmlReader, {"Row", "WorksheetOptions"})) == 0) {
-        if (unsigned index = 0; readIndex(xmlReader, index) && index >= row) row = index;
-        std::string style = xmlReader.attributeText("ss:StyleID");
-        if (!style.empty() && isStyle(style)) rowStyles.push_back({0, row, std::move(style)});
+    while ((element = xml::readToOneOf(xmlReader, rowNames_)) == 0) {
+        Attributes attributes(xmlReader);
+        unsigned index = 0;  // 1-based
+        if (const char* text = attributes.find("Index", "ss"))
+            CmXmlCast::instance().mCast(index, text);
+        if (index > row) row = index - 1;
+        const char* style = attributes.find("StyleID", "ss");
+        if (style && *style != '\0' && isStyle(style)) rowStyles.push_back({0, row, style});
         if (!xmlReader.readNode()) fail();
         readRow(row, columnCount);
         if (xmlReader.endOfFile) return;

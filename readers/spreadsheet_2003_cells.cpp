@@ -1,4 +1,5 @@
 #include <algorithm>
+#include <cstring>
 #include <limits>
 #include <string_view>
 #include <utility>
@@ -23,9 +24,12 @@ unsigned saturatingSum(unsigned left, unsigned right) {
     return left + std::min(right, room);
 }
 
-bool hasPrefix(const xmlAttr* attribute, std::string_view prefix) {
-    const xmlChar* own = attribute->ns ? attribute->ns->prefix : nullptr;
-    return own && reinterpret_cast<const char*>(own) == prefix;
+// Positions in attributeNames_.
+enum Attribute { kStyleId, kIndex, kMergeAcross, kType };
+
+bool hasPrefix(const xmlAttr* attribute) {
+    const xmlChar* prefix = attribute->ns ? attribute->ns->prefix : nullptr;
+    return prefix && std::strcmp(reinterpret_cast<const char*>(prefix), "ss") == 0;
 }
 
 ExternalCellType typeOfData(std::string_view name) {
@@ -41,7 +45,7 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
     unsigned mergeAcross = 0;
     bool cellSeen = false;
     while (true) {
-        switch (xml::mReadForElements(xmlReader, elementNames)) {
+        switch (xml::readToOneOf(xmlReader, cellNames_)) {
             case kCell:
                 if (std::exchange(cellSeen, true)) column = saturatingSum(column, 1);
                 beginCell(column, mergeAcross);
@@ -67,6 +71,19 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
     }
 }
 
+int ExcelXmlReader::attributeName(const xmlAttr* attribute) const {
+    if (!hasPrefix(attribute)) return kNone;
+    return attributeNames_.find(reinterpret_cast<const char*>(attribute->name));
+}
+
+// The type that the current data names.
+ExternalCellType ExcelXmlReader::dataType() {
+    Attributes attributes(xmlReader);
+    for (const xmlAttr* a = attributes.first(); a; a = a->next)
+        if (attributeName(a) == kType) return typeOfData(attributes.valueOf(a));
+    return CELL_EMPTY;
+}
+
 // Reads the attributes of a cell: its place, its style, and how many columns it covers.
 void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
     Attributes attributes(xmlReader);
@@ -74,14 +91,13 @@ void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
     mergeAcross = 0;
     bool hasStyle = false;
     for (const xmlAttr* a = attributes.first(); a; a = a->next) {
-        if (!hasPrefix(a, "ss")) continue;
-        const std::string_view name = reinterpret_cast<const char*>(a->name);
-        if (name == "StyleID") {
+        const int name = attributeName(a);
+        if (name == kStyleId) {
             setCurrentStyle(attributes.valueOf(a));
             hasStyle = true;
-        } else if (name == "Index") {
+        } else if (name == kIndex) {
             CmXmlCast::instance().mCast(index, attributes.valueOf(a));
-        } else if (name == "MergeAcross") {
+        } else if (name == kMergeAcross) {
             CmXmlCast::instance().mCast(mergeAcross, attributes.valueOf(a));
         }
     }
@@ -102,10 +118,8 @@ void ExcelXmlReader::setCurrentStyle(const char* id) {
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    Attributes attributes(xmlReader);
-    const char* typeName = attributes.find("Type", "ss");
     record_.initialize();
-    record_.cell.type = typeName ? typeOfData(typeName) : CELL_EMPTY;
+    record_.cell.type = dataType();
     xmlReader.readNode();
     const bool inPreview = !provider->IsPreviewing() ||
                            (row < static_cast<unsigned>(provider->GetPreviewNumberOfRows()) &&
@@ -139,11 +153,12 @@ bool ExcelXmlReader::readData(bool inPreview) {
 void ExcelXmlReader::readStringData(std::string& text) {
     do {
         const int type = xmlReader.nodeType();
-        if (type == XML_READER_TYPE_TEXT || type == XML_READER_TYPE_SIGNIFICANT_WHITESPACE)
+        if (type == XML_READER_TYPE_TEXT || type == XML_READER_TYPE_SIGNIFICANT_WHITESPACE) {
             text += xmlReader.nodeValue();
-        else if (type == XML_READER_TYPE_END_ELEMENT &&
-                 (isOnElement("Data") || isOnElement("ss:Data")))
-            break;
+        } else if (type == XML_READER_TYPE_END_ELEMENT) {
+            const int element = cellNames_.find(xmlReader.nodeName());
+            if (element == kData || element == kPrefixedData) break;
+        }
     } while (xmlReader.readNode());
 }
 

@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cstring>
-#include <string_view>
 
 #include <boost/filesystem.hpp>
 #include <libxml/xmlreader.h>
@@ -125,15 +124,35 @@ const char* XmlReader::nodeValue() const {
 
 namespace dp::xml {
 
-int mReadForElements(XmlReader& reader, const std::vector<std::string>& names) {
-    if (names.empty()) return -1;
-    bool onElement = reader.nodeType() == XML_READER_TYPE_ELEMENT || reader.readToElement();
-    for (; onElement; onElement = reader.readToElement()) {
-        const std::string_view name = reader.nodeName();
-        const auto found = std::find(names.begin(), names.end(), name);
-        if (found != names.end()) return static_cast<int>(found - names.begin());
+KnownNames::KnownNames(XmlReader& reader, const std::vector<std::string>& names) {
+    for (const std::string& name : names) {
+        const xmlChar* known = xmlTextReaderConstString(
+            reader.textReader, reinterpret_cast<const xmlChar*>(name.c_str()));
+        if (!known) throw CmXmlException(kXmlError);
+        names_.push_back(reinterpret_cast<const char*>(known));
     }
+}
+
+int KnownNames::find(const char* name) const {
+    const auto position = [this](auto isName) {
+        const auto found = std::find_if(names_.begin(), names_.end(), isName);
+        return found == names_.end() ? -1 : static_cast<int>(found - names_.begin());
+    };
+    const int same = position([name](const char* known) { return known == name; });
+    if (same != -1 || !name) return same;
+    // A document keeps names with a prefix apart.
+    return position([name](const char* known) { return std::strcmp(known, name) == 0; });
+}
+
+int readToOneOf(XmlReader& reader, const KnownNames& names) {
+    bool onElement = reader.nodeType() == XML_READER_TYPE_ELEMENT || reader.readToElement();
+    for (; onElement; onElement = reader.readToElement())
+        if (const int found = names.find(reader.nodeName()); found != -1) return found;
     return -1;
+}
+
+int mReadForElements(XmlReader& reader, const std::vector<std::string>& names) {
+    return names.empty() ? -1 : readToOneOf(reader, KnownNames(reader, names));
 }
 
 }  // namespace dp::xml

@@ -75,9 +75,25 @@ class DPXLSX_API XmlReader {
 
 namespace dp::xml {
 
+// Names as a reader's document keeps them: comparing pointers finds nearly all. Valid as long as
+// the reader, for names that it gives.
+class KnownNames {
+  public:
+    // None, until names are known.
+    KnownNames() = default;
+    KnownNames(XmlReader& reader, const std::vector<std::string>& names);
+
+    // The position of the reader's current name in `names`, -1 when it is none of them.
+    int find(const char* name) const;
+
+  private:
+    std::vector<const char*> names_;
+};
+
 // Moves to the next element whose name is in `names` and returns the name's index; stays where it
 // is when the current element is one. -1 at the end of the document and for an empty list. Throws
 // CmXmlException.
 DPXLSX_API int mReadForElements(XmlReader& reader, const std::vector<std::string>& names);
+int readToOneOf(XmlReader& reader, const KnownNames& names);
 
 }  // namespace dp::xml
