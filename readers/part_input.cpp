@@ -22,7 +22,7 @@ namespace {
 // The file behind a reader, and how far libxml2 has come in it.
 class PartInput {
   public:
-    PartInput(const std::string& path, const std::uint64_t& moves)
+    PartInput(const std::string& path, const std::uint32_t& moves)
         : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)), moves_(moves) {}
     ~PartInput() {
         if (isOpen()) ::close(descriptor_);
@@ -76,8 +76,8 @@ class PartInput {
     }
 
     int descriptor_;
-    const std::uint64_t& moves_;
-    std::uint64_t movesBefore_ = 0;
+    const std::uint32_t& moves_;
+    std::uint32_t movesBefore_ = 0;
     std::int64_t runStart_ = 0;
     std::array<char, std::size_t{32} << 10> buffer_;
     const char* next_ = nullptr;  // behind what libxml2 has got
@@ -106,7 +106,7 @@ void noteText(void* payload, void* found, const xmlChar*) {
 
 }  // namespace
 
-xmlTextReaderPtr openDocument(const std::string& path, const std::uint64_t& moves) {
+xmlTextReaderPtr openDocument(const std::string& path, const std::uint32_t& moves) {
     auto input = std::make_unique<PartInput>(path, moves);
     if (!input->isOpen()) return nullptr;
     PartInput* const watching = input.get();

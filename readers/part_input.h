@@ -11,7 +11,7 @@ namespace dp {
 // `moves` is odd while the reader moves, another number in each move, and outlives it. libxml2 gets
 // the file's bytes as they are: by a path of its own it would unpack a compressed file on the way,
 // past every limit. Markup beyond the limits is a read error.
-_xmlTextReader* openDocument(const std::string& path, const std::uint64_t& moves);
+_xmlTextReader* openDocument(const std::string& path, const std::uint32_t& moves);
 
 // True for a document with declarations that make libxml2 work out of proportion: entities, which
 // attributes may repeat any number of times, or attributes, which it keeps as cross-references. The

@@ -22,7 +22,7 @@ namespace fs = boost::filesystem;
 bool looksLikeAddress(const std::string& path) { return path.find("://") != path.npos; }
 
 // Null for a path that cannot be opened, or that names something else to libxml2.
-xmlTextReaderPtr openFile(const std::string& path, const std::uint64_t& moves) {
+xmlTextReaderPtr openFile(const std::string& path, const std::uint32_t& moves) {
     return looksLikeAddress(path) ? nullptr : dp::openDocument(path, moves);
 }
 

@@ -64,13 +64,17 @@ class DPXLSX_API XmlReader {
 
     bool tempCopy = false;   // the document is a private copy that goes with the reader
     bool endOfFile = false;  // the last forward read came to the end of the document
+  private:
+    // Twice the moves so far, and one more during one. Between the flags and the path it moves no
+    // field that hosts know.
+    std::uint32_t moves_ = 0;
+
+  public:
     std::string tempPath;
     _xmlTextReader* textReader = nullptr;
 
   private:
     bool moveToAttribute(const char* name);
-
-    std::uint64_t moves_ = 0;  // twice the moves so far, and one more during one
 };
 
 namespace dp::xml {
