@@ -33,8 +33,9 @@ const char* Attributes::find(const char* name, const char* prefix) & {
 const char* Attributes::valueOf(const xmlAttr* attribute) & {
     const xmlNode* value = attribute->children;
     if (!value) return "";
+    // Without memory libxml2 leaves texts without content.
     if (value->type == XML_TEXT_NODE && !value->next)
-        return reinterpret_cast<const char*>(value->content);
+        return value->content ? reinterpret_cast<const char*>(value->content) : "";
     // The value holds references.
     xmlChar* text = xmlNodeListGetString(attribute->doc, value, 1);
     expanded_ = text ? reinterpret_cast<const char*>(text) : "";

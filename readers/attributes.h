@@ -9,7 +9,8 @@ class XmlReader;
 namespace dp {
 
 // The attributes of the element on which a reader stands, found by walking its list once each: a
-// look-up through the text reader takes the name apart every time. The cursor does not move.
+// look-up through the text reader takes the name apart every time. The cursor does not move; none
+// are found while it stands on an attribute.
 class Attributes {
   public:
     explicit Attributes(XmlReader& reader);

@@ -12,8 +12,8 @@ class DPXLSX_API CmXmlCast {
     void mCast(double& value, const char* text) const;
     // Sets `value` to the integer that `text` begins with, white space and a sign before it
     // allowed. False, and `value` as it was, when there is none. A number out of range becomes the
-    // nearest one in range; an unsigned number
-    // with a minus wraps around while its digits are in range.
+    // nearest one in range; an unsigned number with a minus wraps around while its digits are in
+    // range, and is the largest one beyond.
     bool mCast(int& value, const char* text) const;
     bool mCast(unsigned& value, const char* text) const;
 

@@ -125,7 +125,7 @@ class DPXLSX_API ExcelXmlReader {
 
   private:
     ExternalDataRecord record_{0, 0, 0, 0};  // the one being read
-    xml::KnownNames cellNames_;              // elementNames
+    xml::KnownNames cellNames_;              // elementNames as the constructor left them
     xml::KnownNames rowNames_;
     xml::KnownNames attributeNames_;
     FirstEntryIndex<xStyle, std::string> styleById_{&xStyle::styleId};

@@ -7,7 +7,7 @@
 namespace dp {
 
 // Finds the first entry of a growing list by one of its members, without walking the list for every
-// search. Entries may be added and the list be emptied at any time.
+// search. Entries may be added at any time; any other change needs forget() before the next search.
 template <class Entry, class Key>
 class FirstEntryIndex {
   public:

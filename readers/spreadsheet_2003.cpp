@@ -125,7 +125,7 @@ void ExcelXmlReader::mReadExcelWorksheetData(unsigned columnCount, unsigned rowC
             CmXmlCast::instance().mCast(index, text);
         if (index > row) row = index - 1;
         const char* style = attributes.find("StyleID", "ss");
-        if (style && *style != '\0' && isStyle(style)) rowStyles.push_back({0, row, style});
+        if (style && isStyle(style)) rowStyles.push_back({0, row, style});
         if (!xmlReader.readNode()) fail();
         readRow(row, columnCount);
         if (xmlReader.endOfFile) return;

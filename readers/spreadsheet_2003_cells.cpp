@@ -62,7 +62,7 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
                 column = std::max(column, columnCount);
                 return false;
             case kComment:
-                if (xmlTextReaderNext(xmlReader.textReader) != 1) throw CmXmlException(kXmlError);
+                if (!xmlReader.skipElement()) throw CmXmlException(kXmlError);
                 break;
             default:
                 if (xmlReader.endOfFile) return false;
@@ -71,8 +71,9 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
     }
 }
 
+// The attribute's Attribute, -1 for another one.
 int ExcelXmlReader::attributeName(const xmlAttr* attribute) const {
-    if (!hasPrefix(attribute)) return kNone;
+    if (!hasPrefix(attribute)) return -1;
     return attributeNames_.find(reinterpret_cast<const char*>(attribute->name));
 }
 

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <new>
 
 #include <boost/filesystem.hpp>
 #include <libxml/xmlreader.h>
@@ -76,6 +77,18 @@ bool XmlReader::readToElement() {
     return false;
 }
 
+bool XmlReader::skipElement() {
+    const bool closes =
+        nodeType() == XML_READER_TYPE_ELEMENT && xmlTextReaderIsEmptyElement(textReader) != 1;
+    const int depth = xmlTextReaderDepth(textReader);
+    const auto isEnd = [this, depth] {
+        return nodeType() == XML_READER_TYPE_END_ELEMENT && xmlTextReaderDepth(textReader) == depth;
+    };
+    while (closes && readNode() && !isEnd()) {
+    }
+    return !endOfFile && readNode();
+}
+
 bool XmlReader::mGotoElement(const char* name) {
     const auto isWanted = [this, name] {
         const char* current = nodeName();
@@ -128,7 +141,7 @@ KnownNames::KnownNames(XmlReader& reader, const std::vector<std::string>& names)
     for (const std::string& name : names) {
         const xmlChar* known = xmlTextReaderConstString(
             reader.textReader, reinterpret_cast<const xmlChar*>(name.c_str()));
-        if (!known) throw CmXmlException(kXmlError);
+        if (!known) throw std::bad_alloc();
         names_.push_back(reinterpret_cast<const char*>(known));
     }
 }

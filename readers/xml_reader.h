@@ -32,7 +32,7 @@ class DPXLSX_API XmlReader {
     XmlReader& operator=(const XmlReader&) = delete;
     ~XmlReader();
 
-    // Opens the document and moves to its first node; to be called before anything else. A file
+    // Opens the document and moves to its first node; to be called once, before all else. A file
     // that libxml2 cannot open under its own name is read from a private copy. Throws
     // CmXmlException when the file cannot be opened, is empty, or begins with an error.
     void mInitialize(const std::string& path);
@@ -53,6 +53,9 @@ class DPXLSX_API XmlReader {
     bool readNode();
     // Moves to the next element; false at the end of the document. Throws CmXmlException.
     bool readToElement();
+    // Moves behind the current element and all that it holds; false at the end of the document.
+    // Throws CmXmlException.
+    bool skipElement();
     // The text of an attribute of the current element, empty when it has none. Moves the cursor as
     // mReadAttribute does. Throws CmXmlException.
     std::string attributeText(const char* name);
@@ -87,7 +90,7 @@ class KnownNames {
     KnownNames() = default;
     KnownNames(XmlReader& reader, const std::vector<std::string>& names);
 
-    // The position of the reader's current name in `names`, -1 when it is none of them.
+    // The position of a name that the reader gave, -1 when it is none of these.
     int find(const char* name) const;
 
   private:
@@ -98,6 +101,8 @@ class KnownNames {
 // is when the current element is one. -1 at the end of the document and for an empty list. Throws
 // CmXmlException.
 DPXLSX_API int mReadForElements(XmlReader& reader, const std::vector<std::string>& names);
+
+// The same for names that are known already; without any it reads to the end of the document.
 int readToOneOf(XmlReader& reader, const KnownNames& names);
 
 }  // namespace dp::xml

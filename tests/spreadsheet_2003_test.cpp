@@ -86,6 +86,10 @@ TEST_F(Spreadsheet2003, WorksheetsAndFailures) {
         provider.ClearWorksheets();
     }
     EXPECT_THROW(dp::ExcelXmlReader(file("nowhere.xml"), "", 0, &provider, nullptr), CmXmlException);
+    std::string markup;
+    while (markup.size() < 16'000'000) markup += "<!--x-->";
+    EXPECT_EQ(readRows("<Row><Cell><Comment>" + markup + "</Comment></Cell></Row>"), "!13")
+        << "limits hold in comments";
 }
 
 TEST_F(Spreadsheet2003, PreviewsDeliverPlainValuesOutside) {
