@@ -90,7 +90,8 @@ configure_file(cmake/dpxlsx.pc.in dpxlsx.pc @ONLY)
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/dpxlsx.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
 
 set(docs_dir ${CMAKE_INSTALL_DATADIR}/doc/dpxlsx)
-install(FILES docs/host-guide.md DESTINATION ${docs_dir})
+install(FILES docs/host-guide.md docs/import-rules.md docs/tool.md docs/tool.schema.json
+              docs/security.md CHANGELOG.md DESTINATION ${docs_dir})
 install(FILES examples/minimal_host.cpp examples/linked_host.cpp DESTINATION ${docs_dir}/examples)
 
 # `cpack --config BUILD/deb.cmake` makes the package. Under CPack's usual name the file would bring a
