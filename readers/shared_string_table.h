@@ -6,10 +6,12 @@
 #include <string_view>
 #include <vector>
 
+#include "model/host/export.h"
+
 namespace dp {
 
 // Texts by index, one behind the other in memory and four bytes more for each.
-class SharedStringTable {
+class DPXLSX_API SharedStringTable {
   public:
     void clear();
     // Throws std::bad_alloc.

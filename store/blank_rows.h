@@ -4,13 +4,14 @@
 #include <functional>
 #include <vector>
 
+#include "model/host/export.h"
 #include "store/worksheet_cells.h"
 
 namespace dp {
 
 // The blank rows of a worksheet: an ordered set of row numbers, kept as runs so that a sheet whose
 // only cell is its last one costs a few bytes.
-class BlankRows {
+class DPXLSX_API BlankRows {
   public:
     // Adds the rows from `first` to `last` inclusive; they must lie after all rows added before.
     void append(std::uint32_t first, std::uint32_t last);

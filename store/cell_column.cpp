@@ -64,6 +64,8 @@ std::size_t lowerIndex(const CellBlocks& cells, std::uint64_t row) {
 
 }  // namespace
 
+std::string_view CellView::textValue() const { return pooledText().view(); }
+
 CellView::operator ExternalDataRecordCell() const {
     ExternalDataRecordCell cell;
     cell.type = type();
@@ -104,6 +106,15 @@ CellColumn::CellColumn(CellColumn&& other) noexcept
       rare_(std::move(other.rare_)) {}
 
 CellColumn::~CellColumn() { settleTexts(); }
+
+void CellColumn::settle() const {
+    settleTexts();
+    if (sorted_ != cells_.size()) mergeLateCells();
+}
+
+void CellColumn::settleTexts() const noexcept {
+    if (texts_) texts_->settle();
+}
 
 void CellColumn::assign(unsigned row, const ExternalDataRecordCell& cell) {
     if (!packs(cell)) return assignRare(row, cell);

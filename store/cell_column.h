@@ -53,7 +53,7 @@ class DPXLSX_API CellView {
     std::int32_t intValue() const;
     std::int32_t boolValue() const;
     double numValue() const;
-    std::string_view textValue() const { return pooledText().view(); }
+    std::string_view textValue() const;
     std::int32_t formatIndex() const;
     PooledText pooledText() const;
 
@@ -68,7 +68,7 @@ class DPXLSX_API CellView {
 
 // A sequence of packed cells in blocks: it grows without moving what it holds, and a short one
 // stays small. Blocks of 4, 8, 16 ... cells up to kLargest, then all of that size.
-class CellBlocks {
+class DPXLSX_API CellBlocks {
   public:
     CellBlocks() = default;
     CellBlocks(CellBlocks&& other) noexcept;
@@ -154,18 +154,13 @@ class DPXLSX_API CellColumn {
     std::size_t count(unsigned row) const;
 
     // Puts cells that came out of order in their places, and every text in its cell.
-    void settle() const {
-        settleTexts();
-        if (sorted_ != cells_.size()) mergeLateCells();
-    }
+    void settle() const;
 
   private:
     using RareCells = std::unordered_map<const RareCell*, std::unique_ptr<const RareCell>>;
 
     // Before cells are read, move, are replaced or go: the pool may still owe them their texts.
-    void settleTexts() const noexcept {
-        if (texts_) texts_->settle();
-    }
+    void settleTexts() const noexcept;
     PackedCell& put(const PackedCell& cell);
     void assignRare(unsigned row, const ExternalDataRecordCell& cell);
     void release(const PackedCell& cell) const noexcept;

@@ -34,8 +34,8 @@ class ShortTexts {
     // Begins to look for `text`, which has 1 to kLongest bytes; it is copied. False when there is
     // no room for one more text. Throws std::bad_alloc. In both cases nothing has begun.
     bool begin(std::string_view text);
-    // Where the address of the text that was begun last is written: now, with any later begin, or
-    // with settle. The place must stay until then.
+    // Where the address of the text that was begun last is written: with any call from this one on,
+    // at the latest with settle. The place must stay until then.
     void deliverTo(std::uint64_t& place) noexcept;
     // The text that equals `text`, null if there is none; settles all that wait.
     const char* find(std::string_view text) noexcept;

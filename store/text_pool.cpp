@@ -21,6 +21,10 @@ PooledText TextPool::intern(std::string_view text) {
 }
 
 // A text that often repeats the one before need not be searched for.
+void TextPool::settle() noexcept {
+    if (short_.isWaiting()) short_.settle();
+}
+
 void TextPool::begin(std::string_view text) {
     if (!isRecent_ && !short_.isWaiting()) recent_ = PooledText(short_.recent());
     isRecent_ = true;

@@ -6,13 +6,14 @@
 #include <string_view>
 #include <unordered_map>
 
+#include "model/host/export.h"
 #include "store/short_texts.h"
 
 namespace dp {
 
 // A text kept by a TextPool, one pointer wide; valid as long as that pool. Within one pool two
 // handles are equal exactly when their texts are.
-class PooledText {
+class DPXLSX_API PooledText {
   public:
     PooledText() = default;  // the empty text, of every pool
 
@@ -51,14 +52,12 @@ class TextPool {
     PooledText intern(std::string_view text);
 
     // The same in two steps that many texts can be in at a time: after begin, which throws as
-    // intern does, deliverTo names where the bits of the handle go. They are written now, with any
-    // later call, or with settle: the place must stay until then.
+    // intern does, deliverTo names where the bits of the handle go. They are written with any call
+    // from this one on, at the latest with settle: until then the place must stay.
     void begin(std::string_view text);
     void deliverTo(std::uint64_t& bits) noexcept;
     // Delivers what is still to be delivered.
-    void settle() noexcept {
-        if (short_.isWaiting()) short_.settle();
-    }
+    void settle() noexcept;
 
     // Number of distinct texts, the empty one not counted.
     std::size_t size();

@@ -15,7 +15,8 @@
 namespace dp {
 
 // The cells of one worksheet, an ordered map from column (0-based) to CellColumn. Not to be
-// changed while another thread uses it; after settle() reads change nothing.
+// changed while another thread uses it; worksheets that share a pool are one object to threads, and
+// after settle() of all of them reads change nothing.
 class DPXLSX_API WorksheetCells {
     using Columns = std::map<unsigned, CellColumn>;
 

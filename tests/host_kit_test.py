@@ -90,6 +90,27 @@ class HostKitTest(unittest.TestCase):
         with multiprocessing.pool.ThreadPool(2) as pool:
             pool.map(compiled, jobs)
 
+    def test_inline_functions_reach_what_the_library_exports(self):
+        source = "".join(f'#include "{path.relative_to(self.headers)}"\n'
+                         for path in sorted(self.headers.glob("**/*.h")))
+        (self.work / "inline.cpp").write_text(source + """
+int main() {
+    dp::CellColumn column;
+    dp::ExternalDataRecordCell cell;
+    cell.initialize();
+    cell.type = dp::CELL_TEXT;
+    cell.textValue = "texts wait, and are delivered when they are read";
+    for (unsigned row = 0; row < 3; ++row) column.assign(row, cell);
+    for (const auto& entry : column)
+        if (entry.second.textValue() != cell.textValue) return 1;
+}
+""")
+        # Kept inline functions are linked although nobody calls them.
+        run("g++", "-std=c++20", "-fkeep-inline-functions", "inline.cpp", "-o", "inline",
+            *self.flags("--cflags"), *self.flags("--libs"), f"-Wl,-rpath,{self.libraries}",
+            cwd=self.work)
+        run(self.work / "inline")
+
     def test_examples_print_the_same_by_every_road(self):
         outputs = {}
         for compiler in COMPILERS:
