@@ -29,24 +29,20 @@ CellKind kindOf(std::string_view type) {
 // The names that the pass looks for, as the document's own table has them: one pointer comparison
 // tells whether a node has such a name.
 struct Names {
-    explicit Names(xmlTextReaderPtr reader)
-        : row(intern(reader, "row")),
-          c(intern(reader, "c")),
-          v(intern(reader, "v")),
-          t(intern(reader, "t")),
-          r(intern(reader, "r")),
-          s(intern(reader, "s")) {}
+    explicit Names(XmlReader& reader)
+        : row(reader.knownName("row")),
+          c(reader.knownName("c")),
+          v(reader.knownName("v")),
+          t(reader.knownName("t")),
+          r(reader.knownName("r")),
+          s(reader.knownName("s")) {}
 
-    static const xmlChar* intern(xmlTextReaderPtr reader, const char* name) {
-        return xmlTextReaderConstString(reader, reinterpret_cast<const xmlChar*>(name));
-    }
-
-    const xmlChar* row;
-    const xmlChar* c;
-    const xmlChar* v;
-    const xmlChar* t;
-    const xmlChar* r;
-    const xmlChar* s;
+    const char* row;
+    const char* c;
+    const char* v;
+    const char* t;
+    const char* r;
+    const char* s;
 };
 
 // Where a shared-string cell points to: the optional sign and digits of `text`, or -1 for a number
@@ -97,12 +93,12 @@ class WorksheetPass {
     };
 
     void readCells() {
-        const Names names(reader_.textReader);
+        const Names names(reader_);
         if (reader_.nodeType() != XML_READER_TYPE_ELEMENT && !reader_.readToElement()) return;
         bool onElement = true;
         while (onElement) {
             onElement = false;  // until a handler stops on an element that it did not handle
-            const xmlChar* name = xmlTextReaderConstName(reader_.textReader);
+            const char* name = reader_.nodeName();
             if (name == names.c)
                 beginCell(names);
             else if (name == names.v)
@@ -131,12 +127,13 @@ class WorksheetPass {
         bool placed = false;
         for (const xmlAttr* a = attributes.first(); a; a = a->next) {
             if (a->ns) continue;
-            if (a->name == names.r) {
+            const char* name = reinterpret_cast<const char*>(a->name);
+            if (name == names.r) {
                 place_.beginCell(attributes.valueOf(a));
                 placed = true;
-            } else if (a->name == names.t) {
+            } else if (name == names.t) {
                 kind_ = kindOf(attributes.valueOf(a));
-            } else if (a->name == names.s) {
+            } else if (name == names.s) {
                 CmXmlCast::instance().mCast(style_, attributes.valueOf(a));
             }
         }

@@ -125,6 +125,13 @@ std::string XmlReader::attributeText(const char* name) {
     return text ? std::string(text) : std::string();
 }
 
+const char* XmlReader::knownName(const char* name) {
+    const xmlChar* known =
+        xmlTextReaderConstString(textReader, reinterpret_cast<const xmlChar*>(name));
+    if (!known) throw std::bad_alloc();
+    return reinterpret_cast<const char*>(known);
+}
+
 int XmlReader::nodeType() const { return xmlTextReaderNodeType(textReader); }
 
 const char* XmlReader::nodeName() const {
@@ -138,12 +145,7 @@ const char* XmlReader::nodeValue() const {
 namespace dp::xml {
 
 KnownNames::KnownNames(XmlReader& reader, const std::vector<std::string>& names) {
-    for (const std::string& name : names) {
-        const xmlChar* known = xmlTextReaderConstString(
-            reader.textReader, reinterpret_cast<const xmlChar*>(name.c_str()));
-        if (!known) throw std::bad_alloc();
-        names_.push_back(reinterpret_cast<const char*>(known));
-    }
+    for (const std::string& name : names) names_.push_back(reader.knownName(name.c_str()));
 }
 
 int KnownNames::find(const char* name) const {

@@ -59,6 +59,9 @@ class DPXLSX_API XmlReader {
     // The text of an attribute of the current element, empty when it has none. Moves the cursor as
     // mReadAttribute does. Throws CmXmlException.
     std::string attributeText(const char* name);
+    // `name` as the document keeps it: the current node has it when nodeName() is the same pointer;
+    // names with a prefix are kept apart. Valid as long as the reader. Throws std::bad_alloc.
+    const char* knownName(const char* name);
     // The current node's type and name as libxml2 gives them; the name may be null.
     int nodeType() const;
     const char* nodeName() const;
