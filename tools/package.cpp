@@ -17,9 +17,7 @@ std::string folded(const std::string& name) {
             result += c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
         }
     }
-    return result.substr(result.find_first_not_of('/') == std::string::npos
-                             ? result.size()
-                             : result.find_first_not_of('/'));
+    return result.erase(0, result.find_first_not_of('/'));
 }
 
 }  // namespace
