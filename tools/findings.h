@@ -51,6 +51,11 @@ struct Findings {
 
     Names prefixedParts;
     std::string prefixedName;  // the first one, such as "x:workbook"
+    // Notes a part whose elements have a prefix, with the name of the first such element in it.
+    void notePrefix(const std::string& part, const std::string& writtenName) {
+        prefixedParts.add(part);
+        if (prefixedName.empty()) prefixedName = writtenName;
+    }
     bool workbookPrefixed = false;
     bool relationshipPrefixed = false;  // a worksheet's id is written otherwise than r:id
     bool stringsPrefixed = false;

@@ -115,8 +115,7 @@ class Inspector {
     void notePrefix(const std::string& part, const std::string& writtenName, bool& prefixed) {
         if (prefixed) return;
         prefixed = true;
-        findings_.prefixedParts.add(part);
-        if (findings_.prefixedName.empty()) findings_.prefixedName = writtenName;
+        findings_.notePrefix(part, writtenName);
     }
 
     // False when there is no such part or it breaks off.

@@ -60,8 +60,7 @@ void NumberFormats::read(Package& package, const std::string& name, Findings& fi
         if (reader.depth() == 1) section = reader.element();
         if (isWanted(reader) && reader.isPrefixed() && !findings.stylesPrefixed) {
             findings.stylesPrefixed = true;
-            findings.prefixedParts.add(name);
-            if (findings.prefixedName.empty()) findings.prefixedName = reader.writtenName();
+            findings.notePrefix(name, reader.writtenName());
         }
         if (section == "numFmts" && reader.element() == "numFmt" && codes_.size() < kMostStyles) {
             const std::string code = reader.attribute("formatCode").value_or("");

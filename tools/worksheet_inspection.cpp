@@ -103,8 +103,7 @@ class Pass {
         if (!ofCells || !reader_.isPrefixed()) return;
         prefixed_ = true;
         findings_.prefixedWorksheets.add(worksheet_.name);
-        findings_.prefixedParts.add(worksheet_.part);
-        if (findings_.prefixedName.empty()) findings_.prefixedName = reader_.writtenName();
+        findings_.notePrefix(worksheet_.part, reader_.writtenName());
     }
 
     std::string at(const std::optional<std::string>& reference) const {
