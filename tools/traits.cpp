@@ -267,7 +267,8 @@ Found phoneticTexts(const Findings& findings) {
 Found errorCells(const Findings& findings) {
     if (findings.errors.count == 0) return std::nullopt;
     return Trait{"error-cells", placed(findings.errors, "cell") + " with an error such as #DIV/0!",
-                 "a missing value arrives", "mend the formula where a value is expected"};
+                 "a missing value arrives, and no row behind the last value of a column",
+                 "mend the formula where a value is expected"};
 }
 
 Found hiddenWorksheets(const Findings& findings) {

@@ -38,7 +38,7 @@ class DPXLSX_API IColumn : public IResource, public IVariable {
     virtual const IString* GetName() const = 0;
     virtual const IString* GetDescription() const = 0;
     virtual int GetLastModified() const = 0;
-    // Rows without a value.
+    // Rows without a cell, or with one that did not convert.
     virtual int GetMissingCount() const = 0;
     virtual int GetRowCount() const = 0;
     // Null for a column that was not loaded from a worksheet.
@@ -51,10 +51,11 @@ class DPXLSX_API INumericColumn : public IColumn {
   public:
     // GetRowCount() numbers, the provider's missing value where a row has none.
     virtual const double* GetValues() const = 0;
-    // Cells that had content but became missing on conversion.
+    // Cells that had content but became missing on conversion. Error cells are no cells here.
     virtual int GetConvertedMissingCount() const = 0;
-    // `value` as the column's format shows it, with `decimal` as decimal symbol (ignored by
-    // date-times). A new string owned by the caller; null for a column without a format.
+    // `value` by the column's format without the format's own decimal places, which may lose
+    // digits, with `decimal` as decimal symbol (ignored by date-times); FormatValue(value, false)
+    // of the format has them. A new string owned by the caller; null for a column without a format.
     virtual IString* GetFormattedValue(double value, char decimal) const = 0;
 };
 
