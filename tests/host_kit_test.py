@@ -39,6 +39,26 @@ void fragment([[maybe_unused]] dp::IDataProvider& provider) {
 %s}
 """
 
+DATES = """#include "date_times.h"
+int main() {
+    HostDateTimes dates;
+    const char* before = "";
+    for (const char* text : {"1900-01-01", "1900-02-28", "1900-03-01", "1950-06-30", "2024-02-29",
+                             "2024-02-31", "soon"}) {
+        HostText given(text);
+        double value = 0;
+        const bool isDate = dates.ConvertToDatetime(nullptr, &given, value);
+        std::unique_ptr<dp::IString> shown(dates.FormatValue(value, false));
+        const std::string day(shown->database_str(), 10);
+        std::printf("%s%s", before, isDate ? (day + " " + std::to_string(std::lround(value))).c_str() : "no");
+        before = ", ";
+    }
+    std::unique_ptr<dp::IString> evening(dates.FormatValue(0.75, false));
+    std::unique_ptr<dp::IString> noon(dates.FormatValue(1.5, false));
+    std::printf("\\n%s %s\\n", evening->database_str() + 11, noon->database_str() + 11);
+}
+"""
+
 
 def run(*command, expected=0, **options):
     done = subprocess.run([str(part) for part in command], capture_output=True, text=True,
@@ -165,6 +185,10 @@ int main() {
         run(CMAKE, "--build", made / "build", env=self.environment)
         self.assertEqual(run(made / "build" / "host", SAMPLE), shown)
         run(made / "host", "/no.xlsx", expected=1, env={**self.environment, "LD_LIBRARY_PATH": str(self.libraries)})
+        (made / "dates.cpp").write_text(DATES)
+        run("g++", "-std=c++17", *self.flags("--cflags"), "dates.cpp", "-o", "dates", cwd=made)
+        self.assertEqual(run(made / "dates"), "1900-01-01 1, 1900-02-28 59, 1900-03-01 61, 1950-06-30 18444, "
+                         "2024-02-29 45351, no, no\n18:00:00 12:00:00\n")
         # Every operation of the provider that sets something is explained.
         settings = set(re.findall(r"\b((?:Set|Clear)\w+)\(", (self.headers / "model/host/i_data_provider.h").read_text()))
         inner = {"SetWorksheetIndex"}  # is the readers' own
