@@ -18,8 +18,9 @@ def start(temporary):
 
 with tempfile.TemporaryDirectory() as temporary:
     alone = start(temporary).communicate()
-    # The sample has one cell that does not fit its column, which is noted.
-    assert alone[0] and alone[1].count(b"\n") == 1 and b"became missing" in alone[1], alone
+    # The sample has a cell that does not fit its column and a text that is cut, which is noted.
+    assert alone[0] and alone[1].count(b"\n") == 2 and b"became missing" in alone[1] \
+        and b"was cut" in alone[1], alone
     for _ in range(ROUNDS):
         running = [start(temporary) for _ in range(PROCESSES)]
         for process in running:

@@ -104,6 +104,14 @@ TRAITS = [
      "shared texts are missing, dates arrive as day numbers", 0),
     ("shared-strings-without-count", changed(STRINGS, ' uniqueCount="2"', ""),
      r"missing \(3 cells\)", 0),
+    ("shared-strings-missing", {**PARTS, STRINGS: None}, r"3 cells \(first: My Data!A1\)", 0),
+    ("shared-strings-missing", changed(SHEET, "<v>1</v>", "<v>2</v>"), r"1 cell \(My Data!A2\)", 0),
+    ("cdata-texts", changed(STRINGS, "Oslo", "<![CDATA[Oslo]]>"), "1 shared text in CDATA", 0),
+    ("lost-on-conversion", changed(SHEET, "</sheetData>", '<row r="3"><c r="B3" t="s"><v>1</v></c>'
+     '</row></sheetData>'), r"1 in My Data!B \(Name\): a missing .* --type 'My Data!B=text'", 0),
+    ("long-texts", changed(STRINGS, "Oslo", "é" * 41), "1 text longer than 80 bytes: 1 in My Data!A"
+     r" \(Name\).*--max-text 82", 0),
+    ("long-texts", changed(STRINGS, "Name", "n" * 79 + " long"), "2 texts .*1 in My Data!B .* 84", 0),
     ("iso-dates", changed(SHEET, CELL, '<c r="B2" t = \'d\'><v>2024-01-05</v></c>'),
      r"1 date \(My Data!B2\).*number of the year", 0),
     ("date-system-1904", changed(WORKBOOK, "<workbookPr", '<workbookPr date1904="true"'),
@@ -157,7 +165,8 @@ TRAITS = [
     ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
 ]
 # Those that a plain import tells of when it goes well.
-WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904")
+WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904",
+         "shared-strings-missing")
 
 
 def repacked(target, change, packing=zipfile.ZIP_STORED):
@@ -252,7 +261,8 @@ class ToolTest(unittest.TestCase):
         self.assertTrue(shown.startswith("\r\x1b[KOpening "))
         lines = re.sub("(\r\x1b\\[K[^\r\n]*)?\r\x1b\\[K", "", shown).replace("\r", "").splitlines()
         self.assertIn("Worksheet 1: Measurements", lines)
-        self.assertTrue(lines.pop().startswith("dpxlsx: "))  # a note goes whole
+        self.assertEqual([line for line in lines if line.startswith("dpxlsx: ")], lines[-2:])
+        del lines[-2:]  # notes go whole
         plain = [line for line in lines if line.isascii() or line.endswith("…")]
         self.assertLessEqual(max(map(len, plain)), 60)
 
@@ -363,11 +373,21 @@ class ToolTest(unittest.TestCase):
                  [SAMPLE, "--explain", "--csv"], [SAMPLE, "--explain", "--list"], [SAMPLE, "--rows", "0"], [SAMPLE, "--missing", "nan"],
                  [SAMPLE, "--exclude", "Nowhere!A"], [SAMPLE, SAMPLE], [SAMPLE, "--as-shown"],
                  [SAMPLE, "--missing-word", "a=1", "--missing-number", "1=2"],
-                 [SAMPLE, "--json", SAMPLE]]
+                 [SAMPLE, "--json", SAMPLE], [SAMPLE, "--max-text", "0"], [SAMPLE, "--list=no"],
+                 [SAMPLE, "--type", "Measurements!Q=text"], [SAMPLE, "--position", "2!K=1"]]
         for arguments in cases:
             with self.subTest(arguments):
                 self.run_tool(*arguments, expected=2)
-        self.assertIn("has no cells", self.run_tool(SAMPLE, "--sheet", "Empty", expected=2))
+        messages = [(["--sheet", "Empty"], '"Empty" has no values and is not imported'),
+                    (["--sheet", "3"], 'no worksheet "3" with values; it has "Measurements" .1.'),
+                    (["--head"], "--head: its value is missing; see"),
+                    (["--csv", "a", "--csv", "b"], "--csv: give it once, with one value; see"),
+                    (["--csv", "--explain"], "or --explain with --json"),
+                    (["--exclude", "Measurements!Q"], 'the worksheet "Measurements" has no column Q')]
+        for arguments, text in messages:
+            self.assertRegex(self.run_tool(SAMPLE, *arguments, expected=2), text)
+        self.assertEqual(self.run_tool(SAMPLE, "--exclude-sheet", "1", "--exclude-sheet", "2"),
+                         "All worksheets are left out\n")
 
     def damaged(self, name):
         """A workbook for the row `name` of the table of failures."""
@@ -399,7 +419,8 @@ class ToolTest(unittest.TestCase):
                 self.assertIn(f"{book}: ", self.run_tool(book, expected=code))
         other = shutil.copy(SAMPLE, self.folder / "book.xlsm")
         self.run_tool(other, expected=22)
-        self.run_tool(SAMPLE, expected=5, TMPDIR=str(self.folder / "none"))
+        for view in ("--list", "--explain", "--json"):
+            self.run_tool(SAMPLE, view, expected=18, TMPDIR=str(self.folder / "none"))
 
     def test_unreachable_library_and_output(self):
         self.run_tool(SAMPLE, "--library", "none.so", expected=4)
@@ -514,9 +535,11 @@ class ToolTest(unittest.TestCase):
                 fails = [t["importFails"] for t in explained["traits"]]
                 self.assertEqual(fails, [code != 0] if key else [])
                 self.run_tool(book, expected=code)
-                noted = [note for note in self.notes if note.endswith("see dpxlsx --explain")]
-                told = key in WORST if code == 0 else key != "unreadable"
+                noted = [note for note in self.notes if "dpxlsx --explain" in note]
+                told = code != 0 or (key in WORST and text != r"1 cell \(My Data!A2\)")
                 self.assertEqual(len(noted), told, self.notes)
+                lost = [note for note in self.notes if "; to keep" in note]
+                self.assertEqual(len(lost), key in ("lost-on-conversion", "long-texts"))
 
     def test_traits_come_in_order_and_each_says_where(self):
         book = self.book(renamed(WORKBOOK, "x.xml") | {WORKBOOK: PARTS[WORKBOOK].replace(
@@ -536,7 +559,7 @@ class ToolTest(unittest.TestCase):
 
     def test_cells_lost_on_conversion_are_counted(self):
         lost = r": 1 cell became missing on conversion: 1 in Measurements!L \(Count\); to keep " \
-               "them: --type 'Measurements!L=text'$"
+               "the content: --type 'Measurements!L=text'$"
         cases = [([], lost), (["--sheet", "1", "--position", "L=30"], lost),
                  (["--type", "L=text"], ""), (["--missing-word", "n/a=-1"], ""),
                  (["--missing-word", "n/a=missing"], ""), (["--missing-number", "5=missing"], lost),
@@ -547,12 +570,45 @@ class ToolTest(unittest.TestCase):
                   r"11 in Measurements!J \(City\), 1 in"),
                  (["--names", "none", "--first-row", "2", "--type", "1!J=numeric", "--type",
                    "1!M=numeric", "--type", "2!E=numeric"],
-                  ": 25 cells .*!M and 3 in 1 more column; to")]
+                  ": 25 cells .*!M and 3 in 1 more column; to.*--explain names all")]
         for arguments, text in cases:
             with self.subTest(arguments):
-                self.run_tool(SAMPLE, *arguments)
+                self.run_tool(SAMPLE, *arguments, "--max-text", "93")
                 self.assertEqual(len(self.notes), text != "", self.notes)
                 self.assertRegex("".join(self.notes), text or "^$")
+        self.assertRegex(self.run_tool(SAMPLE, "--explain", *cases[-1][0]),
+                         "25 cells do not fit.* 3 in Readings 2024!E:.*--type 'Readings 2024!E=text'")
+
+    def test_cut_texts_are_counted(self):
+        cut = ": 1 text was cut at 80 bytes: 1 in Measurements!M .Comment.; to keep all of it: " \
+              "--max-text 93$"
+        cases = [([], cut), (["--position", "M=3", "--position", "C=13"], cut),
+                 (["--max-text", "93"], ""), (["--max-text", "none"], ""),
+                 (["--exclude", "M"], ""), (["--preview"], cut), (["--rows", "3"], ""),
+                 (["--type", "M=numeric"], ""), (["--max-text", "92"], "cut at 92 bytes: 1 in")]
+        for arguments, text in cases:
+            with self.subTest(arguments):
+                whole = self.columns("--sheet", "1", *arguments)
+                notes = [note for note in self.notes if "cut at" in note]
+                self.assertEqual(len(notes), text != "", self.notes)
+                self.assertRegex("".join(notes), text or "^$")
+                texts = [v for v in whole.get("Comment", {"values": []})["values"] if v]
+                if arguments[:1] == ["--max-text"]:
+                    self.assertEqual(max(len(str(v).encode()) for v in texts),
+                                     min(93, int(arguments[1].replace("none", "93"))))
+
+    def test_options_that_do_nothing_are_told(self):
+        cases = [(["--type", "Q=text"], "no worksheet has a column Q with values: --type does nothing"),
+                 (["--exclude", "Q", "--sheet", "2"], "column Q .*--exclude"),
+                 (["--sheet", "1", "--rename", "2!Q=x"], ""),
+                 (["--rename", "C=x"], ""), (["--position", "A=3", "--position", "C=1"], ""),
+                 (["--position", "A=3"], 'columns A and C of "Measurements" are both at position 3')]
+        for arguments, text in cases:
+            with self.subTest(arguments):
+                self.run_tool(SAMPLE, "--max-text", "none", "--type", "L=text", *arguments)
+                told = [note for note in self.notes if "to keep" not in note]
+                self.assertEqual(len(told) > 0, text != "", self.notes)
+                self.assertRegex("".join(told), text or "^$")
 
     def cell(self, place, text, codes):
         """A cell as the examples write it; its number format goes to `codes`."""

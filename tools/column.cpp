@@ -8,6 +8,7 @@
 #include "model/host/i_variable_format.h"
 #include "tools/calendar.h"
 #include "tools/settings.h"
+#include "tools/text.h"
 
 namespace dp::tool {
 
@@ -27,7 +28,7 @@ size_t rowsOf(const IColumn& column, bool preview) {
 }
 
 std::string counted(int count, const std::string& unit) {
-    return std::to_string(count) + " " + unit + (count == 1 ? "" : "s");
+    return tool::counted(static_cast<size_t>(std::max(count, 0)), unit);
 }
 
 std::string fractionText(const IFractionVariableFormat& format) {
@@ -112,6 +113,13 @@ std::string Column::exact(size_t row, char dateAndTime) const {
 
 int Column::convertedMissing() const {
     return kind_ == Kind::Text ? 0 : numeric().GetConvertedMissingCount();
+}
+
+size_t Column::longestText() const {
+    const IVariableFormat* format = column_->GetFormat();
+    if (format == nullptr || format->GetType() != IVariableFormat::FormatType::Text) return 0;
+    const int count = static_cast<const ITextVariableFormat&>(*format).GetCharacterCount();
+    return static_cast<size_t>(std::max(count, 0));
 }
 
 std::string Column::pattern() const { return patternOf(column_->GetFormat()); }

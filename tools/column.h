@@ -38,6 +38,8 @@ class Column {
 
     // Cells that had content but became missing; 0 for texts.
     int convertedMissing() const;
+    // Bytes of the longest text in a column of texts, else 0.
+    size_t longestText() const;
     // The ICU pattern of a date-time column, else empty.
     std::string pattern() const;
     // The format in words, such as "fixed, 2 decimals".

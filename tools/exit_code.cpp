@@ -4,6 +4,7 @@
 #include <exception>
 #include <filesystem>
 #include <new>
+#include <system_error>
 
 #include "tools/text.h"
 
@@ -36,6 +37,12 @@ constexpr const char* kMalformed =
     "has a part that is missing or malformed; open it in a spreadsheet program and save it as "
     ".xlsx again";
 
+// The library lets the exception of the file system pass when there is none.
+bool hasTemporaryDirectory() {
+    std::error_code error;
+    return !std::filesystem::temp_directory_path(error).empty() && !error;
+}
+
 }  // namespace
 
 Failure readFailure(const std::string& book, long result) {
@@ -55,6 +62,7 @@ Failure currentFailure(const std::string& book) {
                                     ": there is not enough memory; close other programs or read "
                                     "fewer worksheets"};
     } catch (const std::exception& error) {
+        if (!hasTemporaryDirectory()) return readFailure(book, -kTemporaryDirectory);
         return {kSystemFailure, book + ": " + error.what() +
                                     "; check that the file and the temporary directory can be "
                                     "reached"};

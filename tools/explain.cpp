@@ -19,39 +19,47 @@ namespace {
 
 constexpr const char* kNothing = "nothing to explain";
 
-// The failure of an import; none when it goes well.
-std::optional<Failure> tryImport(const Library& library, const Options& options) {
+struct Attempt {
+    std::optional<Failure> failure;  // none when the import goes well
+    Lost lost;
+};
+
+Attempt tryImport(const Library& library, const Options& options) {
+    Attempt attempt;
     try {
-        Workbook(library, options).open();
+        Workbook workbook(library, options);
+        workbook.open();
+        for (const SheetEntry& sheet : workbook.worksheets()) workbook.load(sheet);
+        attempt.lost = workbook.losses().lost();
     } catch (const Interrupted&) {
         throw;
     } catch (...) {
-        return currentFailure(options.book);
+        attempt.failure = currentFailure(options.book);
     }
-    return std::nullopt;
+    return attempt;
 }
 
 // Failures that say nothing about the book.
 bool isOfTheSystem(const Failure& failure) {
     const int code = failure.code();
     return code == kNoSuchFile || code == kTemporaryDirectory || code == kSystemFailure ||
-           code == kLibraryFailure;
+           code == kLibraryFailure || code == kUsage;
 }
 
 std::vector<Trait> allTraits(const Library& library, const Options& options) {
-    const std::optional<Failure> failure = tryImport(library, options);
+    const Attempt attempt = tryImport(library, options);
+    const std::optional<Failure>& failure = attempt.failure;
     if (failure && isOfTheSystem(*failure)) throw *failure;
     // A package that the library does not unpack is not read any further either.
     const bool unpacked = !failure || failure->code() != kReadFailure;
-    const Findings findings = unpacked ? inspect(options.book) : Findings();
+    Findings findings = unpacked ? inspect(options.book) : Findings();
+    findings.lost = attempt.lost;
+    findings.textLimit = options.settings.maxText.value_or(kDefaultLongestText);
     std::vector<Trait> traits =
         traitsOf(findings, askForStyles(library, options.book, findings.formats));
     const bool explained =
         std::any_of(traits.begin(), traits.end(), [](const Trait& trait) { return trait.fatal; });
-    if (failure && !explained) {
-        const std::string text = failure->what();
-        traits.push_back(unreadableTrait(findings, text.substr(options.book.size() + 2)));
-    }
+    if (failure && !explained) traits.push_back(unreadableTrait(findings, failure->code()));
     return traits;
 }
 
@@ -95,6 +103,7 @@ void explain(const Library& library, const Options& options, Output& output) {
 std::string importNote(const std::string& book, const std::string& folder) {
     std::string text;
     for (const Trait& trait : quickTraitsOf(quickFindings(book, folder))) {
+        if (trait.note.empty()) continue;
         text += (text.empty() ? "" : "; ") + trait.note;
     }
     return text.empty() ? text : book + ": " + text + "; see dpxlsx --explain";
@@ -107,6 +116,10 @@ Failure explained(const Failure& failure, const std::string& book) {
         if (!trait.fatal) continue;
         return {failure.code(),
                 book + ": " + trait.found + "; " + trait.advice + "; see dpxlsx --explain"};
+    }
+    if (code == kMalformedWorkbook) {
+        return {failure.code(),
+                std::string(failure.what()) + "; dpxlsx --explain may name the part"};
     }
     return failure;
 }

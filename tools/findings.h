@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "tools/file_kind.h"
+#include "tools/losses.h"
 
 namespace dp::tool {
 
@@ -64,6 +65,8 @@ struct Findings {
 
     bool stringsWithoutCount = false;
     size_t sharedTexts = 0;  // cells
+    Places missingTexts;     // cells whose text the table does not have
+    size_t cdataTexts = 0;   // shared texts
     Places isoDates;
     bool datesFrom1904 = false;
     bool hasStyles = true;
@@ -77,6 +80,10 @@ struct Findings {
     Names hiddenWorksheets;           // those with cells
     Places runs;                      // inline texts of several runs
     std::vector<std::string> broken;  // parts that are missing or break off
+
+    // What an import lost, which the package alone does not show.
+    Lost lost;
+    int textLimit = 0;  // bytes
 };
 
 }  // namespace dp::tool

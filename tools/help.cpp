@@ -35,7 +35,7 @@ Missing values (NUMBER is a number or the word missing):
 Values:
   --decimal SYMBOL          of numbers written as texts, and on display (.)
   --range MIN:MAX           numbers outside become missing (-1.001e18:1.001e18)
-  --max-text N              longest text, in bytes (80)
+  --max-text N              longest text, in bytes (80), or none
   --clean-text              trim texts, drop control characters
   --dates-as-text           read date-times as their displayed texts
   --true TEXT, --false TEXT texts of Booleans (TRUE, FALSE)

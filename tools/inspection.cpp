@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cctype>
+#include <cstdint>
 #include <filesystem>
 #include <map>
 #include <vector>
@@ -58,7 +59,7 @@ class Inspector {
         if (!styles.empty()) formats_.read(package_, styles, findings_);
         readStrings();
         for (const WorksheetPart& worksheet : worksheets_) {
-            inspectWorksheet(package_, worksheet, formats_, findings_);
+            inspectWorksheet(package_, worksheet, {&formats_, textCount()}, findings_);
         }
         return findings_;
     }
@@ -66,10 +67,12 @@ class Inspector {
     Findings quick(const std::string& folder) {
         if (findings_.kind != FileKind::Workbook) return findings_;
         noteRootPrefix(located(kStyles, "styles"), findings_.stylesPrefixed);
-        readStringsHead(located(kStrings, "sharedStrings"));
+        const std::string strings = located(kStrings, "sharedStrings");
+        readStringsHead(strings);
         if (folder.empty()) return findings_;
         for (const WorksheetPart& worksheet : worksheets_) {
-            inspectWorksheetQuickly(package_, worksheet, folder + "/" + worksheet.part, findings_);
+            inspectWorksheetQuickly(package_, worksheet, folder + "/" + worksheet.part,
+                                    !strings.empty(), findings_);
         }
         return findings_;
     }
@@ -193,22 +196,40 @@ class Inspector {
         if (reader.isPrefixed()) notePrefix(part, reader.writtenName(), findings_.stringsPrefixed);
     }
 
-    // Counts the texts that have a phonetic one beside them.
+    // Counts the texts, those with a phonetic one beside them, and those in CDATA sections.
     void readStrings() {
         const std::string part = located(kStrings, "sharedStrings");
         if (part.empty()) return;
         PartReader reader(package_, part);
         bool phonetic = false;
-        while (reader.nextElement()) {
+        bool cdata = false;
+        while (reader.next()) {
+            if (reader.isText()) {
+                findings_.cdataTexts += reader.isCData() && !cdata;
+                cdata = cdata || reader.isCData();
+                continue;
+            }
             const std::string_view name = reader.element();
             takeTable(reader, part);
-            if (name == "si") phonetic = false;
+            if (name == "si") {
+                ++texts_;
+                phonetic = cdata = false;
+            }
             if (name == "rPh" && !phonetic) {
                 phonetic = true;
                 ++findings_.phoneticTexts;
             }
         }
         if (reader.isBroken()) findings_.broken.push_back(part);
+    }
+
+    // How many texts a cell can take: all when another trait says what becomes of the table.
+    size_t textCount() const {
+        const auto isTable = [](const MovedPart& part) { return part.wanted == kStrings; };
+        const auto& moved = findings_.moved;
+        const bool told = findings_.stringsWithoutCount || findings_.stringsPrefixed ||
+                          std::any_of(moved.begin(), moved.end(), isTable);
+        return told ? SIZE_MAX : texts_;
     }
 
     Package package_;
@@ -218,6 +239,7 @@ class Inspector {
     std::vector<WorksheetPart> worksheets_;
     NumberFormats formats_;
     bool counted_ = true;  // the table of shared texts
+    size_t texts_ = 0;     // in it
 };
 
 }  // namespace

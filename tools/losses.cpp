@@ -1,9 +1,9 @@
 #include "tools/losses.h"
 
 #include <algorithm>
+#include <optional>
 
 #include "model/host/i_finders.h"
-#include "tools/column_reference.h"
 #include "tools/settings.h"
 #include "tools/text.h"
 
@@ -50,9 +50,30 @@ size_t lostBesideNumbers(IDataProvider& provider, const Column& column, const Op
     return static_cast<size_t>(unmarked.convertedMissing());
 }
 
+// With the limit of texts put off while it is loaded.
+std::optional<Column> uncut(IDataProvider& provider, const Column& column, const Options& options,
+                            int limit) {
+    provider.SetMaximumTextLength(kNoLimit);
+    IColumn* found = nullptr;
+    provider.GetVariableFinder()->FindColumn(column.host().GetPrimeKey(), &found, true);
+    provider.SetMaximumTextLength(limit);
+    if (found == nullptr) return std::nullopt;
+    return Column(found, kDefaultMissing, options.settings.preview);
+}
+
+// The library cuts before it trims a name, which can take a space off its end.
+bool mayBeCut(const Column& column, size_t limit) {
+    return column.longestText() >= limit || column.name().size() + 1 >= limit;
+}
+
 }  // namespace
 
-void Losses::note(IDataProvider& provider, const std::string& worksheet, const Column& column) {
+void Losses::note(IDataProvider& provider, const std::string& place, const Column& column) {
+    noteCells(provider, place, column);
+    noteTexts(provider, place, column);
+}
+
+void Losses::noteCells(IDataProvider& provider, const std::string& place, const Column& column) {
     const ReadSettings& settings = options_.settings;
     auto count = static_cast<size_t>(column.convertedMissing());
     if (count > 0 && settings.missingWord) {
@@ -60,44 +81,44 @@ void Losses::note(IDataProvider& provider, const std::string& worksheet, const C
     } else if (count > 0 && (settings.missingNumber || settings.range)) {
         count = lostBesideNumbers(provider, column, options_);
     }
-    if (count == 0) return;
-    const std::string letters = columnLetters(numberOf(worksheet, column));
-    losses_.push_back({worksheet + "!" + letters, column.name(), count});
+    if (count > 0) lost_.cells.add({place, column.name(), count});
 }
 
-std::string Losses::text() const {
-    constexpr size_t kMost = 3;
-    size_t total = 0;
-    size_t listed = 0;
-    std::string places;
-    std::string options;
-    for (size_t i = 0; i < losses_.size(); ++i) {
-        const Loss& loss = losses_[i];
-        total += loss.cells;
-        if (i >= kMost) continue;
-        listed += loss.cells;
-        places += (i == 0 ? "" : ", ") + std::to_string(loss.cells) + " in " + loss.place;
-        if (!loss.name.empty()) places += " (" + loss.name + ")";
-        options += " --type " + shellWord(loss.place + "=text");
-    }
-    if (losses_.empty()) return {};
-    if (losses_.size() > kMost) {
-        const size_t more = losses_.size() - kMost;
-        places += " and " + std::to_string(total - listed) + " in " + std::to_string(more) +
-                  (more == 1 ? " more column" : " more columns");
-    }
-    return options_.book + ": " + std::to_string(total) + (total == 1 ? " cell" : " cells") +
-           " became missing on conversion: " + places + "; to keep them: " + options.substr(1);
+void Losses::noteTexts(IDataProvider& provider, const std::string& place, const Column& column) {
+    const int limit = options_.settings.maxText.value_or(kDefaultLongestText);
+    if (limit < 0 || !mayBeCut(column, static_cast<size_t>(limit))) return;
+    const std::optional<Column> whole = uncut(provider, column, options_, limit);
+    if (!whole) return;
+    size_t count = 0;
+    const auto noteLength = [&](size_t length) {
+        if (length <= static_cast<size_t>(limit)) return;
+        ++count;
+        lost_.longest = std::max(lost_.longest, length);
+    };
+    noteLength(whole->name().size());
+    const size_t rows = whole->kind() == Kind::Text ? whole->rows() : 0;
+    for (size_t row = 0; row < rows; ++row) noteLength(whole->text(row).size());
+    if (count > 0) lost_.cutTexts.add({place, column.name(), count});
 }
 
-// The column's place in the worksheet: the host's, unless an option gave it another one.
-unsigned Losses::numberOf(const std::string& worksheet, const Column& column) const {
-    const auto position = static_cast<unsigned>(column.host().GetPosition());
-    for (const auto& [where, given] : options_.settings.positions) {
-        const bool here = where.worksheet.empty() || where.worksheet == worksheet;
-        if (here && given == position) return where.column;
-    }
-    return position;
+std::string Losses::cellsNote() const {
+    const Tally& cells = lost_.cells;
+    if (cells.empty()) return {};
+    const bool all = cells.columns() <= kColumnsInNotes;
+    return options_.book + ": " + counted(cells.total(), "cell") +
+           " became missing on conversion: " + cells.text(kColumnsInNotes) +
+           "; to keep the content: " + cells.textTypes(kColumnsInNotes) +
+           (all ? "" : "; --explain names all columns");
+}
+
+std::string Losses::textsNote() const {
+    const Tally& texts = lost_.cutTexts;
+    if (texts.empty()) return {};
+    const int limit = options_.settings.maxText.value_or(kDefaultLongestText);
+    return options_.book + ": " + counted(texts.total(), "text") +
+           (texts.total() == 1 ? " was" : " were") + " cut at " + std::to_string(limit) +
+           " bytes: " + texts.text(kColumnsInNotes) + "; to keep all of it: --max-text " +
+           std::to_string(lost_.longest);
 }
 
 }  // namespace dp::tool

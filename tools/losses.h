@@ -1,37 +1,45 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
-#include <vector>
 
 #include "model/host/i_data_provider.h"
 #include "tools/column.h"
 #include "tools/options.h"
+#include "tools/tally.h"
 
 namespace dp::tool {
 
-// Cells that had content but became missing values, because it did not fit the kind of their
-// column.
+// What an import lost of the columns that it loaded.
+struct Lost {
+    Tally cells;         // had content that did not fit the kind of their column: missing values
+    Tally cutTexts;      // texts and names of columns beyond the limit of --max-text
+    size_t longest = 0;  // of those, in bytes
+};
+
+// Counts what the columns of an import lost.
 class Losses {
   public:
     explicit Losses(const Options& options) : options_(options) {}
 
-    // Counts those of a loaded column. Where the user's own marks of missing values make the
-    // library count more, the column is loaded once more; otherwise that would only take time.
-    void note(IDataProvider& provider, const std::string& worksheet, const Column& column);
-    // One line that says how many, where, and which options keep them; empty when there are none.
-    std::string text() const;
+    // Counts in a loaded column. Where the library's own counts leave a doubt (the user's marks of
+    // missing values, texts of just the longest length) the column is loaded once more; otherwise
+    // that would only take time.
+    // `place` is the worksheet and the column's letters, such as "Data!B".
+    void note(IDataProvider& provider, const std::string& place, const Column& column);
+
+    const Lost& lost() const { return lost_; }
+    // One line about the cells: how many, where, and which options keep them; empty when there are
+    // none. Another one about the texts.
+    std::string cellsNote() const;
+    std::string textsNote() const;
 
   private:
-    struct Loss {
-        std::string place;  // such as "Data!B"
-        std::string name;
-        size_t cells;
-    };
-
-    unsigned numberOf(const std::string& worksheet, const Column& column) const;
+    void noteCells(IDataProvider& provider, const std::string& place, const Column& column);
+    void noteTexts(IDataProvider& provider, const std::string& place, const Column& column);
 
     const Options& options_;
-    std::vector<Loss> losses_;
+    Lost lost_;
 };
 
 }  // namespace dp::tool

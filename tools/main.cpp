@@ -43,10 +43,9 @@ void show(Workbook& workbook, const Options& options) {
 
 // What the user would not notice in the output.
 void printNotes(const Workbook& workbook, const Options& options) {
-    for (const std::string& note :
-         {importNote(options.book, workbook.folder()), workbook.losses().text()}) {
-        if (!note.empty()) printLine(note);
-    }
+    const std::string note = importNote(options.book, workbook.folder());
+    if (!note.empty()) printLine(note);
+    for (const std::string& more : workbook.notes()) printLine(more);
 }
 
 void importBook(const Library& library, const Options& options) {

@@ -16,7 +16,8 @@ constexpr unsigned kLastRow = 1048576;
 constexpr unsigned kMostCharacters = 65535;
 constexpr unsigned kMostBytes = 2147483647;
 
-constexpr const char* kOneView = "choose one of --list, --explain, --csv and --json";
+constexpr const char* kOneView =
+    "choose one of --list, --csv, --json and --explain, or --explain with --json";
 
 void require(bool holds, const char* text) {
     if (!holds) throw Failure(kUsage, std::string(text) + "; see dpxlsx --help");
@@ -29,7 +30,9 @@ class OptionList {
 
     explicit OptionList(CLI::App& app) : app_(app) {}
 
-    void flag(const char* name, bool& target) { app_.add_flag(name, target); }
+    void flag(const char* name, bool& target) {
+        app_.add_flag(name, target)->disable_flag_override();
+    }
 
     CLI::Option* once(const std::string& name, const Take& take) {
         const auto call = [name, take](const std::string& text) { take(name, text); };
@@ -144,8 +147,10 @@ void addValues(OptionList& list, ReadSettings& settings) {
         const auto [least, most] = splitValue(option, value, ':');
         settings.range.emplace(numberValue(option, least), numberValue(option, most));
     });
-    list.number("--max-text", kMostBytes,
-                [&settings](unsigned length) { settings.maxText = static_cast<int>(length); });
+    list.once("--max-text", [&settings](const std::string& option, const std::string& value) {
+        settings.maxText =
+            value == "none" ? kNoLimit : static_cast<int>(wholeValue(option, value, 1, kMostBytes));
+    });
     list.flag("--clean-text", settings.cleanText);
     list.flag("--dates-as-text", settings.datesAsText);
     list.text("--true", settings.trueText);
@@ -186,6 +191,14 @@ void check(const Options& options) {
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\n')); }
 
+// The parser's words begin with the option, and tell of a number when there are too many values.
+std::string mismatchText(const std::string& words) {
+    const bool tooMany = words.find("received") != std::string::npos;
+    return words.substr(0, words.find(':')) +
+           (tooMany ? ": give it once, with one value" : ": its value is missing") +
+           "; see dpxlsx --help";
+}
+
 }  // namespace
 
 Request parseOptions(int count, const char* const* arguments) {
@@ -212,6 +225,8 @@ Request parseOptions(int count, const char* const* arguments) {
     } catch (const CLI::CallForVersion& version) {
         request.answer = firstLine(version.what()) + "\n";
         return request;
+    } catch (const CLI::ArgumentMismatch& error) {
+        throw Failure(kUsage, mismatchText(error.what()));
     } catch (const CLI::ParseError& error) {
         throw Failure(kUsage, firstLine(error.what()) + "; see dpxlsx --help");
     }

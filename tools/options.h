@@ -15,6 +15,9 @@ enum class View { Tables, Names, Csv, Json };
 // A number as the user writes it; none is the word "missing".
 using NumberOrMissing = std::optional<double>;
 
+// Instead of a longest text.
+constexpr int kNoLimit = -1;
+
 // What the host hands over to the provider. Whatever is not set stays at the library's default.
 struct ReadSettings {
     std::optional<EVariableNameRowSetting> names;
@@ -40,7 +43,7 @@ struct ReadSettings {
     std::optional<std::pair<double, double>> range;
     std::optional<std::string> trueText;
     std::optional<std::string> falseText;
-    std::optional<int> maxText;  // bytes
+    std::optional<int> maxText;  // bytes, or kNoLimit
     bool datesAsText = false;
     bool cleanText = false;
     bool cleanSheetNames = false;

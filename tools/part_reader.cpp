@@ -98,7 +98,11 @@ bool PartReader::nextElement() {
 }
 
 bool PartReader::isText() const {
-    return xmlTextReaderNodeType(reader_.get()) == XML_READER_TYPE_TEXT;
+    return xmlTextReaderNodeType(reader_.get()) == XML_READER_TYPE_TEXT || isCData();
+}
+
+bool PartReader::isCData() const {
+    return xmlTextReaderNodeType(reader_.get()) == XML_READER_TYPE_CDATA;
 }
 
 std::string PartReader::text() const {

@@ -25,6 +25,8 @@ class PartReader {
     bool nextElement();
 
     bool isText() const;
+    // Whether the text is written as a CDATA section.
+    bool isCData() const;
     // The text node's content.
     std::string text() const;
 

@@ -8,6 +8,7 @@
 #include "model/host/i_finders.h"
 #include "model/host/i_string.h"
 #include "model/host/i_worksheet.h"
+#include "tools/column_reference.h"
 #include "tools/counted.h"
 #include "tools/date_time_helper.h"
 
@@ -102,48 +103,98 @@ void applyRows(IDataProvider& provider, const ReadSettings& settings, int sheet)
     if (settings.rows) provider.SetReadOptionDataRowCount(key, *settings.rows);
 }
 
+// The columns of a worksheet, by key, as long as no option gives them another position.
+std::map<int, unsigned> columnsOf(IDataProvider& provider, int sheet) {
+    std::map<int, unsigned> numbers;
+    const IVariableFinder& finder = *provider.GetVariableFinder();
+    const IReadOnlyCollection<int>& keys = *finder.GetColumnPrimeKeys(sheet);
+    for (unsigned long i = 0; i < keys.Count(); ++i) {
+        IColumn* found = nullptr;
+        if (!finder.FindColumn(keys.Item(i), &found, true)) continue;
+        const Counted<IColumn> column(found);
+        numbers[keys.Item(i)] = static_cast<unsigned>(column->GetPosition());
+    }
+    return numbers;
+}
+
 class ColumnOptions {
   public:
-    ColumnOptions(const Options& options, const std::vector<SheetEntry>& sheets)
-        : options_(options), sheets_(sheets) {}
+    ColumnOptions(IDataProvider& provider, const std::vector<SheetEntry>& all,
+                  const ReadSettings& settings, ReadPlan& plan)
+        : provider_(provider), all_(all), settings_(settings), plan_(plan) {}
 
-    // Calls `act` for each worksheet that the reference means.
-    template <class Act>
-    void forEach(const ColumnReference& column, Act act) const {
-        const bool every = column.worksheet.empty();
-        const int wanted = every ? 0 : keyOf(sheets_, column.worksheet);
-        for (const SheetEntry& sheet : sheets_) {
-            if (every || sheet.key == wanted) act(static_cast<unsigned>(sheet.key), column.column);
-        }
-    }
-
-    void apply(IDataProvider& provider) const {
-        const ReadSettings& settings = options_.settings;
-        for (const ColumnReference& excluded : settings.excluded) {
-            forEach(excluded, [&](unsigned key, unsigned column) {
-                provider.SetReadColumnOptionExclude(key, column, true);
+    void apply() {
+        if (!areGiven()) return;
+        findColumns();
+        for (const ColumnReference& excluded : settings_.excluded) {
+            forEach("--exclude", excluded, [&](unsigned key, unsigned column) {
+                provider_.SetReadColumnOptionExclude(key, column, true);
             });
         }
-        for (const auto& [where, type] : settings.types) {
-            forEach(where, [&, wanted = type](unsigned key, unsigned column) {
-                provider.SetReadColumnOptionColumnType(key, column, wanted);
+        for (const auto& [where, type] : settings_.types) {
+            forEach("--type", where, [&, wanted = type](unsigned key, unsigned column) {
+                provider_.SetReadColumnOptionColumnType(key, column, wanted);
             });
         }
-        for (const auto& [where, name] : settings.renamed) {
-            forEach(where, [&, wanted = name](unsigned key, unsigned column) {
-                provider.SetReadColumnOptionName(key, column, wanted.c_str());
+        for (const auto& [where, name] : settings_.renamed) {
+            forEach("--rename", where, [&, wanted = name](unsigned key, unsigned column) {
+                provider_.SetReadColumnOptionName(key, column, wanted.c_str());
             });
         }
-        for (const auto& [where, place] : settings.positions) {
-            forEach(where, [&, wanted = place](unsigned key, unsigned column) {
-                provider.SetReadColumnOptionDestinationId(key, column, wanted);
+        for (const auto& [where, place] : settings_.positions) {
+            forEach("--position", where, [&, wanted = place](unsigned key, unsigned column) {
+                provider_.SetReadColumnOptionDestinationId(key, column, wanted);
             });
         }
     }
 
   private:
-    const Options& options_;
-    const std::vector<SheetEntry>& sheets_;
+    bool areGiven() const {
+        return !settings_.excluded.empty() || !settings_.types.empty() ||
+               !settings_.renamed.empty() || !settings_.positions.empty();
+    }
+
+    void findColumns() {
+        provider_.SetPreviewing(true);  // less to convert
+        for (const SheetEntry& sheet : listSheets(provider_)) {
+            std::set<unsigned>& numbers = numbers_[sheet.key];
+            for (const auto& [key, number] : columnsOf(provider_, sheet.key)) {
+                plan_.columnNumbers.emplace(key, number);
+                numbers.insert(number);
+            }
+        }
+        provider_.SetPreviewing(settings_.preview);
+    }
+
+    // Calls `act` for each worksheet that the reference means and that has the column. A worksheet
+    // that is left out has none.
+    template <class Act>
+    void forEach(const char* option, const ColumnReference& column, Act act) {
+        const bool every = column.worksheet.empty();
+        const int wanted = every ? 0 : keyOf(all_, column.worksheet);
+        bool found = !every && numbers_.count(wanted) == 0;
+        for (const auto& [key, numbers] : numbers_) {
+            if ((!every && key != wanted) || numbers.count(column.column) == 0) continue;
+            act(static_cast<unsigned>(key), column.column);
+            found = true;
+        }
+        if (!found) missColumn(option, column);
+    }
+
+    void missColumn(const std::string& option, const ColumnReference& column) {
+        const std::string text = "column " + columnLetters(column.column) + " with values";
+        if (!column.worksheet.empty()) {
+            throw Failure(kUsage, option + ": the worksheet \"" + column.worksheet + "\" has no " +
+                                      text + "; leave the option out or name another column");
+        }
+        plan_.notes.push_back("no worksheet has a " + text + ": " + option + " does nothing");
+    }
+
+    IDataProvider& provider_;
+    const std::vector<SheetEntry>& all_;
+    const ReadSettings& settings_;
+    ReadPlan& plan_;
+    std::map<int, std::set<unsigned>> numbers_;  // of the columns, by worksheet key
 };
 
 void excludeSheets(IDataProvider& provider, const Options& options,
@@ -161,7 +212,7 @@ void excludeSheets(IDataProvider& provider, const Options& options,
 
 std::string worksheetsText(const std::vector<SheetEntry>& sheets) {
     constexpr size_t kMost = 10;
-    if (sheets.empty()) return "it has none with cells";
+    if (sheets.empty()) return "it has none with values";
     std::string text;
     for (size_t i = 0; i < std::min(sheets.size(), kMost); ++i) {
         text += (i == 0 ? "it has \"" : ", \"") + sheets[i].title + "\" (" +
@@ -202,19 +253,19 @@ void applySettings(IDataProvider& provider, const ReadSettings& settings) {
     applyTexts(provider, settings);
 }
 
-std::map<int, unsigned> applyReadOptions(IDataProvider& provider, const Options& options) {
+ReadPlan applyReadOptions(IDataProvider& provider, const Options& options) {
     const std::vector<SheetEntry> sheets = listSheets(provider);
     excludeSheets(provider, options, sheets);
-    std::map<int, unsigned> nameRows;
+    ReadPlan plan;
     for (const SheetEntry& sheet : listSheets(provider)) {
         applyRows(provider, options.settings, sheet.key);
-        nameRows[sheet.key] = nameRowOf(provider, options.settings, sheet.key);
+        plan.nameRows[sheet.key] = nameRowOf(provider, options.settings, sheet.key);
     }
-    ColumnOptions(options, sheets).apply(provider);
+    ColumnOptions(provider, sheets, options.settings, plan).apply();
     // Blank rows are found once, among the columns that are not excluded by then.
     provider.SetReadOptionPadColumnsWithMissingValues(options.settings.pad);
     provider.SetReadOptionIgnoreBlankRows(options.settings.skipBlankRows);
-    return nameRows;
+    return plan;
 }
 
 }  // namespace dp::tool

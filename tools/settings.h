@@ -15,6 +15,9 @@ constexpr double kDefaultMissing = 1.23456e30;
 // The library's own limit of numbers on both sides.
 constexpr double kDefaultRange = 1.001e18;
 
+// The library's own limit of texts and names, in bytes.
+constexpr int kDefaultLongestText = 80;
+
 struct SheetEntry {
     int key;
     std::string title;
@@ -45,8 +48,17 @@ void applySettings(IDataProvider& provider, const ReadSettings& settings);
 // is not set stays as it is.
 void applyNumbers(IDataProvider& provider, const ReadSettings& settings);
 
-// Options that name worksheets and columns of the open workbook. Throws UnknownWorksheet when there
-// is no such one. Answers, by key, the 1-based row of the variable names, 0 for none.
-std::map<int, unsigned> applyReadOptions(IDataProvider& provider, const Options& options);
+// What the options of worksheets and columns turned out to mean in the open workbook.
+struct ReadPlan {
+    std::map<int, unsigned> nameRows;  // by worksheet key: 1-based, 0 for none
+    // By column key, where options of columns are given: the 1-based number in the worksheet. An
+    // option may give the column another position at the host.
+    std::map<int, unsigned> columnNumbers;
+    std::vector<std::string> notes;  // options that do nothing
+};
+
+// Hands over the options that name worksheets and columns of the open workbook. Throws
+// UnknownWorksheet when there is no such worksheet, a Failure when it has no such column.
+ReadPlan applyReadOptions(IDataProvider& provider, const Options& options);
 
 }  // namespace dp::tool

@@ -15,10 +15,6 @@ namespace {
 
 constexpr size_t kFirstRows = 10;
 
-std::string counted(size_t count, const std::string& unit) {
-    return std::to_string(count) + " " + unit + (count == 1 ? "" : "s");
-}
-
 std::string layoutText(const LoadedWorksheet& worksheet) {
     const Layout& layout = worksheet.layout;
     std::string text = counted(worksheet.columns.size(), "column");
@@ -108,7 +104,10 @@ void showWorksheet(const LoadedWorksheet& worksheet, const Options& options, Out
 
 void showTables(Workbook& workbook, const Options& options, Output& output) {
     const std::vector<SheetEntry> sheets = workbook.worksheets();
-    if (sheets.empty()) output.write("No worksheet with cells\n");
+    if (sheets.empty()) {
+        const bool leftOut = !options.settings.excludedSheets.empty();
+        output.write(leftOut ? "All worksheets are left out\n" : "No worksheet with values\n");
+    }
     for (size_t i = 0; i < sheets.size(); ++i) {
         if (i > 0) output.write("\n");
         showWorksheet(workbook.load(sheets[i]), options, output);

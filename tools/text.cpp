@@ -100,4 +100,8 @@ std::string padded(const std::string& text, int width, bool toTheRight) {
     return toTheRight ? spaces + text : text + spaces;
 }
 
+std::string counted(size_t count, const std::string& unit) {
+    return std::to_string(count) + " " + unit + (count == 1 ? "" : "s");
+}
+
 }  // namespace dp::tool

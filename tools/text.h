@@ -22,6 +22,9 @@ std::string cutToWidth(const std::string& text, int width);
 // The text followed (or, to the right, preceded) by spaces up to `width` cells.
 std::string padded(const std::string& text, int width, bool toTheRight);
 
+// "1 cell", "2 cells".
+std::string counted(size_t count, const std::string& unit);
+
 // The text as one word of a shell's command line, quoted when it needs to be.
 std::string shellWord(const std::string& text);
 

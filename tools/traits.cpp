@@ -4,6 +4,7 @@
 #include <optional>
 #include <set>
 
+#include "tools/exit_code.h"
 #include "tools/text.h"
 
 namespace dp::tool {
@@ -15,10 +16,6 @@ using Found = std::optional<Trait>;
 constexpr const char* kOpenFails = "the import fails";
 constexpr const char* kSaveAgain =
     "open the book in a spreadsheet program and save it as .xlsx again";
-
-std::string counted(size_t count, const std::string& unit) {
-    return std::to_string(count) + " " + unit + (count == 1 ? "" : "s");
-}
 
 std::string quoted(const std::string& text) { return "\"" + text + "\""; }
 
@@ -87,6 +84,17 @@ Found stringsWithoutCount(const Findings& findings) {
                  "the table of shared texts does not say how many there are (uniqueCount)",
                  "the texts that cells take from it are missing" + cells,
                  kSaveAgain,
+                 false,
+                 "the shared texts are missing"};
+}
+
+Found missingTexts(const Findings& findings) {
+    if (findings.missingTexts.count == 0) return std::nullopt;
+    return Trait{"shared-strings-missing",
+                 placed(findings.missingTexts, "cell") +
+                     " with a text that the package does not have (xl/sharedStrings.xml)",
+                 "the texts are missing",
+                 "get a fresh copy, or " + std::string(kSaveAgain),
                  false,
                  "the shared texts are missing"};
 }
@@ -286,6 +294,32 @@ Found inlineRuns(const Findings& findings) {
                  "only the last piece arrives", kSaveAgain};
 }
 
+Found cdataTexts(const Findings& findings) {
+    if (findings.cdataTexts == 0) return std::nullopt;
+    return Trait{"cdata-texts", counted(findings.cdataTexts, "shared text") + " in CDATA sections",
+                 "what stands in them is missing", kSaveAgain};
+}
+
+Found lostCells(const Findings& findings) {
+    const Tally& cells = findings.lost.cells;
+    if (cells.empty()) return std::nullopt;
+    return Trait{"lost-on-conversion",
+                 counted(cells.total(), "cell") + (cells.total() == 1 ? " does" : " do") +
+                     " not fit the kind of the column: " + cells.text(cells.columns()),
+                 "a missing value arrives",
+                 "to keep the content: " + cells.textTypes(cells.columns())};
+}
+
+Found longTexts(const Findings& findings) {
+    const Tally& texts = findings.lost.cutTexts;
+    if (texts.empty()) return std::nullopt;
+    return Trait{"long-texts",
+                 counted(texts.total(), "text") + " longer than " +
+                     std::to_string(findings.textLimit) + " bytes: " + texts.text(texts.columns()),
+                 "what is longer is cut off",
+                 "to keep all of it: --max-text " + std::to_string(findings.lost.longest)};
+}
+
 void add(std::vector<Trait>& traits, Found found) {
     if (found) traits.push_back(std::move(*found));
 }
@@ -296,13 +330,15 @@ std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleA
     std::vector<Trait> traits = quickTraitsOf(findings);
     add(traits, noStyleSheet(findings));
     add(traits, movedParts(findings));
+    add(traits, lostCells(findings));
+    add(traits, longTexts(findings));
     if (!findings.stylesPrefixed) {  // else that explains what becomes of the formats
         add(traits, takenForDates(findings, answers));
         add(traits, notTakenForDates(findings, answers));
         add(traits, defaultDateStyle(findings, answers));
     }
     for (const auto trait :
-         {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns}) {
+         {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns, cdataTexts}) {
         add(traits, trait(findings));
     }
     return traits;
@@ -311,16 +347,23 @@ std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleA
 std::vector<Trait> quickTraitsOf(const Findings& findings) {
     std::vector<Trait> traits;
     for (const auto trait :
-         {namespacePrefix, stringsWithoutCount, isoDates, datesFrom1904, otherFile}) {
+         {namespacePrefix, stringsWithoutCount, missingTexts, isoDates, datesFrom1904, otherFile}) {
         add(traits, trait(findings));
     }
     return traits;
 }
 
-Trait unreadableTrait(const Findings& findings, const std::string& failure) {
-    if (findings.broken.empty()) return {"unreadable", failure, kOpenFails, kSaveAgain, true};
-    return {"unreadable", quoted(findings.broken.front()) + " is missing or damaged", kOpenFails,
-            "get a fresh copy, or " + std::string(kSaveAgain), true};
+Trait unreadableTrait(const Findings& findings, int code) {
+    if (code == kReadFailure) {
+        return {"unreadable", "an entry of the package cannot be unpacked", kOpenFails,
+                "get a fresh copy of the file, or free some space if the disk is full", true};
+    }
+    if (!findings.broken.empty()) {
+        return {"unreadable", quoted(findings.broken.front()) + " is missing or damaged",
+                kOpenFails, "get a fresh copy, or " + std::string(kSaveAgain), true};
+    }
+    return {"unreadable", "a part of the package holds what an import cannot read", kOpenFails,
+            kSaveAgain, true};
 }
 
 }  // namespace dp::tool

@@ -26,7 +26,8 @@ std::vector<Trait> traitsOf(const Findings& findings,
 // Those that a quick look finds.
 std::vector<Trait> quickTraitsOf(const Findings& findings);
 
-// The trait of a file whose import fails for a reason that nothing else explains.
-Trait unreadableTrait(const Findings& findings, const std::string& failure);
+// The trait of a file whose import fails with this exit code for a reason that nothing else
+// explains.
+Trait unreadableTrait(const Findings& findings, int code);
 
 }  // namespace dp::tool

@@ -1,8 +1,10 @@
 #include "tools/workbook.h"
 
 #include <algorithm>
+#include <map>
 
 #include "model/host/i_finders.h"
+#include "tools/column_reference.h"
 #include "tools/exit_code.h"
 #include "tools/interrupt.h"
 
@@ -47,23 +49,24 @@ void Workbook::open() {
     if (result != 0) throw readFailure(options_.book, result);
     stopIfInterrupted();
     try {
-        nameRows_ = applyReadOptions(*provider_, options_);
+        plan_ = applyReadOptions(*provider_, options_);
     } catch (const UnknownWorksheet& unknown) {
         refuse(unknown);
     }
     progress_.erase();
 }
 
-// A worksheet without cells is in the workbook, but no host gets to see it.
+// A worksheet without values is in the workbook, but no host gets to see it.
 void Workbook::refuse(const UnknownWorksheet& unknown) {
     provider_->CloseFile();
     const std::vector<std::string> names = worksheetNames();
     const bool empty = std::find(names.begin(), names.end(), unknown.name()) != names.end();
-    throw Failure(kUsage, options_.book + ": " +
-                              (empty ? "the worksheet \"" + unknown.name() +
-                                           "\" has no cells and is not imported"
-                                     : "there is no worksheet \"" + unknown.name() + "\"") +
-                              "; " + unknown.what());
+    throw Failure(
+        kUsage,
+        options_.book + ": " +
+            (empty ? "the worksheet \"" + unknown.name() + "\" has no values and is not imported"
+                   : "there is no worksheet \"" + unknown.name() + "\" with values") +
+            "; " + unknown.what());
 }
 
 std::vector<SheetEntry> Workbook::worksheets() { return listSheets(*provider_); }
@@ -90,16 +93,49 @@ void Workbook::loadColumns(LoadedWorksheet& worksheet) {
         IColumn* column = nullptr;
         if (finder.FindColumn(keys[i], &column, false)) {
             worksheet.columns.emplace_back(column, missing(), options_.settings.preview);
-            losses_.note(*provider_, worksheet.title, worksheet.columns.back());
+            losses_.note(*provider_, worksheet.title + "!" + columnLetters(numberOf(*column)),
+                         worksheet.columns.back());
         } else {
             ++worksheet.excludedColumns;
         }
     }
+    if (!options_.settings.positions.empty()) notePositions(worksheet);
     progress_.erase();
 }
 
+// The column's 1-based number in the worksheet, whatever position an option gave it at the host.
+unsigned Workbook::numberOf(const IColumn& column) const {
+    const auto found = plan_.columnNumbers.find(column.GetPrimeKey());
+    return found == plan_.columnNumbers.end() ? static_cast<unsigned>(column.GetPosition())
+                                              : found->second;
+}
+
+// The library takes positions as they come.
+void Workbook::notePositions(const LoadedWorksheet& worksheet) {
+    std::map<unsigned, std::string> taken;  // columns, by position
+    for (const Column& column : worksheet.columns) {
+        const auto position = static_cast<unsigned>(column.host().GetPosition());
+        const std::string letters = columnLetters(numberOf(column.host()));
+        const auto [other, isNew] = taken.emplace(position, letters);
+        if (isNew) continue;
+        plan_.notes.push_back("columns " + other->second + " and " + letters + " of \"" +
+                              worksheet.title + "\" are both at position " +
+                              std::to_string(position) +
+                              "; give one of them another place: --position COLUMN=N");
+    }
+}
+
+std::vector<std::string> Workbook::notes() const {
+    std::vector<std::string> notes;
+    for (const std::string& note : plan_.notes) notes.push_back(options_.book + ": " + note);
+    for (const std::string& note : {losses_.cellsNote(), losses_.textsNote()}) {
+        if (!note.empty()) notes.push_back(note);
+    }
+    return notes;
+}
+
 Layout Workbook::layoutOf(const LoadedWorksheet& worksheet) const {
-    Layout layout{nameRows_.at(worksheet.key), options_.settings.firstRow, 0,
+    Layout layout{plan_.nameRows.at(worksheet.key), options_.settings.firstRow, 0,
                   provider_->GetWorksheetRowCount(static_cast<unsigned>(worksheet.key))};
     if (layout.firstDataRow == 0) layout.firstDataRow = layout.nameRow + 1;
     for (const Column& column : worksheet.columns) {

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <map>
 #include <string>
 #include <vector>
 
@@ -51,8 +50,11 @@ class Workbook {
     std::vector<SheetEntry> worksheets();
     LoadedWorksheet load(const SheetEntry& sheet);
 
-    // What became missing in the columns loaded so far.
+    // What was lost of the columns loaded so far.
     const Losses& losses() const { return losses_; }
+    // What the user would not notice in the output, one line each: options that do nothing, and
+    // what was lost.
+    std::vector<std::string> notes() const;
     // Where the library has unpacked the open workbook.
     std::string folder() const { return provider_->GetTempDirectoryPath(); }
 
@@ -63,13 +65,15 @@ class Workbook {
     [[noreturn]] void refuse(const UnknownWorksheet& unknown);
     Counted<IWorksheet> findWorksheet(int key);
     void loadColumns(LoadedWorksheet& worksheet);
+    unsigned numberOf(const IColumn& column) const;
+    void notePositions(const LoadedWorksheet& worksheet);
     Layout layoutOf(const LoadedWorksheet& worksheet) const;
 
     const Options& options_;
     Counted<IDataProvider> provider_;
     Progress progress_;
     Losses losses_;
-    std::map<int, unsigned> nameRows_;  // by worksheet key
+    ReadPlan plan_;
 };
 
 }  // namespace dp::tool

@@ -15,11 +15,10 @@ namespace {
 // One forward pass over the cells.
 class Pass {
   public:
-    Pass(Package& package, const WorksheetPart& worksheet, const NumberFormats* formats,
-         Findings& findings)
+    Pass(Package& package, const WorksheetPart& worksheet, const Tables& tables, Findings& findings)
         : reader_(package, worksheet.part),
           worksheet_(worksheet),
-          formats_(formats),
+          tables_(tables),
           findings_(findings) {}
 
     void run() {
@@ -34,9 +33,9 @@ class Pass {
         while (!prefixed_ && reader_.nextElement()) notePrefix();
     }
 
-    // Stops at the first date.
-    void findIsoDate() {
-        while (findings_.isoDates.count == 0 && reader_.next()) takeNode();
+    // Stops at the first of these places.
+    void find(const Places& places) {
+        while (places.count == 0 && reader_.next()) takeNode();
     }
 
   private:
@@ -60,7 +59,8 @@ class Pass {
             phoneticDepth_ = reader_.depth();
             phonetic_ = true;
         }
-        if (name == "mergeCell") findings_.mergedRanges.add(at(reader_.attribute("ref")));
+        if (name == "mergeCell" && hasCells_)
+            findings_.mergedRanges.add(at(reader_.attribute("ref")));
         notePrefix();
     }
 
@@ -79,21 +79,29 @@ class Pass {
     }
 
     void countValue() {
-        if (type_ == "s") ++findings_.sharedTexts;
+        if (type_ == "s") countSharedText();
         if (type_ == "d") findings_.isoDates.add(place_);
         if (type_ == "e") findings_.errors.add(place_);
         if (!style_.empty() && (type_.empty() || type_ == "n")) countStyle();
     }
 
+    void countSharedText() {
+        ++findings_.sharedTexts;
+        const long index = std::strtol(reader_.text().c_str(), nullptr, 10);
+        const bool known = index >= 0 && static_cast<size_t>(index) < tables_.texts;
+        if (!known) findings_.missingTexts.add(place_);
+    }
+
     void countStyle() {
+        const NumberFormats* const formats = tables_.formats;
         const long style = std::strtol(style_.c_str(), nullptr, 10);
         const bool known =
-            style >= 0 && formats_ != nullptr && style < static_cast<long>(formats_->size());
+            style >= 0 && formats != nullptr && style < static_cast<long>(formats->size());
         if (!known) return;
         const int index = static_cast<int>(style);
         auto found = findings_.formats.find(index);
         if (found == findings_.formats.end()) {
-            found = findings_.formats.emplace(index, formats_->of(index)).first;
+            found = findings_.formats.emplace(index, formats->of(index)).first;
         }
         found->second.cells.add(place_);
     }
@@ -114,7 +122,7 @@ class Pass {
 
     PartReader reader_;
     const WorksheetPart& worksheet_;
-    const NumberFormats* formats_;
+    const Tables tables_;
     Findings& findings_;
 
     std::string type_;
@@ -131,10 +139,10 @@ class Pass {
 
 bool isQuote(char c) { return c == '"' || c == '\''; }
 
-// Whether a quoted "d" stands anywhere in the file, in an encoding of one or two bytes: only then
-// can a cell have the type of ISO dates. Hardly any worksheet has one, and this is over before a
-// reader of XML has made its first steps.
-bool mayHaveIsoDates(const std::string& path) {
+// Whether the letter stands in quotes anywhere in the file, in an encoding of one or two bytes:
+// only then can a cell be of this type. This is over before a reader of XML has made its first
+// steps.
+bool mayHaveType(const std::string& path, char type) {
     constexpr size_t kMargin = 4;  // characters that stand around the end of a block
     std::ifstream file(path, std::ios::binary);
     std::vector<char> block((1 << 18) + 2 * kMargin);
@@ -145,7 +153,7 @@ bool mayHaveIsoDates(const std::string& path) {
         const char* const begin = block.data();
         const char* const end = begin + size;
         for (const char* at = begin; at + 1 < end; ++at) {
-            at = static_cast<const char*>(std::memchr(at, 'd', static_cast<size_t>(end - at)));
+            at = static_cast<const char*>(std::memchr(at, type, static_cast<size_t>(end - at)));
             if (at == nullptr) break;
             for (const std::ptrdiff_t width : {1, 2}) {
                 const bool inside = at - begin >= width && end - at > width;
@@ -165,20 +173,26 @@ bool hasPrefixedRoot(Package& package, const WorksheetPart& worksheet) {
 
 }  // namespace
 
-void inspectWorksheet(Package& package, const WorksheetPart& worksheet,
-                      const NumberFormats& formats, Findings& findings) {
-    Pass(package, worksheet, &formats, findings).run();
+void inspectWorksheet(Package& package, const WorksheetPart& worksheet, const Tables& tables,
+                      Findings& findings) {
+    Pass(package, worksheet, tables, findings).run();
 }
 
 void inspectWorksheetQuickly(Package& package, const WorksheetPart& worksheet,
-                             const std::string& unpacked, Findings& findings) {
+                             const std::string& unpacked, bool hasTexts, Findings& findings) {
+    const Tables none{nullptr, 0};
     if (hasPrefixedRoot(package, worksheet)) {
-        return Pass(package, worksheet, nullptr, findings).findPrefix();
+        return Pass(package, worksheet, none, findings).findPrefix();
     }
-    if (findings.isoDates.count == 0 && mayHaveIsoDates(unpacked)) {
+    if (findings.isoDates.count == 0 && mayHaveType(unpacked, 'd')) {
         Findings found;
-        Pass(package, worksheet, nullptr, found).findIsoDate();
+        Pass(package, worksheet, none, found).find(found.isoDates);
         findings.isoDates = found.isoDates;
+    }
+    if (!hasTexts && findings.missingTexts.count == 0 && mayHaveType(unpacked, 's')) {
+        Findings found;
+        Pass(package, worksheet, none, found).find(found.missingTexts);
+        findings.missingTexts = found.missingTexts;
     }
 }
 

@@ -14,13 +14,19 @@ struct WorksheetPart {
     bool hidden;
 };
 
-// Reads all cells and notes what it finds.
-void inspectWorksheet(Package& package, const WorksheetPart& worksheet,
-                      const NumberFormats& formats, Findings& findings);
+// What cells refer to.
+struct Tables {
+    const NumberFormats* formats;  // null to leave formats out
+    size_t texts;                  // how many shared texts there are
+};
 
-// Notes prefixes by the first element alone, and the first ISO date. `unpacked` is the same part as
-// a file.
+// Reads all cells and notes what it finds.
+void inspectWorksheet(Package& package, const WorksheetPart& worksheet, const Tables& tables,
+                      Findings& findings);
+
+// Notes prefixes by the first element alone, the first ISO date, and, when the package has no
+// shared texts, the first cell that wants one. `unpacked` is the same part as a file.
 void inspectWorksheetQuickly(Package& package, const WorksheetPart& worksheet,
-                             const std::string& unpacked, Findings& findings);
+                             const std::string& unpacked, bool hasTexts, Findings& findings);
 
 }  // namespace dp::tool

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+namespace dp::tool {
+
+// Cells counted by column.
+class Tally {
+  public:
+    struct Entry {
+        std::string place;  // such as "Data!B"
+        std::string name;   // of the column
+        size_t count;
+    };
+
+    void add(Entry entry);
+    bool empty() const { return entries_.empty(); }
+    size_t total() const { return total_; }
+    size_t columns() const { return entries_.size(); }
+
+    // "11 in Data!J (City), 1 in Data!L (Count) and 3 in 2 more columns", of which `most` are
+    // named.
+    std::string text(size_t most) const;
+    // "--type Data!J=text --type Data!L=text" for the same columns.
+    std::string textTypes(size_t most) const;
+
+  private:
+    std::vector<Entry> entries_;
+    size_t total_ = 0;
+};
+
+// Where the plain import stops naming columns in a note; all are named where the user asks.
+constexpr size_t kColumnsInNotes = 3;
+
+}  // namespace dp::tool
