@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "tools/file_kind.h"
-#include "tools/losses.h"
+#include "tools/tally.h"
 
 namespace dp::tool {
 

@@ -11,6 +11,8 @@ namespace dp::tool {
 
 namespace {
 
+constexpr size_t kColumnsInNotes = 3;  // --explain names all
+
 // Rows that are missing although the column of texts has content there other than the mark.
 size_t lostRows(const Column& column, const Column& texts, const std::string& mark) {
     size_t count = 0;

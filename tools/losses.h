@@ -10,13 +10,6 @@
 
 namespace dp::tool {
 
-// What an import lost of the columns that it loaded.
-struct Lost {
-    Tally cells;         // had content that did not fit the kind of their column: missing values
-    Tally cutTexts;      // texts and names of columns beyond the limit of --max-text
-    size_t longest = 0;  // of those, in bytes
-};
-
 // Counts what the columns of an import lost.
 class Losses {
   public:

@@ -31,7 +31,11 @@ class Tally {
     size_t total_ = 0;
 };
 
-// Where the plain import stops naming columns in a note; all are named where the user asks.
-constexpr size_t kColumnsInNotes = 3;
+// What an import lost of the columns that it loaded.
+struct Lost {
+    Tally cells;         // had content that did not fit the kind of their column: missing values
+    Tally cutTexts;      // texts and names of columns beyond the limit of --max-text
+    size_t longest = 0;  // of those, in bytes
+};
 
 }  // namespace dp::tool
