@@ -155,7 +155,7 @@ void ExcelXmlReader::readStringData(std::string& text) {
     do {
         const int type = xmlReader.nodeType();
         if (type == XML_READER_TYPE_TEXT || type == XML_READER_TYPE_SIGNIFICANT_WHITESPACE) {
-            text += xmlReader.nodeValue();
+            if (const char* value = xmlReader.nodeValue()) text += value;
         } else if (type == XML_READER_TYPE_END_ELEMENT) {
             const int element = cellNames_.find(xmlReader.nodeName());
             if (element == kData || element == kPrefixedData) break;

@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cstring>
-#include <new>
 
 #include <boost/filesystem.hpp>
 #include <libxml/xmlreader.h>
@@ -34,6 +33,13 @@ std::string copyToTemporary(const std::string& path) {
     std::string copy = (fs::temp_directory_path() / fs::unique_path("%%%%-%%%%", error)).string();
     if (!error && dp::copyFile(path, copy)) return copy;
     return {};
+}
+
+// A name with a prefix is put together when it is asked for, which libxml2 refuses once a document
+// has filled its dictionary with names. To pass over the element would lose what it holds.
+void requireNoElement(int nodeType) {
+    if (nodeType == XML_READER_TYPE_ELEMENT || nodeType == XML_READER_TYPE_END_ELEMENT)
+        throw CmXmlException(kXmlError);
 }
 
 }  // namespace
@@ -128,14 +134,16 @@ std::string XmlReader::attributeText(const char* name) {
 const char* XmlReader::knownName(const char* name) {
     const xmlChar* known =
         xmlTextReaderConstString(textReader, reinterpret_cast<const xmlChar*>(name));
-    if (!known) throw std::bad_alloc();
+    if (!known) throw CmXmlException(kXmlError);
     return reinterpret_cast<const char*>(known);
 }
 
 int XmlReader::nodeType() const { return xmlTextReaderNodeType(textReader); }
 
 const char* XmlReader::nodeName() const {
-    return reinterpret_cast<const char*>(xmlTextReaderConstName(textReader));
+    const xmlChar* name = xmlTextReaderConstName(textReader);
+    if (!name) requireNoElement(nodeType());
+    return reinterpret_cast<const char*>(name);
 }
 
 const char* XmlReader::nodeValue() const {

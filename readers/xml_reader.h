@@ -60,9 +60,11 @@ class DPXLSX_API XmlReader {
     // mReadAttribute does. Throws CmXmlException.
     std::string attributeText(const char* name);
     // `name` as the document keeps it: the current node has it when nodeName() is the same pointer;
-    // names with a prefix are kept apart. Valid as long as the reader. Throws std::bad_alloc.
+    // names with a prefix are kept apart. Valid as long as the reader. Throws CmXmlException when
+    // the document can keep no more names.
     const char* knownName(const char* name);
-    // The current node's type and name as libxml2 gives them; the name may be null.
+    // The current node's type and name as libxml2 gives them; the name may be null where the node
+    // is no element. Throws CmXmlException for an element without one.
     int nodeType() const;
     const char* nodeName() const;
     // The current node's value, null when its kind has none. Valid until the next read.

@@ -20,11 +20,11 @@ PooledText TextPool::intern(std::string_view text) {
     return std::bit_cast<PooledText>(bits);
 }
 
-// A text that often repeats the one before need not be searched for.
 void TextPool::settle() noexcept {
     if (short_.isWaiting()) short_.settle();
 }
 
+// A text that often repeats the one before need not be searched for.
 void TextPool::begin(std::string_view text) {
     if (!isRecent_ && !short_.isWaiting()) recent_ = PooledText(short_.recent());
     isRecent_ = true;
