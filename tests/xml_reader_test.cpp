@@ -141,6 +141,20 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
     EXPECT_EQ(text, "") << "external entities are not fetched";
 }
 
+// Each name with a prefix goes into a dictionary when it is asked for, which takes 50 MB at most.
+TEST_F(XmlReading, FailsWhereNoNameCanBeMade) {
+    const std::string filler(5000, 'n');
+    std::string document = "<a";
+    for (int i = 0; i < 20; ++i) document += " xmlns:p" + std::to_string(i) + filler + "='u'";
+    document += ">";
+    for (int i = 0; i < 5500; ++i)
+        document += "<p" + std::to_string(i % 20) + filler + ":l" + std::to_string(i / 20) + filler + "/>";
+    EXPECT_EQ(codeOfReading(document + "</a>"), 0) << "nobody asks for names";
+    XmlReader reader;
+    open(reader, document + "</a>");
+    EXPECT_THROW(reader.mGotoElement("none"), CmXmlException);
+}
+
 TEST_F(XmlReading, ReadsAPrivateCopyWhereLibxml2CannotOpenThePath) {
     // To the file system a relative path, to libxml2 the address of another file.
     const std::string path = "file:///nowhere/part.xml";
