@@ -161,6 +161,8 @@ TRAITS = [
      "--exclude-sheet 'My Data'", 0),
     ("inline-runs", changed(SHEET, CELL, '<c r="B2" t="inlineStr"><is><r><t>a</t></r><r><t>b</t>'
      '</r></is></c>'), "only the last piece", 0),
+    ("inline-values", changed(SHEET, CELL, '<c r="B2" t="inlineStr"><v>1.0</v><is><t>1.</t></is></c>'),
+     r"1 cell \(My Data!B2\) with an inline text and a value", 0),
     ("unreadable", changed(SHEET, "</sheetData>", ""), '"xl/worksheets/sheet1.xml" is .*damaged', 13),
     ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
 ]

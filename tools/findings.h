@@ -79,6 +79,7 @@ struct Findings {
     Places errors;
     Names hiddenWorksheets;           // those with cells
     Places runs;                      // inline texts of several runs
+    Places inlineValues;              // inline texts of cells that have a value too
     std::vector<std::string> broken;  // parts that are missing or break off
 
     // What an import lost, which the package alone does not show.

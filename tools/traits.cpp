@@ -294,6 +294,13 @@ Found inlineRuns(const Findings& findings) {
                  "only the last piece arrives", kSaveAgain};
 }
 
+Found inlineValues(const Findings& findings) {
+    if (findings.inlineValues.count == 0) return std::nullopt;
+    return Trait{"inline-values",
+                 placed(findings.inlineValues, "cell") + " with an inline text and a value",
+                 "the value arrives in place of the text", kSaveAgain};
+}
+
 Found cdataTexts(const Findings& findings) {
     if (findings.cdataTexts == 0) return std::nullopt;
     return Trait{"cdata-texts", counted(findings.cdataTexts, "shared text") + " in CDATA sections",
@@ -337,8 +344,8 @@ std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleA
         add(traits, notTakenForDates(findings, answers));
         add(traits, defaultDateStyle(findings, answers));
     }
-    for (const auto trait :
-         {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns, cdataTexts}) {
+    for (const auto trait : {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns,
+                             inlineValues, cdataTexts}) {
         add(traits, trait(findings));
     }
     return traits;

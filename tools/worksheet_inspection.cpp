@@ -73,12 +73,18 @@ class Pass {
 
     void endCell() {
         if (type_ == "inlineStr" && phonetic_) findings_.phoneticCells.add(place_);
-        if (type_ == "inlineStr" && runs_ > 1) findings_.runs.add(place_);
+        if (type_ == "inlineStr" && runs_ > 0 && hasValue_) {
+            findings_.inlineValues.add(place_);
+        } else if (type_ == "inlineStr" && runs_ > 1) {
+            findings_.runs.add(place_);
+        }
         runs_ = 0;
+        hasValue_ = false;
         phonetic_ = false;
     }
 
     void countValue() {
+        hasValue_ = true;
         if (type_ == "s") countSharedText();
         if (type_ == "d") findings_.isoDates.add(place_);
         if (type_ == "e") findings_.errors.add(place_);
@@ -129,6 +135,7 @@ class Pass {
     std::string style_;
     std::string place_;
     bool inValue_ = false;
+    bool hasValue_ = false;  // the cell
     size_t runs_ = 0;
     bool phonetic_ = false;
     bool inPhonetic_ = false;
