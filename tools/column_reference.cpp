@@ -1,5 +1,6 @@
 #include "tools/column_reference.h"
 
+#include <algorithm>
 #include <charconv>
 
 namespace dp::tool {
@@ -40,6 +41,13 @@ std::string columnLetters(unsigned number) {
         letters.insert(letters.begin(), static_cast<char>('A' + (number - 1) % 26));
     }
     return letters;
+}
+
+std::string columnReference(const std::string& title, int key, unsigned number) {
+    const bool plain = std::none_of(title.begin(), title.end(), [](char c) {
+        return c == '=' || static_cast<unsigned char>(c) < ' ' || c == 0x7F;
+    });
+    return (plain ? title : std::to_string(key)) + "!" + columnLetters(number);
 }
 
 std::optional<ColumnReference> parseColumnReference(std::string_view text) {

@@ -81,7 +81,7 @@ Json worksheetJson(const LoadedWorksheet& worksheet) {
     return {{"key", worksheet.key},
             {"title", validUtf8(worksheet.title)},
             {"layout", layoutJson(worksheet.layout)},
-            {"columnsLeftOut", worksheet.excludedColumns},
+            {"columnsLeftOut", worksheet.leftOut.size()},
             {"version", number(host.GetVersion())},
             {"osVersion", host.GetOSVersion()},
             {"creator", validUtf8(host.GetCreator())},

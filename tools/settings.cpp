@@ -197,15 +197,20 @@ class ColumnOptions {
     std::map<int, std::set<unsigned>> numbers_;  // of the columns, by worksheet key
 };
 
-void excludeSheets(IDataProvider& provider, const Options& options,
-                   const std::vector<SheetEntry>& sheets) {
+// The titles of those that are excluded.
+std::set<std::string> excludeSheets(IDataProvider& provider, const Options& options,
+                                    const std::vector<SheetEntry>& sheets) {
+    std::set<std::string> titles;
     const std::set<int> wanted = keysOf(sheets, options.sheets);
     const std::set<int> unwanted = keysOf(sheets, options.settings.excludedSheets);
     for (const SheetEntry& sheet : sheets) {
         const bool left =
             unwanted.count(sheet.key) != 0 || (!wanted.empty() && wanted.count(sheet.key) == 0);
-        if (left) provider.SetReadOptionExclude(static_cast<unsigned>(sheet.key), true);
+        if (!left) continue;
+        provider.SetReadOptionExclude(static_cast<unsigned>(sheet.key), true);
+        titles.insert(sheet.title);
     }
+    return titles;
 }
 
 }  // namespace
@@ -255,8 +260,8 @@ void applySettings(IDataProvider& provider, const ReadSettings& settings) {
 
 ReadPlan applyReadOptions(IDataProvider& provider, const Options& options) {
     const std::vector<SheetEntry> sheets = listSheets(provider);
-    excludeSheets(provider, options, sheets);
     ReadPlan plan;
+    plan.leftOut = excludeSheets(provider, options, sheets);
     for (const SheetEntry& sheet : listSheets(provider)) {
         applyRows(provider, options.settings, sheet.key);
         plan.nameRows[sheet.key] = nameRowOf(provider, options.settings, sheet.key);

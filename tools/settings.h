@@ -1,6 +1,7 @@
 #pragma once
 
 #include <map>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -54,6 +55,7 @@ struct ReadPlan {
     // By column key, where options of columns are given: the 1-based number in the worksheet. An
     // option may give the column another position at the host.
     std::map<int, unsigned> columnNumbers;
+    std::set<std::string> leftOut;   // titles of worksheets
     std::vector<std::string> notes;  // options that do nothing
 };
 

@@ -18,8 +18,8 @@ constexpr size_t kFirstRows = 10;
 std::string layoutText(const LoadedWorksheet& worksheet) {
     const Layout& layout = worksheet.layout;
     std::string text = counted(worksheet.columns.size(), "column");
-    if (worksheet.excludedColumns > 0) {
-        text += " (" + std::to_string(worksheet.excludedColumns) + " more left out)";
+    if (!worksheet.leftOut.empty()) {
+        text += " (" + std::to_string(worksheet.leftOut.size()) + " more left out)";
     }
     text += ", " + counted(layout.rows, "row") + " of data; ";
     text += layout.nameRow == 0 ? "no variable names"

@@ -72,7 +72,7 @@ void Workbook::refuse(const UnknownWorksheet& unknown) {
 std::vector<SheetEntry> Workbook::worksheets() { return listSheets(*provider_); }
 
 LoadedWorksheet Workbook::load(const SheetEntry& sheet) {
-    LoadedWorksheet worksheet{findWorksheet(sheet.key), sheet.key, sheet.title, {}, {}, 0};
+    LoadedWorksheet worksheet{findWorksheet(sheet.key), sheet.key, sheet.title, {}, {}, {}};
     loadColumns(worksheet);
     worksheet.layout = layoutOf(worksheet);
     return worksheet;
@@ -91,31 +91,34 @@ void Workbook::loadColumns(LoadedWorksheet& worksheet) {
         stopIfInterrupted();
         progress_.column(worksheet.title, i + 1, keys.size());
         IColumn* column = nullptr;
-        if (finder.FindColumn(keys[i], &column, false)) {
-            worksheet.columns.emplace_back(column, missing(), options_.settings.preview);
-            losses_.note(*provider_, worksheet.title + "!" + columnLetters(numberOf(*column)),
-                         worksheet.columns.back());
-        } else {
-            ++worksheet.excludedColumns;
+        if (!finder.FindColumn(keys[i], &column, false)) {
+            worksheet.leftOut.insert(numberOf(keys[i], nullptr));
+            continue;
         }
+        worksheet.columns.emplace_back(column, missing(), options_.settings.preview);
+        worksheet.numbers.push_back(numberOf(keys[i], column));
+        losses_.note(*provider_,
+                     columnReference(worksheet.title, worksheet.key, worksheet.numbers.back()),
+                     worksheet.columns.back());
     }
     if (!options_.settings.positions.empty()) notePositions(worksheet);
     progress_.erase();
 }
 
 // The column's 1-based number in the worksheet, whatever position an option gave it at the host.
-unsigned Workbook::numberOf(const IColumn& column) const {
-    const auto found = plan_.columnNumbers.find(column.GetPrimeKey());
-    return found == plan_.columnNumbers.end() ? static_cast<unsigned>(column.GetPosition())
-                                              : found->second;
+// Without an option no column is left out, and the host's position is the number.
+unsigned Workbook::numberOf(int key, const IColumn* column) const {
+    const auto found = plan_.columnNumbers.find(key);
+    if (found != plan_.columnNumbers.end()) return found->second;
+    return column == nullptr ? 0 : static_cast<unsigned>(column->GetPosition());
 }
 
 // The library takes positions as they come.
 void Workbook::notePositions(const LoadedWorksheet& worksheet) {
     std::map<unsigned, std::string> taken;  // columns, by position
-    for (const Column& column : worksheet.columns) {
-        const auto position = static_cast<unsigned>(column.host().GetPosition());
-        const std::string letters = columnLetters(numberOf(column.host()));
+    for (size_t i = 0; i < worksheet.columns.size(); ++i) {
+        const auto position = static_cast<unsigned>(worksheet.columns[i].host().GetPosition());
+        const std::string letters = columnLetters(worksheet.numbers[i]);
         const auto [other, isNew] = taken.emplace(position, letters);
         if (isNew) continue;
         plan_.notes.push_back("columns " + other->second + " and " + letters + " of \"" +

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <set>
 #include <string>
 #include <vector>
 
@@ -28,8 +29,9 @@ struct LoadedWorksheet {
     int key;
     std::string title;
     Layout layout;
-    std::vector<Column> columns;  // those that are not excluded
-    size_t excludedColumns;
+    std::vector<Column> columns;      // those that are not excluded
+    std::vector<unsigned> numbers;    // their 1-based numbers in the worksheet
+    std::set<unsigned> leftOut = {};  // the numbers of the others
 };
 
 // A workbook in a provider, closed at the end so that nothing stays on disk. Its operations throw
@@ -52,6 +54,8 @@ class Workbook {
 
     // What was lost of the columns loaded so far.
     const Losses& losses() const { return losses_; }
+    // The titles of the worksheets that options leave out.
+    const std::set<std::string>& leftOut() const { return plan_.leftOut; }
     // What the user would not notice in the output, one line each: options that do nothing, and
     // what was lost.
     std::vector<std::string> notes() const;
@@ -65,7 +69,7 @@ class Workbook {
     [[noreturn]] void refuse(const UnknownWorksheet& unknown);
     Counted<IWorksheet> findWorksheet(int key);
     void loadColumns(LoadedWorksheet& worksheet);
-    unsigned numberOf(const IColumn& column) const;
+    unsigned numberOf(int key, const IColumn* column) const;
     void notePositions(const LoadedWorksheet& worksheet);
     Layout layoutOf(const LoadedWorksheet& worksheet) const;
 
