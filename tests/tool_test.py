@@ -84,6 +84,15 @@ def with_format(code):
     return changed(STYLES, "m/d/yyyy", html.escape(code))
 
 
+SHEET_OF = f'<worksheet xmlns="{SPREADSHEET}"><sheetData>{{}}</sheetData></worksheet>'
+
+
+def rows(*cells):
+    """The small workbook with a name and these cells, one in a row."""
+    return {**PARTS, SHEET: SHEET_OF.format('<row r="1"><c r="A1" t="s"><v>0</v></c></row>' + "".join(
+        f'<row r="{r}">{cell}</row>' for r, cell in enumerate(cells, start=2)))}
+
+
 def compound(stream):
     """As much of a compound file as its stream's name needs."""
     name = (stream + "\0").encode("utf-16-le")
@@ -94,7 +103,7 @@ def compound(stream):
 # The traits of a book, the book, what the line about it says, and how a plain import ends.
 TRAITS = [
     ("", PARTS, "nothing to explain", 0),
-    ("namespace-prefix", prefixed(WORKBOOK), "elements of xl/workbook.xml have.*<x:sheets>", 13),
+    ("namespace-prefix", prefixed(WORKBOOK), r"elements have a.* <x:sheets> \(in xl/workbook.xml\)", 13),
     ("namespace-prefix", prefixed(LINKS), "<x:Relationships>.*the import fails", 13),
     ("namespace-prefix", changed(WORKBOOK, "r:", "q:") | {
         WORKBOOK: PARTS[WORKBOOK].replace("xmlns:r", "xmlns:q").replace("r:id", "q:id")},
@@ -106,14 +115,27 @@ TRAITS = [
      r"missing \(3 cells\)", 0),
     ("shared-strings-missing", {**PARTS, STRINGS: None}, r"3 cells \(first: My Data!A1\)", 0),
     ("shared-strings-missing", changed(SHEET, "<v>1</v>", "<v>2</v>"), r"1 cell \(My Data!A2\)", 0),
-    ("cdata-texts", changed(STRINGS, "Oslo", "<![CDATA[Oslo]]>"), "1 shared text in CDATA", 0),
+    ("cdata-texts", changed(STRINGS, "Oslo", "<![CDATA[Oslo]]>"), r"1 cell \(My Data!A2\) with .* CDATA", 0),
     ("lost-on-conversion", changed(SHEET, "</sheetData>", '<row r="3"><c r="B3" t="s"><v>1</v></c>'
      '</row></sheetData>'), r"1 in My Data!B \(Name\): a missing .* --type 'My Data!B=text'", 0),
     ("long-texts", changed(STRINGS, "Oslo", "é" * 41), "1 text longer than 80 bytes: 1 in My Data!A"
      r" \(Name\).*--max-text 82", 0),
     ("long-texts", changed(STRINGS, "Name", "n" * 79 + " long"), "2 texts .*1 in My Data!B .* 84", 0),
+    ("shown-in-texts", rows('<c r="A2" t="s"><v>1</v></c>', '<c r="A3" s="1"><v>45296.5</v></c>',
+                            '<c r="A4"><v>0.1234567891234</v></c>', '<c r="A5"><v>7</v></c>'),
+     r"1 number or date in columns of texts: 1 in My Data!A \(Name\)", 0),
+    ("formulas-without-values", rows('<c r="A2"><f>1+1</f></c>', '<c r="A3"><f>B2</f><v>5</v></c>',
+                                     '<c r="A4" t="str"><f>B2</f><v></v></c>'),
+     r"1 formula \(My Data!A2\)", 0),
+    ("numbers-as-names", {**PARTS, SHEET: SHEET_OF.format(
+        '<row r="1"><c r="A1"><v>1</v></c></row><row r="2"><c r="A2"><v>2</v></c></row>')},
+     r"1 number \(My Data!A1\).*--names none", 0),
+    ("mixed-dates", rows('<c r="A2" s="1"><v>45296</v></c>', '<c r="A3" t="b"><v>1</v></c>',
+                         '<c r="A4"><v>7.5</v></c>'), "one column: 2 in My Data!A: ", 0),
+    ("mixed-dates", rows('<c r="A2"><v>7</v></c>', '<c r="A3" s="1"><v>45296</v></c>'),
+     "1 in My Data!A: the first value", 0),
     ("iso-dates", changed(SHEET, CELL, '<c r="B2" t = \'d\'><v>2024-01-05</v></c>'),
-     r"1 date \(My Data!B2\).*number of the year", 0),
+     r"1 date \(My Data!B2\).*of a date the year", 0),
     ("date-system-1904", changed(WORKBOOK, "<workbookPr", '<workbookPr date1904="true"'),
      "1,462 days early; add 1462", 0),
     ("password-protected", compound("EncryptedPackage"), "protected with a password", 22),
@@ -153,7 +175,7 @@ TRAITS = [
      '<mergeCell ref="A1:B1"/><mergeCell ref="A2:B2"/></mergeCells>'),
      r"2 merged ranges \(first: My Data!A1:B1\)", 0),
     ("phonetic-texts", changed(STRINGS, "Oslo</t>", "Oslo</t><rPh><t>o</t></rPh>"
-     "<rPh><t>s</t></rPh>"), "1 shared text with.*follow", 0),
+     "<rPh><t>s</t></rPh>"), r"1 cell \(My Data!A2\) with .*follow", 0),
     ("phonetic-texts", changed(SHEET, CELL, '<c r="B2" t="inlineStr"><is><t>a</t><rPh><t>b</t>'
      '</rPh></is></c>'), "1 inline text .*replace", 0),
     ("error-cells", changed(SHEET, CELL, '<c r="B2" t="e"><v>#N/A</v></c>'), "1 cell ", 0),
@@ -543,6 +565,53 @@ class ToolTest(unittest.TestCase):
                 lost = [note for note in self.notes if "; to keep" in note]
                 self.assertEqual(len(lost), key in ("lost-on-conversion", "long-texts"))
 
+    def test_what_no_cell_bears_out_is_not_told(self):
+        dated, lost = '<c r="A2"><v>1</v></c>', '<c r="A3" s="1"><v>45000</v></c>'
+        cases = [
+            ("a text of the longest length", changed(STRINGS, "Oslo", "o" * 80), []),
+            ("a name with spaces behind", changed(STRINGS, "Name", "n" * 78 + "    "), []),
+            ("no dates", {**rows(dated), WORKBOOK: PARTS[WORKBOOK].replace(
+                "<workbookPr", '<workbookPr date1904="1"')}, []),
+            ("texts that nobody uses", {**PARTS, SHEET: SHEET_OF.format(
+                '<row r="1"><c r="A1" t="str"><v>n</v></c></row>'), STRINGS: changed(
+                    STRINGS, ' uniqueCount="2"', "")[STRINGS].replace("Oslo", "<![CDATA[x]]>")}, []),
+            ("a merged range without values", {**PARTS, SHEET: SHEET_OF.format("").replace(
+                "</worksheet>", '<mergeCells><mergeCell ref="A1:B2"/></mergeCells></worksheet>')}, []),
+            ("a merged range of one cell", changed(SHEET, "</worksheet>", '<mergeCells><mergeCell '
+             'ref="A1"/></mergeCells></worksheet>'), []),
+            ("a hidden sheet without values", {**PARTS, SHEET: SHEET_OF.format(
+                '<row r="1"><c r="A1"><v></v></c></row>'), WORKBOOK: PARTS[WORKBOOK].replace(
+                    "<sheet ", '<sheet state="hidden" ')}, []),
+            ("a colour in a column of numbers", {**rows(dated, lost), STYLES: with_format(
+                "[Red]0.00")[STYLES]}, []),
+            ("a date of the default style among numbers", {**rows(dated, lost), STYLES: with_format(
+                "dd.mm.yyyy")[STYLES]}, ["mixed-dates"]),
+            ("a column that is left out", rows(dated, lost), ["--exclude", "A"]),
+            ("a worksheet that is left out", rows(dated, lost), ["--exclude-sheet", "1"]),
+            ("a kind that the user chose", rows(dated, lost), ["--type", "A=datetime"])]
+        for name, content, more in cases:
+            with self.subTest(name):
+                book = self.book(content)
+                wanted = more if more[:1] == ["mixed-dates"] else []
+                arguments = [] if wanted else more
+                explained = json.loads(self.run_tool(book, "--explain", "--json", *arguments))
+                self.assertEqual([t["trait"] for t in explained["traits"]], wanted)
+                self.run_tool(book, *arguments)
+                self.assertEqual([n for n in self.notes if "if there are any" not in n], [])
+
+    def test_the_advice_about_every_column_helps(self):
+        cells = ('<row r="2"><c r="A2" s="1"><v>45296</v></c><c r="B2" s="1"><v>45297</v></c></row>'
+                 '<row r="3"><c r="A3" s="1"><v>45000</v></c></row>')
+        title = 'name="a=b"'
+        for code, type_ in (("DD/MM/YYYY", "datetime"), ("[Red]0", "numeric")):
+            with self.subTest(code):
+                book = self.book({**PARTS, SHEET: SHEET_OF.format(cells), STYLES: with_format(
+                    code)[STYLES], WORKBOOK: PARTS[WORKBOOK].replace('name="My Data"', title)})
+                line = self.run_tool(book, "--explain")
+                advice = re.findall("--type .*", line)[0]
+                self.assertEqual(advice, f"--type '1!A={type_}' --type '1!B={type_}'")
+                self.assertIn("nothing to", self.run_tool(book, "--explain", *shlex.split(advice)))
+
     def test_traits_come_in_order_and_each_says_where(self):
         book = self.book(renamed(WORKBOOK, "x.xml") | {WORKBOOK: PARTS[WORKBOOK].replace(
             "<workbookPr", '<workbookPr date1904="1"'), STRINGS: changed(
@@ -554,14 +623,14 @@ class ToolTest(unittest.TestCase):
                           "The book counts its dates from 1904",
                           "1 cell (My Data) with an error such as #DIV/0!"])
         self.run_tool(book)
-        self.assertIn("texts are missing; dates arrive 1,462 days early", self.notes[0])
+        self.assertIn("texts are missing; dates, if there are any, arrive 1,462 days early", self.notes[0])
         self.run_tool(self.folder / "none.xlsx", "--explain", expected=17)
         self.assertIn("does not end in .xlsx",
                       self.run_tool(book.rename(self.folder / "a.xlsm"), "--explain"))
 
     def test_cells_lost_on_conversion_are_counted(self):
         lost = r": 1 cell became missing on conversion: 1 in Measurements!L \(Count\); to keep " \
-               "the content: --type 'Measurements!L=text'$"
+               "the content as displayed: --type 'Measurements!L=text'$"
         cases = [([], lost), (["--sheet", "1", "--position", "L=30"], lost),
                  (["--type", "L=text"], ""), (["--missing-word", "n/a=-1"], ""),
                  (["--missing-word", "n/a=missing"], ""), (["--missing-number", "5=missing"], lost),

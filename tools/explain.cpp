@@ -22,19 +22,44 @@ constexpr const char* kNothing = "nothing to explain";
 struct Attempt {
     std::optional<Failure> failure;  // none when the import goes well
     Lost lost;
+    Imported imported;
 };
+
+ImportedSheet described(const LoadedWorksheet& worksheet, const ReadSettings& settings) {
+    ImportedSheet sheet{worksheet.key,
+                        worksheet.layout.nameRow,
+                        worksheet.layout.firstDataRow,
+                        {},
+                        worksheet.leftOut,
+                        {}};
+    for (size_t i = 0; i < worksheet.columns.size(); ++i) {
+        sheet.columns.emplace(worksheet.numbers[i], worksheet.columns[i].kind());
+    }
+    for (const auto& [where, type] : settings.types) {
+        const std::string& name = where.worksheet;
+        const bool here =
+            name.empty() || name == worksheet.title || name == std::to_string(worksheet.key);
+        if (here) sheet.chosen.insert(where.column);
+    }
+    return sheet;
+}
 
 Attempt tryImport(const Library& library, const Options& options) {
     Attempt attempt;
     try {
         Workbook workbook(library, options);
         workbook.open();
-        for (const SheetEntry& sheet : workbook.worksheets()) workbook.load(sheet);
+        attempt.imported.leftOut = workbook.leftOut();
+        for (const SheetEntry& sheet : workbook.worksheets()) {
+            const LoadedWorksheet worksheet = workbook.load(sheet);
+            workbook.noteShown(worksheet);
+            attempt.imported.sheets.emplace(sheet.title, described(worksheet, options.settings));
+        }
         attempt.lost = workbook.losses().lost();
     } catch (const Interrupted&) {
         throw;
     } catch (...) {
-        attempt.failure = currentFailure(options.book);
+        attempt = {currentFailure(options.book), {}, {}};
     }
     return attempt;
 }
@@ -46,13 +71,14 @@ bool isOfTheSystem(const Failure& failure) {
            code == kLibraryFailure || code == kUsage;
 }
 
-std::vector<Trait> allTraits(const Library& library, const Options& options) {
+std::vector<Trait> allTraits(const Library& library, Options options) {
+    options.settings.cleanSheetNames = false;  // the book has the names as they are
     const Attempt attempt = tryImport(library, options);
     const std::optional<Failure>& failure = attempt.failure;
     if (failure && isOfTheSystem(*failure)) throw *failure;
     // A package that the library does not unpack is not read any further either.
     const bool unpacked = !failure || failure->code() != kReadFailure;
-    Findings findings = unpacked ? inspect(options.book) : Findings();
+    Findings findings = unpacked ? inspect(options.book, attempt.imported) : Findings();
     findings.lost = attempt.lost;
     findings.textLimit = options.settings.maxText.value_or(kDefaultLongestText);
     std::vector<Trait> traits =
@@ -64,9 +90,10 @@ std::vector<Trait> allTraits(const Library& library, const Options& options) {
 }
 
 // Nothing when the look fails: the import's own outcome stands.
-Findings quickFindings(const std::string& book, const std::string& folder) {
+Findings quickFindings(const std::string& book, const std::string& folder,
+                       const std::set<std::string>& leftOut) {
     try {
-        return inspectQuickly(book, folder);
+        return inspectQuickly(book, folder, leftOut);
     } catch (const std::exception&) {
         return {};
     }
@@ -100,9 +127,10 @@ void explain(const Library& library, const Options& options, Output& output) {
     if (traits.empty()) output.write(printable(options.book) + ": " + kNothing + "\n");
 }
 
-std::string importNote(const std::string& book, const std::string& folder) {
+std::string importNote(const std::string& book, const std::string& folder,
+                       const std::set<std::string>& leftOut) {
     std::string text;
-    for (const Trait& trait : quickTraitsOf(quickFindings(book, folder))) {
+    for (const Trait& trait : quickTraitsOf(quickFindings(book, folder, leftOut))) {
         if (trait.note.empty()) continue;
         text += (text.empty() ? "" : "; ") + trait.note;
     }
@@ -112,7 +140,7 @@ std::string importNote(const std::string& book, const std::string& folder) {
 Failure explained(const Failure& failure, const std::string& book) {
     const int code = failure.code();
     if (code != kMalformedWorkbook && code != kNoPackage && code != kNoWorkbook) return failure;
-    for (const Trait& trait : traitsOf(quickFindings(book, ""), {})) {
+    for (const Trait& trait : traitsOf(quickFindings(book, "", {}), {})) {
         if (!trait.fatal) continue;
         return {failure.code(),
                 book + ": " + trait.found + "; " + trait.advice + "; see dpxlsx --explain"};

@@ -1,11 +1,13 @@
 #pragma once
 
+#include <compare>
 #include <cstddef>
 #include <map>
 #include <optional>
 #include <string>
 #include <vector>
 
+#include "tools/column.h"
 #include "tools/file_kind.h"
 #include "tools/tally.h"
 
@@ -30,8 +32,24 @@ struct MovedPart {
 // A number format of cells with numbers.
 struct UsedFormat {
     std::string code;  // "built-in 30" for one that has none
+    bool isDate;       // by the rules of spreadsheet programs
+};
+
+// The cells of one style in one column.
+struct StyledColumn {
+    size_t worksheet;  // its place in the book
+    unsigned column;   // 1-based, 0 when the cells name none
+    int style;         // kBoolean for Booleans, which have no number format to go by
+
+    static constexpr int kBoolean = -1;
+    auto operator<=>(const StyledColumn&) const = default;
+};
+
+struct StyledCells {
     Places cells;
-    bool isDate;  // by the rules of spreadsheet programs
+    std::string reference;     // the column as an option takes it; empty when it is not known
+    std::optional<Kind> kind;  // what an import made of the column, when it did
+    bool isChosen = false;     // the kind is an option's
 };
 
 // Names of which the first few are kept.
@@ -66,18 +84,21 @@ struct Findings {
     bool stringsWithoutCount = false;
     size_t sharedTexts = 0;  // cells
     Places missingTexts;     // cells whose text the table does not have
-    size_t cdataTexts = 0;   // shared texts
+    Places cdataTexts;       // cells with shared texts in CDATA sections
     Places isoDates;
     bool datesFrom1904 = false;
     bool hasStyles = true;
     std::vector<MovedPart> moved;
 
     std::map<int, UsedFormat> formats;  // by index of the cell style
+    std::map<StyledColumn, StyledCells> styledCells;
+    Places formulas;        // without a saved value
+    Places numbersAsNames;  // in rows of names that hold no text
     Places mergedRanges;
-    size_t phoneticTexts = 0;  // shared texts
-    Places phoneticCells;      // inline texts
+    Places phoneticTexts;  // cells with shared texts
+    Places phoneticCells;  // inline texts
     Places errors;
-    Names hiddenWorksheets;           // those with cells
+    Names hiddenWorksheets;           // those that are imported
     Places runs;                      // inline texts of several runs
     Places inlineValues;              // inline texts of cells that have a value too
     std::vector<std::string> broken;  // parts that are missing or break off

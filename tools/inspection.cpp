@@ -53,27 +53,36 @@ class Inspector {
         if (findings_.kind == FileKind::Workbook) findWorkbook();
     }
 
-    Findings full() {
+    Findings full(const Imported& imported) {
         if (findings_.kind != FileKind::Workbook) return findings_;
         const std::string styles = located(kStyles, "styles");
         if (!styles.empty()) formats_.read(package_, styles, findings_);
         readStrings();
         for (const WorksheetPart& worksheet : worksheets_) {
-            inspectWorksheet(package_, worksheet, {&formats_, textCount()}, findings_);
+            if (imported.leftOut.count(worksheet.name) != 0) continue;
+            const auto sheet = imported.sheets.find(worksheet.name);
+            const ImportedSheet* found = sheet == imported.sheets.end() ? nullptr : &sheet->second;
+            inspectWorksheet(package_, worksheet, {&formats_, texts_, found}, findings_);
         }
+        dropTheUnused();
         return findings_;
     }
 
-    Findings quick(const std::string& folder) {
+    Findings quick(const std::string& folder, const std::set<std::string>& leftOut) {
         if (findings_.kind != FileKind::Workbook) return findings_;
         noteRootPrefix(located(kStyles, "styles"), findings_.stylesPrefixed);
         const std::string strings = located(kStrings, "sharedStrings");
         readStringsHead(strings);
         if (folder.empty()) return findings_;
+        const bool hasTexts = !strings.empty() && !findings_.stringsWithoutCount;
         for (const WorksheetPart& worksheet : worksheets_) {
-            inspectWorksheetQuickly(package_, worksheet, folder + "/" + worksheet.part,
-                                    !strings.empty(), findings_);
+            if (leftOut.count(worksheet.name) != 0) continue;
+            inspectWorksheetQuickly(package_, worksheet, folder + "/" + worksheet.part, hasTexts,
+                                    findings_);
         }
+        const bool wanted = findings_.missingTexts.count > 0;
+        if (findings_.stringsWithoutCount) findings_.missingTexts = {};
+        findings_.stringsWithoutCount = findings_.stringsWithoutCount && wanted;
         return findings_;
     }
 
@@ -167,7 +176,8 @@ class Inspector {
         const std::string part = partOf(found->second);
         if (part.empty()) return findings_.broken.push_back(found->second);
         const std::string state = reader.attribute("state").value_or("visible");
-        worksheets_.push_back({reader.attribute("name").value_or(""), part, state != "visible"});
+        worksheets_.push_back(
+            {reader.attribute("name").value_or(""), part, state != "visible", worksheets_.size()});
     }
 
     std::string partOf(const std::string& wanted) {
@@ -196,40 +206,46 @@ class Inspector {
         if (reader.isPrefixed()) notePrefix(part, reader.writtenName(), findings_.stringsPrefixed);
     }
 
-    // Counts the texts, those with a phonetic one beside them, and those in CDATA sections.
+    // Notes which texts have a phonetic one beside them, and which CDATA sections.
     void readStrings() {
         const std::string part = located(kStrings, "sharedStrings");
         if (part.empty()) return;
         PartReader reader(package_, part);
-        bool phonetic = false;
-        bool cdata = false;
         while (reader.next()) {
+            const bool inText = !texts_.phonetic.empty();
             if (reader.isText()) {
-                findings_.cdataTexts += reader.isCData() && !cdata;
-                cdata = cdata || reader.isCData();
+                if (reader.isCData() && inText) texts_.cdata.back() = true;
                 continue;
             }
-            const std::string_view name = reader.element();
             takeTable(reader, part);
-            if (name == "si") {
-                ++texts_;
-                phonetic = cdata = false;
+            if (reader.element() == "si") {
+                texts_.phonetic.push_back(false);
+                texts_.cdata.push_back(false);
             }
-            if (name == "rPh" && !phonetic) {
-                phonetic = true;
-                ++findings_.phoneticTexts;
-            }
+            if (reader.element() == "rPh" && inText) texts_.phonetic.back() = true;
         }
+        texts_.count = tellsOfTexts() ? SIZE_MAX : texts_.phonetic.size();
         if (reader.isBroken()) findings_.broken.push_back(part);
     }
 
-    // How many texts a cell can take: all when another trait says what becomes of the table.
-    size_t textCount() const {
+    // Whether another trait says that all shared texts are missing.
+    bool tellsOfTexts() const {
         const auto isTable = [](const MovedPart& part) { return part.wanted == kStrings; };
         const auto& moved = findings_.moved;
-        const bool told = findings_.stringsWithoutCount || findings_.stringsPrefixed ||
-                          std::any_of(moved.begin(), moved.end(), isTable);
-        return told ? SIZE_MAX : texts_;
+        return findings_.stringsWithoutCount || findings_.stringsPrefixed ||
+               std::any_of(moved.begin(), moved.end(), isTable);
+    }
+
+    // Traits of the book that no cell bears out. Cells of a worksheet with a prefix are not known.
+    void dropTheUnused() {
+        if (findings_.prefixedWorksheets.count > 0 || !findings_.broken.empty()) return;
+        if (findings_.sharedTexts == 0) findings_.stringsWithoutCount = false;
+        const auto isDated = [this](const auto& cells) {
+            const auto format = findings_.formats.find(cells.first.style);
+            return format != findings_.formats.end() && format->second.isDate;
+        };
+        const auto& cells = findings_.styledCells;
+        if (std::none_of(cells.begin(), cells.end(), isDated)) findings_.datesFrom1904 = false;
     }
 
     Package package_;
@@ -239,15 +255,18 @@ class Inspector {
     std::vector<WorksheetPart> worksheets_;
     NumberFormats formats_;
     bool counted_ = true;  // the table of shared texts
-    size_t texts_ = 0;     // in it
+    SharedTexts texts_;
 };
 
 }  // namespace
 
-Findings inspect(const std::string& book) { return Inspector(book).full(); }
+Findings inspect(const std::string& book, const Imported& imported) {
+    return Inspector(book).full(imported);
+}
 
-Findings inspectQuickly(const std::string& book, const std::string& folder) {
-    return Inspector(book).quick(folder);
+Findings inspectQuickly(const std::string& book, const std::string& folder,
+                        const std::set<std::string>& leftOut) {
+    return Inspector(book).quick(folder, leftOut);
 }
 
 }  // namespace dp::tool

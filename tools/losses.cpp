@@ -1,6 +1,8 @@
 #include "tools/losses.h"
 
 #include <algorithm>
+#include <charconv>
+#include <cmath>
 #include <optional>
 
 #include "model/host/i_finders.h"
@@ -50,6 +52,32 @@ size_t lostBesideNumbers(IDataProvider& provider, const Column& column, const Op
     if (found == nullptr) return 0;
     const Column unmarked(found, kDefaultMissing, settings.preview);
     return static_cast<size_t>(unmarked.convertedMissing());
+}
+
+// The number that a displayed text means; none for a date or another text.
+std::optional<double> readBack(std::string text, char decimal) {
+    std::replace(text.begin(), text.end(), decimal, '.');
+    const bool negative = text.size() > 2 && text.front() == '(' && text.back() == ')';
+    if (negative) text = "-" + text.substr(1, text.size() - 2);
+    const bool percent = !text.empty() && text.back() == '%';
+    if (percent) text.pop_back();
+    const size_t sign = !text.empty() && text.front() == '+' ? 1 : 0;
+    double number = 0;
+    const char* const end = text.data() + text.size();
+    const auto [stop, error] = std::from_chars(text.data() + sign, end, number);
+    if (error != std::errc() || stop != end) return std::nullopt;
+    return percent ? number / 100 : number;
+}
+
+bool isSame(double shown, double number) {
+    constexpr double kDigits = 1e-9;
+    return std::abs(shown - number) <= kDigits * std::abs(number);
+}
+
+std::string trimmed(const std::string& text) {
+    const size_t first = text.find_first_not_of(' ');
+    return first == std::string::npos ? std::string()
+                                      : text.substr(first, text.find_last_not_of(' ') - first + 1);
 }
 
 // With the limit of texts put off while it is loaded.
@@ -103,13 +131,35 @@ void Losses::noteTexts(IDataProvider& provider, const std::string& place, const 
     if (count > 0) lost_.cutTexts.add({place, column.name(), count});
 }
 
+void Losses::noteShown(IDataProvider& provider, const std::string& place, const Column& column) {
+    if (column.kind() != Kind::Text) return;
+    IColumn* found = nullptr;
+    auto type = IVariableFormat::FormatType::Text;
+    provider.GetVariableFinder()->FindColumn(column.host().GetPrimeKey(), &found,
+                                             IVariable::StorageType::Numeric, &type, true);
+    if (found == nullptr) return;
+    const Column numbers(found, kDefaultMissing, options_.settings.preview);
+    if (numbers.kind() == Kind::Text) return;  // the user wants texts
+    const char decimal = options_.settings.decimal.value_or('.');
+    const double missing = options_.settings.missing.value_or(kDefaultMissing);
+    size_t count = 0;
+    for (size_t row = 0; row < std::min(column.rows(), numbers.rows()); ++row) {
+        if (column.isMissing(row) || numbers.isMissing(row) || numbers.number(row) == missing) {
+            continue;
+        }
+        const auto shown = readBack(trimmed(column.text(row)), decimal);
+        if (!shown || !isSame(*shown, numbers.number(row))) ++count;
+    }
+    if (count > 0) lost_.shown.add({place, column.name(), count});
+}
+
 std::string Losses::cellsNote() const {
     const Tally& cells = lost_.cells;
     if (cells.empty()) return {};
     const bool all = cells.columns() <= kColumnsInNotes;
     return options_.book + ": " + counted(cells.total(), "cell") +
            " became missing on conversion: " + cells.text(kColumnsInNotes) +
-           "; to keep the content: " + cells.textTypes(kColumnsInNotes) +
+           "; to keep the content as displayed: " + cells.textTypes(kColumnsInNotes) +
            (all ? "" : "; --explain names all columns");
 }
 

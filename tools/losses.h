@@ -21,6 +21,10 @@ class Losses {
     // `place` is the worksheet and the column's letters, such as "Data!B".
     void note(IDataProvider& provider, const std::string& place, const Column& column);
 
+    // Counts numbers and dates that a loaded column of texts has as displayed, where that leaves
+    // some of them out. The column is loaded once more.
+    void noteShown(IDataProvider& provider, const std::string& place, const Column& column);
+
     const Lost& lost() const { return lost_; }
     // One line about the cells: how many, where, and which options keep them; empty when there are
     // none. Another one about the texts.

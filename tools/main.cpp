@@ -43,7 +43,7 @@ void show(Workbook& workbook, const Options& options) {
 
 // What the user would not notice in the output.
 void printNotes(const Workbook& workbook, const Options& options) {
-    const std::string note = importNote(options.book, workbook.folder());
+    const std::string note = importNote(options.book, workbook.folder(), workbook.leftOut());
     if (!note.empty()) printLine(note);
     for (const std::string& more : workbook.notes()) printLine(more);
 }

@@ -36,10 +36,10 @@ constexpr std::pair<int, const char*> kBuiltInDates[] = {
 
 UsedFormat builtIn(int id) {
     for (const auto& [date, code] : kBuiltInDates) {
-        if (id == date) return {code, {}, true};
+        if (id == date) return {code, true};
     }
     const bool eastAsian = (id >= 27 && id <= 36) || (id >= 50 && id <= 58);
-    return {"built-in " + std::to_string(id), {}, eastAsian};
+    return {"built-in " + std::to_string(id), eastAsian};
 }
 
 int number(const std::optional<std::string>& text) {
@@ -76,7 +76,7 @@ void NumberFormats::read(Package& package, const std::string& name, Findings& fi
 UsedFormat NumberFormats::of(int style) const {
     const int id = formatIds_[static_cast<size_t>(style)];
     const auto code = codes_.find(id);
-    if (code != codes_.end()) return {code->second, {}, isDateCode(code->second)};
+    if (code != codes_.end()) return {code->second, isDateCode(code->second)};
     return builtIn(id);
 }
 

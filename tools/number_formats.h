@@ -17,7 +17,7 @@ class NumberFormats {
 
     // How many cell styles there are.
     size_t size() const { return formatIds_.size(); }
-    // The format of a cell style, 0-based and below size(), used by no cell yet.
+    // The format of a cell style, 0-based and below size().
     UsedFormat of(int style) const;
 
   private:

@@ -8,7 +8,11 @@ namespace dp::tool {
 
 void Tally::add(Entry entry) {
     total_ += entry.count;
-    entries_.push_back(std::move(entry));
+    if (!entries_.empty() && entries_.back().place == entry.place) {
+        entries_.back().count += entry.count;
+    } else {
+        entries_.push_back(std::move(entry));
+    }
 }
 
 std::string Tally::text(size_t most) const {

@@ -15,6 +15,7 @@ class Tally {
         size_t count;
     };
 
+    // One column after the other.
     void add(Entry entry);
     bool empty() const { return entries_.empty(); }
     size_t total() const { return total_; }
@@ -36,6 +37,7 @@ struct Lost {
     Tally cells;         // had content that did not fit the kind of their column: missing values
     Tally cutTexts;      // texts and names of columns beyond the limit of --max-text
     size_t longest = 0;  // of those, in bytes
+    Tally shown;         // numbers and dates in columns of texts, of which the display shows less
 };
 
 }  // namespace dp::tool

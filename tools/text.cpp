@@ -101,7 +101,11 @@ std::string padded(const std::string& text, int width, bool toTheRight) {
 }
 
 std::string counted(size_t count, const std::string& unit) {
-    return std::to_string(count) + " " + unit + (count == 1 ? "" : "s");
+    return counted(count, unit, unit + "s");
+}
+
+std::string counted(size_t count, const std::string& one, const std::string& more) {
+    return std::to_string(count) + " " + (count == 1 ? one : more);
 }
 
 }  // namespace dp::tool

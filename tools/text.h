@@ -24,6 +24,7 @@ std::string padded(const std::string& text, int width, bool toTheRight);
 
 // "1 cell", "2 cells".
 std::string counted(size_t count, const std::string& unit);
+std::string counted(size_t count, const std::string& one, const std::string& more);
 
 // The text as one word of a shell's command line, quoted when it needs to be.
 std::string shellWord(const std::string& text);

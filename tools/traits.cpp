@@ -40,13 +40,6 @@ std::string placed(const Places& places, const std::string& unit) {
     return counted(places.count, unit) + first + places.first + ")";
 }
 
-// For the column of a place such as "Data!B2"; a cell that names no place has no known column.
-std::string typeOption(const std::string& place, const char* type) {
-    const std::string column = place.substr(0, place.find_last_not_of("0123456789") + 1);
-    const bool known = place.rfind('!') < column.size() && column.size() < place.size();
-    return "--type " + (known ? shellWord(column + "=" + type) : std::string("COLUMN=") + type);
-}
-
 std::string joined(const std::vector<std::string>& texts, const char* between) {
     std::string result;
     for (const std::string& text : texts) result += (result.empty() ? "" : between) + text;
@@ -58,8 +51,8 @@ Found namespacePrefix(const Findings& findings) {
     if (!fatal && findings.prefixedParts.count == 0) return std::nullopt;
     std::vector<std::string> found;
     if (findings.prefixedParts.count > 0) {
-        found.push_back("elements of " + listed(findings.prefixedParts, false) +
-                        " have a namespace prefix, such as <" + findings.prefixedName + ">");
+        found.push_back("elements have a namespace prefix, such as <" + findings.prefixedName +
+                        "> (in " + listed(findings.prefixedParts, false) + ")");
     }
     if (findings.relationshipPrefixed) {
         found.emplace_back("the worksheets' r:id has another prefix in xl/workbook.xml");
@@ -103,8 +96,8 @@ Found isoDates(const Findings& findings) {
     if (findings.isoDates.count == 0) return std::nullopt;
     return Trait{"iso-dates",
                  placed(findings.isoDates, "date") + " written as ISO text",
-                 "only the number of the year arrives",
-                 "save the book as \"Excel Workbook\", not as \"Strict Open XML\"",
+                 "only the number at the beginning arrives, of a date the year",
+                 "save the book as an ordinary .xlsx, not in the strict variant of the format",
                  false,
                  "of dates written as ISO text only the number of the year arrives"};
 }
@@ -114,10 +107,9 @@ Found datesFrom1904(const Findings& findings) {
     return Trait{"date-system-1904",
                  "the book counts its dates from 1904",
                  "dates arrive 1,462 days early",
-                 "add 1462 to them after the import, or turn the option \"1904 date system\" off "
-                 "and check the dates",
+                 "add 1462 to them after the import",
                  false,
-                 "dates arrive 1,462 days early"};
+                 "dates, if there are any, arrive 1,462 days early"};
 }
 
 struct OtherFile {
@@ -194,59 +186,128 @@ std::string asDisplayed(std::string code) {
     return code;
 }
 
-// The formats for which `matches(format, answer)` holds, as one trait. Formats of one code are
-// counted together.
-template <class Matches>
-Places collected(const Findings& findings, const std::map<int, StyleAnswer>& answers, Names& codes,
-                 Matches matches) {
+// The cells of some styles in some columns.
+struct Collected {
     Places cells;
+    Names codes;                          // each one once
+    std::vector<std::string> references;  // the columns, each one once
     std::set<std::string> seen;
-    for (const auto& [style, format] : findings.formats) {
-        const auto answer = answers.find(style);
-        if (answer == answers.end() || !matches(format, answer->second)) continue;
-        if (cells.count == 0) cells.first = format.cells.first;
-        cells.count += format.cells.count;
-        if (seen.insert(format.code).second) codes.add(asDisplayed(format.code));
+
+    void add(const StyledCells& of, const std::string& code) {
+        if (cells.count == 0) cells.first = of.cells.first;
+        cells.count += of.cells.count;
+        if (seen.insert(code).second) codes.add(asDisplayed(code));
+        const bool isNew = references.empty() || references.back() != of.reference;
+        if (isNew) references.push_back(of.reference);  // they come column by column
     }
-    return cells;
+
+    std::string types(const char* type) const {
+        std::string text;
+        for (const std::string& reference : references) {
+            const std::string column = reference.empty() ? "COLUMN" : reference;
+            text += (text.empty() ? "--type " : " --type ") + shellWord(column + "=" + type);
+        }
+        return text;
+    }
+};
+
+// Those for which `matches` holds: of the format's being a date, the library's answer, and the kind
+// of the column.
+template <class Matches>
+Collected collected(const Findings& findings, const std::map<int, StyleAnswer>& answers,
+                    Matches matches) {
+    Collected result;
+    for (const auto& [key, cells] : findings.styledCells) {
+        const auto format = findings.formats.find(key.style);
+        const auto answer = answers.find(key.style);
+        if (format == findings.formats.end() || answer == answers.end()) continue;
+        if (matches(format->second.isDate, answer->second, cells.kind)) {
+            result.add(cells, format->second.code);
+        }
+    }
+    return result;
 }
 
+bool mayBe(const std::optional<Kind>& kind, Kind wanted) { return !kind || *kind == wanted; }
+
 Found takenForDates(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    Names codes;
-    const Places cells = collected(findings, answers, codes, [](const auto& format, auto answer) {
-        return answer.isDate && !format.isDate;
+    const Collected found = collected(findings, answers, [](bool isDate, auto answer, auto kind) {
+        return answer.isDate && !isDate && mayBe(kind, Kind::DateTime);
     });
-    if (cells.count == 0) return std::nullopt;
-    return Trait{
-        "taken-for-dates",
-        placed(cells, "number") + " in formats with words or colours: " + listed(codes, true),
-        "date-times arrive", "read the column as numbers: " + typeOption(cells.first, "numeric")};
+    if (found.cells.count == 0) return std::nullopt;
+    return Trait{"taken-for-dates",
+                 placed(found.cells, "number") +
+                     " in formats with words or colours: " + listed(found.codes, true),
+                 "date-times arrive", "read the column as numbers: " + found.types("numeric")};
 }
 
 Found notTakenForDates(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    Names codes;
-    const Places cells = collected(findings, answers, codes, [](const auto& format, auto answer) {
-        return !answer.isDate && format.isDate;
+    const Collected found = collected(findings, answers, [](bool isDate, auto answer, auto kind) {
+        return !answer.isDate && isDate && mayBe(kind, Kind::Number);
     });
-    if (cells.count == 0) return std::nullopt;
-    return Trait{"not-taken-for-dates",
-                 placed(cells, "date") +
-                     " in formats that the import does not know as dates: " + listed(codes, true),
-                 "day numbers arrive",
-                 "read the column as dates: " + typeOption(cells.first, "datetime")};
+    if (found.cells.count == 0) return std::nullopt;
+    return Trait{
+        "not-taken-for-dates",
+        placed(found.cells, "date") +
+            " in formats that the import does not know as dates: " + listed(found.codes, true),
+        "day numbers arrive", "read the column as dates: " + found.types("datetime")};
 }
 
 Found defaultDateStyle(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    Names codes;
-    const Places cells = collected(findings, answers, codes, [](const auto& format, auto answer) {
-        return answer.isDate && format.isDate && !answer.hasPattern;
+    const Collected found = collected(findings, answers, [](bool isDate, auto answer, auto kind) {
+        return answer.isDate && isDate && !answer.hasPattern && mayBe(kind, Kind::DateTime);
     });
-    if (cells.count == 0) return std::nullopt;
+    if (found.cells.count == 0) return std::nullopt;
+    return Trait{"default-date-style",
+                 placed(found.cells, "date") +
+                     " in formats without a counterpart: " + listed(found.codes, true),
+                 "the values are right, the look is that of the default date style",
+                 "for a fixed look, use a format such as m/d/yyyy"};
+}
+
+// The first value decides what all cells of a column are.
+Found mixedDates(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
+    Tally cells;
+    for (const auto& [key, styled] : findings.styledCells) {
+        const auto format = findings.formats.find(key.style);
+        const auto answer = answers.find(key.style);
+        const bool isDate = format != findings.formats.end() && format->second.isDate;
+        const bool taken = answer != answers.end() && answer->second.isDate;
+        const bool mixed = (styled.kind == Kind::Number && isDate && taken) ||
+                           (styled.kind == Kind::DateTime && !isDate && !taken);
+        if (mixed && !styled.isChosen) cells.add({styled.reference, "", styled.cells.count});
+    }
+    if (cells.empty()) return std::nullopt;
     return Trait{
-        "default-date-style",
-        placed(cells, "date") + " in formats without a counterpart: " + listed(codes, true),
-        "the values are right, the look is that of the default date style",
-        "to keep the look, use a format such as m/d/yyyy"};
+        "mixed-dates", "dates and numbers in one column: " + cells.text(cells.columns()),
+        "the first value of the column decides: dates arrive as day numbers, or numbers as dates",
+        "give them columns of their own"};
+}
+
+Found shownInTexts(const Findings& findings) {
+    const Tally& cells = findings.lost.shown;
+    if (cells.empty()) return std::nullopt;
+    return Trait{"shown-in-texts",
+                 counted(cells.total(), "number or date", "numbers or dates") +
+                     " in columns of texts: " + cells.text(cells.columns()),
+                 "they arrive as displayed, without what their formats leave out",
+                 "give them columns of their own, or formats that show all of them"};
+}
+
+Found formulas(const Findings& findings) {
+    if (findings.formulas.count == 0) return std::nullopt;
+    return Trait{"formulas-without-values",
+                 placed(findings.formulas, "formula") + " without a saved value",
+                 "a missing value arrives",
+                 "open the book in a spreadsheet program, let it calculate, and save it"};
+}
+
+Found numbersAsNames(const Findings& findings) {
+    if (findings.numbersAsNames.count == 0) return std::nullopt;
+    return Trait{"numbers-as-names",
+                 placed(findings.numbersAsNames, "number") + " and no text in the row of names",
+                 "they become names, not data",
+                 "if they are data: --names none; if the names are in another row: --name-row ROW"};
 }
 
 Found mergedCells(const Findings& findings) {
@@ -259,8 +320,9 @@ Found mergedCells(const Findings& findings) {
 Found phoneticTexts(const Findings& findings) {
     std::vector<std::string> found;
     std::vector<std::string> effects;
-    if (findings.phoneticTexts > 0) {
-        found.push_back(counted(findings.phoneticTexts, "shared text") + " with phonetic readings");
+    if (findings.phoneticTexts.count > 0) {
+        found.push_back(placed(findings.phoneticTexts, "cell") +
+                        " with phonetic readings in a shared text");
         effects.emplace_back("the readings follow the texts");
     }
     if (findings.phoneticCells.count > 0) {
@@ -275,7 +337,7 @@ Found phoneticTexts(const Findings& findings) {
 Found errorCells(const Findings& findings) {
     if (findings.errors.count == 0) return std::nullopt;
     return Trait{"error-cells", placed(findings.errors, "cell") + " with an error such as #DIV/0!",
-                 "a missing value arrives, and no row behind the last value of a column",
+                 "a missing value arrives, or no row where it is the last of its column",
                  "mend the formula where a value is expected"};
 }
 
@@ -302,8 +364,9 @@ Found inlineValues(const Findings& findings) {
 }
 
 Found cdataTexts(const Findings& findings) {
-    if (findings.cdataTexts == 0) return std::nullopt;
-    return Trait{"cdata-texts", counted(findings.cdataTexts, "shared text") + " in CDATA sections",
+    if (findings.cdataTexts.count == 0) return std::nullopt;
+    return Trait{"cdata-texts",
+                 placed(findings.cdataTexts, "cell") + " with a shared text in CDATA sections",
                  "what stands in them is missing", kSaveAgain};
 }
 
@@ -314,7 +377,7 @@ Found lostCells(const Findings& findings) {
                  counted(cells.total(), "cell") + (cells.total() == 1 ? " does" : " do") +
                      " not fit the kind of the column: " + cells.text(cells.columns()),
                  "a missing value arrives",
-                 "to keep the content: " + cells.textTypes(cells.columns())};
+                 "to keep the content as displayed: " + cells.textTypes(cells.columns())};
 }
 
 Found longTexts(const Findings& findings) {
@@ -339,9 +402,13 @@ std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleA
     add(traits, movedParts(findings));
     add(traits, lostCells(findings));
     add(traits, longTexts(findings));
+    add(traits, shownInTexts(findings));
+    add(traits, formulas(findings));
+    add(traits, numbersAsNames(findings));
     if (!findings.stylesPrefixed) {  // else that explains what becomes of the formats
         add(traits, takenForDates(findings, answers));
         add(traits, notTakenForDates(findings, answers));
+        add(traits, mixedDates(findings, answers));
         add(traits, defaultDateStyle(findings, answers));
     }
     for (const auto trait : {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns,

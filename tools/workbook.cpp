@@ -128,6 +128,15 @@ void Workbook::notePositions(const LoadedWorksheet& worksheet) {
     }
 }
 
+void Workbook::noteShown(const LoadedWorksheet& worksheet) {
+    for (size_t i = 0; i < worksheet.columns.size(); ++i) {
+        stopIfInterrupted();
+        losses_.noteShown(*provider_,
+                          columnReference(worksheet.title, worksheet.key, worksheet.numbers[i]),
+                          worksheet.columns[i]);
+    }
+}
+
 std::vector<std::string> Workbook::notes() const {
     std::vector<std::string> notes;
     for (const std::string& note : plan_.notes) notes.push_back(options_.book + ": " + note);

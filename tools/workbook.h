@@ -52,6 +52,8 @@ class Workbook {
     std::vector<SheetEntry> worksheets();
     LoadedWorksheet load(const SheetEntry& sheet);
 
+    // Counts, in the columns of texts, the numbers and dates that do not arrive in full.
+    void noteShown(const LoadedWorksheet& worksheet);
     // What was lost of the columns loaded so far.
     const Losses& losses() const { return losses_; }
     // The titles of the worksheets that options leave out.

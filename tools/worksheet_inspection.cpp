@@ -6,6 +6,9 @@
 #include <fstream>
 #include <vector>
 
+#include <climits>
+
+#include "tools/column_reference.h"
 #include "tools/part_reader.h"
 
 namespace dp::tool {
@@ -24,7 +27,10 @@ class Pass {
     void run() {
         while (!prefixed_ && reader_.next()) takeNode();  // an import finds no cells there
         endCell();
-        if (hasCells_ && worksheet_.hidden) findings_.hiddenWorksheets.add(worksheet_.name);
+        if (tables_.imported != nullptr && worksheet_.hidden) {
+            findings_.hiddenWorksheets.add(worksheet_.name);
+        }
+        if (!nameIsText_ && numbersAsNames_.count > 0) addNumbersAsNames();
         if (reader_.isBroken()) findings_.broken.push_back(worksheet_.part);
     }
 
@@ -52,32 +58,68 @@ class Pass {
         inPhonetic_ = inPhonetic_ && reader_.depth() > phoneticDepth_;
         inValue_ = name == "v";
         if (name == "c") beginCell();
-        if (name == "v" || name == "is") hasCells_ = true;
-        if (name == "t" && !inPhonetic_) ++runs_;
+        if (name == "row") beginRow();
+        if (name == "is") inlineDepth_ = reader_.depth();
+        if (name == "f") hasFormula_ = true;
+        if (name == "t" && !inPhonetic_ && isInline()) ++runs_;
         if (name == "rPh") {
             inPhonetic_ = true;
             phoneticDepth_ = reader_.depth();
             phonetic_ = true;
         }
-        if (name == "mergeCell" && hasCells_)
-            findings_.mergedRanges.add(at(reader_.attribute("ref")));
+        if (name == "mergeCell" && tables_.imported != nullptr) noteMerged();
         notePrefix();
+    }
+
+    // Texts of a cell are within its element.
+    bool isInline() const { return inlineDepth_ > 0 && reader_.depth() > inlineDepth_; }
+
+    void noteMerged() {
+        const auto range = reader_.attribute("ref");
+        if (range && range->find(':') != std::string::npos) findings_.mergedRanges.add(at(range));
+    }
+
+    void beginRow() {
+        row_ = static_cast<unsigned>(number(reader_.attribute("r")).value_or(row_ + 1));
+        column_ = 0;
     }
 
     void beginCell() {
         endCell();
         type_ = reader_.attribute("t").value_or("");
         style_ = reader_.attribute("s").value_or("");
-        place_ = at(reader_.attribute("r"));
+        const auto reference = reader_.attribute("r");
+        place_ = at(reference);
+        takeReference(reference);
+        inlineDepth_ = 0;
+    }
+
+    // A cell without a place follows the one before.
+    void takeReference(const std::optional<std::string>& reference) {
+        ++column_;
+        if (!reference) return;
+        const size_t digits = std::min(reference->find_first_of("0123456789"), reference->size());
+        if (const auto column = columnNumber(reference->substr(0, digits))) column_ = *column;
+        if (const auto row = number(reference->substr(digits))) row_ = static_cast<unsigned>(*row);
+    }
+
+    static std::optional<long> number(const std::optional<std::string>& text) {
+        if (!text || text->empty()) return std::nullopt;
+        char* end = nullptr;
+        const long value = std::strtol(text->c_str(), &end, 10);
+        return *end == '\0' && value > 0 && value < UINT_MAX ? std::optional(value) : std::nullopt;
     }
 
     void endCell() {
+        if (hasFormula_ && !hasValue_ && type_ != "str" && isRead()) findings_.formulas.add(place_);
+        hasFormula_ = false;
         if (type_ == "inlineStr" && phonetic_) findings_.phoneticCells.add(place_);
         if (type_ == "inlineStr" && runs_ > 0 && hasValue_) {
             findings_.inlineValues.add(place_);
         } else if (type_ == "inlineStr" && runs_ > 1) {
             findings_.runs.add(place_);
         }
+        if (runs_ > 0 && isName()) nameIsText_ = true;
         runs_ = 0;
         hasValue_ = false;
         phonetic_ = false;
@@ -85,31 +127,91 @@ class Pass {
 
     void countValue() {
         hasValue_ = true;
+        if (!isRead()) return;
+        const bool isNumber = type_.empty() || type_ == "n";
         if (type_ == "s") countSharedText();
         if (type_ == "d") findings_.isoDates.add(place_);
         if (type_ == "e") findings_.errors.add(place_);
-        if (!style_.empty() && (type_.empty() || type_ == "n")) countStyle();
+        if (isName()) return noteName(isNumber);
+        if (isNumber || type_ == "b") countStyle();
+    }
+
+    // Whether the cell is not above the data or in a column that is left out.
+    bool isRead() const {
+        const ImportedSheet* sheet = tables_.imported;
+        if (sheet == nullptr) return true;
+        return (isName() || row_ >= sheet->firstDataRow) && sheet->leftOut.count(column_) == 0;
+    }
+
+    bool isName() const {
+        return tables_.imported != nullptr && row_ == tables_.imported->nameRow &&
+               row_ < tables_.imported->firstDataRow;
+    }
+
+    void noteName(bool isNumber) {
+        if (isNumber) {
+            numbersAsNames_.add(place_);
+        } else {
+            nameIsText_ = true;
+        }
+    }
+
+    void addNumbersAsNames() {
+        Places& all = findings_.numbersAsNames;
+        if (all.count == 0) all.first = numbersAsNames_.first;
+        all.count += numbersAsNames_.count;
     }
 
     void countSharedText() {
         ++findings_.sharedTexts;
         const long index = std::strtol(reader_.text().c_str(), nullptr, 10);
-        const bool known = index >= 0 && static_cast<size_t>(index) < tables_.texts;
+        const bool known = index >= 0 && static_cast<size_t>(index) < tables_.texts.count;
         if (!known) findings_.missingTexts.add(place_);
+        const auto has = [index](const std::vector<bool>& texts) {
+            return index >= 0 && static_cast<size_t>(index) < texts.size() &&
+                   texts[static_cast<size_t>(index)];
+        };
+        if (has(tables_.texts.phonetic)) findings_.phoneticTexts.add(place_);
+        if (has(tables_.texts.cdata)) findings_.cdataTexts.add(place_);
     }
 
+    // A cell without a style has the first one.
     void countStyle() {
         const NumberFormats* const formats = tables_.formats;
-        const long style = std::strtol(style_.c_str(), nullptr, 10);
-        const bool known =
-            style >= 0 && formats != nullptr && style < static_cast<long>(formats->size());
-        if (!known) return;
-        const int index = static_cast<int>(style);
-        auto found = findings_.formats.find(index);
-        if (found == findings_.formats.end()) {
-            found = findings_.formats.emplace(index, formats->of(index)).first;
+        if (formats == nullptr) return;
+        int style = StyledColumn::kBoolean;
+        if (type_ != "b") {
+            const long index = std::strtol(style_.c_str(), nullptr, 10);
+            if (index < 0 || index >= static_cast<long>(formats->size())) return;
+            style = static_cast<int>(index);
+            if (findings_.formats.count(style) == 0) {
+                findings_.formats.emplace(style, formats->of(style));
+            }
         }
-        found->second.cells.add(place_);
+        StyledCells* const cells = cellsOf({worksheet_.place, column_, style});
+        if (cells != nullptr) cells->cells.add(place_);
+    }
+
+    // Null when there are far too many kinds of them to tell apart.
+    StyledCells* cellsOf(const StyledColumn& key) {
+        constexpr size_t kMost = 200000;
+        auto& all = findings_.styledCells;
+        auto found = all.find(key);
+        if (found == all.end()) {
+            if (all.size() >= kMost) return nullptr;
+            found = all.emplace(key, StyledCells()).first;
+            describe(found->second);
+        }
+        return &found->second;
+    }
+
+    void describe(StyledCells& cells) const {
+        const ImportedSheet* sheet = tables_.imported;
+        if (sheet == nullptr) return;
+        cells.reference = columnReference(worksheet_.name, sheet->key, column_);
+        const auto column = sheet->columns.find(column_);
+        if (column != sheet->columns.end()) cells.kind = column->second;
+        cells.isChosen = sheet->chosen.count(column_) != 0;
     }
 
     void notePrefix() {
@@ -140,7 +242,12 @@ class Pass {
     bool phonetic_ = false;
     bool inPhonetic_ = false;
     int phoneticDepth_ = 0;
-    bool hasCells_ = false;
+    bool hasFormula_ = false;
+    int inlineDepth_ = 0;  // of the inline text of the cell, 0 for none
+    unsigned row_ = 0;     // 1-based
+    unsigned column_ = 0;  // 1-based
+    bool nameIsText_ = false;
+    Places numbersAsNames_;  // in the row of names
     bool prefixed_ = false;
 };
 
@@ -187,7 +294,8 @@ void inspectWorksheet(Package& package, const WorksheetPart& worksheet, const Ta
 
 void inspectWorksheetQuickly(Package& package, const WorksheetPart& worksheet,
                              const std::string& unpacked, bool hasTexts, Findings& findings) {
-    const Tables none{nullptr, 0};
+    const SharedTexts noTexts;
+    const Tables none{nullptr, noTexts, nullptr};
     if (hasPrefixedRoot(package, worksheet)) {
         return Pass(package, worksheet, none, findings).findPrefix();
     }

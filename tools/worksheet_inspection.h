@@ -1,8 +1,10 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include "tools/findings.h"
+#include "tools/imported.h"
 #include "tools/number_formats.h"
 #include "tools/package.h"
 
@@ -12,20 +14,29 @@ struct WorksheetPart {
     std::string name;  // of the worksheet
     std::string part;
     bool hidden;
+    size_t place;  // in the book, 0-based
 };
 
-// What cells refer to.
+// The shared texts: how many there are, and which are written in a way that costs something.
+struct SharedTexts {
+    size_t count = 0;
+    std::vector<bool> phonetic;
+    std::vector<bool> cdata;
+};
+
+// What cells refer to, and what became of them.
 struct Tables {
     const NumberFormats* formats;  // null to leave formats out
-    size_t texts;                  // how many shared texts there are
+    const SharedTexts& texts;
+    const ImportedSheet* imported;  // null when the worksheet was not imported
 };
 
-// Reads all cells and notes what it finds.
+// Reads all cells that are imported and notes what it finds.
 void inspectWorksheet(Package& package, const WorksheetPart& worksheet, const Tables& tables,
                       Findings& findings);
 
-// Notes prefixes by the first element alone, the first ISO date, and, when the package has no
-// shared texts, the first cell that wants one. `unpacked` is the same part as a file.
+// Notes prefixes by the first element alone, the first ISO date, and, when the import has no shared
+// texts, the first cell that wants one. `unpacked` is the same part as a file.
 void inspectWorksheetQuickly(Package& package, const WorksheetPart& worksheet,
                              const std::string& unpacked, bool hasTexts, Findings& findings);
 
