@@ -406,12 +406,15 @@ class ToolTest(unittest.TestCase):
                     (["--sheet", "3"], 'no worksheet "3" with values; it has "Measurements" .1.'),
                     (["--head"], "--head: its value is missing; see"),
                     (["--csv", "a", "--csv", "b"], "--csv: give it once, with one value; see"),
+                    (["--bogus"], "--bogus: there is no such option"),
                     (["--csv", "--explain"], "or --explain with --json"),
                     (["--exclude", "Measurements!Q"], 'the worksheet "Measurements" has no column Q')]
         for arguments, text in messages:
             self.assertRegex(self.run_tool(SAMPLE, *arguments, expected=2), text)
         self.assertEqual(self.run_tool(SAMPLE, "--exclude-sheet", "1", "--exclude-sheet", "2"),
                          "All worksheets are left out\n")
+        self.run_tool(SAMPLE, "--exclude-sheet", "1", "--exclude-sheet", "2", "--csv")
+        self.assertIn("no worksheet with values is left", self.notes[0])
 
     def damaged(self, name):
         """A workbook for the row `name` of the table of failures."""

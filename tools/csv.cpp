@@ -95,7 +95,10 @@ bool meansFolder(const std::string& target) {
 void writeCsv(Workbook& workbook, const Options& options) {
     const std::vector<SheetEntry> sheets = workbook.worksheets();
     if (meansFolder(options.target)) return writeFolder(workbook, options, sheets);
-    if (sheets.empty()) return Output(options.target).finish();
+    if (sheets.empty()) {
+        printLine(options.book + ": no worksheet with values is left to write");
+        return Output(options.target).finish();
+    }
     if (sheets.size() > 1) {
         throw Failure(kUsage, options.book + ": " + worksheetsText(sheets) +
                                   "; add --sheet and the name or number of one, or name a folder "

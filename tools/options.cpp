@@ -227,6 +227,12 @@ Request parseOptions(int count, const char* const* arguments) {
         return request;
     } catch (const CLI::ArgumentMismatch& error) {
         throw Failure(kUsage, mismatchText(error.what()));
+    } catch (const CLI::ExtrasError& error) {
+        const std::string words = firstLine(error.what());
+        const std::string extra = words.substr(words.rfind(": ") + 2);
+        throw Failure(kUsage, extra +
+                                  ": there is no such option, and one workbook is read at a time" +
+                                  "; see dpxlsx --help");
     } catch (const CLI::ParseError& error) {
         throw Failure(kUsage, firstLine(error.what()) + "; see dpxlsx --help");
     }
