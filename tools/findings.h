@@ -1,10 +1,10 @@
 #pragma once
 
-#include <compare>
 #include <cstddef>
 #include <map>
 #include <optional>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include "tools/column.h"
@@ -42,7 +42,10 @@ struct StyledColumn {
     int style;         // kBoolean for Booleans, which have no number format to go by
 
     static constexpr int kBoolean = -1;
-    auto operator<=>(const StyledColumn&) const = default;
+    bool operator<(const StyledColumn& other) const {
+        return std::tie(worksheet, column, style) <
+               std::tie(other.worksheet, other.column, other.style);
+    }
 };
 
 struct StyledCells {
