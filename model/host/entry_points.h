@@ -3,23 +3,24 @@
 #include "model/host/export.h"
 
 // The exported functions, under their plain names: a host finds them by name after loading the
-// library.
+// library. A null name counts as the empty text.
 namespace dp {
 
 class IDataProvider;
 
 extern "C" {
 
-// "xlsx" when the name is that of a workbook, else the empty text. The text is shared by all calls
-// of the process and valid until the next one.
+// "xlsx" when IsMicrosoftXLSXFile is true of the name, else the empty text; never null. The text
+// belongs to the library, is shared by all calls of the process and valid until the next one.
 DPXLSX_API const char* GetDataProviderFiletype(const char* fileName);
 
-// True when the name ends in ".xlsx" in any letter case. The file itself is not looked at.
+// True when the last element of the path has the extension ".xlsx" in any letter case. The file
+// itself is not looked at and need not exist.
 DPXLSX_API bool IsMicrosoftXLSXFile(const char* fileName);
 
-// Makes a provider for the type "xlsx" (exactly so written) with a reference count of 0.
-// Returns 0, -22 for another type name, -1 when it cannot be made or `provider` is null. *provider
-// is null unless the result is 0.
+// Makes a provider for the type "xlsx" (exactly so written) with a reference count of 0: the caller
+// takes the first reference. Returns 0, -22 for another type name, -1 when it cannot be made or
+// `provider` is null; `*provider` is null unless the result is 0. Throws nothing.
 DPXLSX_API long CreateDataProvider(const char* typeName, IDataProvider** provider);
 
 }  // extern "C"
