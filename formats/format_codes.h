@@ -12,6 +12,8 @@ namespace dp {
 class NumericVariableFormat;
 class PercentageVariableFormat;
 
+// The words of number-format codes: "General", "@", "#,##0", "##", "E+0", "E+00", "[$", ";" and
+// "%".
 extern DPXLSX_API const std::string GENERAL_FORMAT;
 extern DPXLSX_API const std::string TEXT_FORMAT;
 extern DPXLSX_API const std::string SIGNIFICANT_DIGITS_MASK;
@@ -44,7 +46,8 @@ DPXLSX_API bool parseCurrencyFormat(const std::string& code);
 DPXLSX_API bool parseDateTimeFormat(const std::string& code, std::string& cleaned,
                                     EXCEL_FORMAT_TYPE& type);
 
-// New formats for codes that the recogniser of the same kind accepted; the caller owns them.
+// New formats for codes that the recogniser of the same kind accepted; the caller owns them. The
+// code is only read.
 DPXLSX_API NumericVariableFormat* createVextralDecimalFormat(std::string& code);
 DPXLSX_API PercentageVariableFormat* createVextralPercentageFormat(std::string& code);
 DPXLSX_API NumericVariableFormat* createVextralScientificFormat(std::string& code);

@@ -29,7 +29,7 @@ class DPXLSX_API FractionVariableFormat : public IFractionVariableFormat {
     bool autoFormat = false;
     int decimalPlaces = 0;      // decimals of the denominator
     int significantDigits = 0;  // decimals of the numerator; digits of the plain number
-    double rangeLow = 0;
+    double rangeLow = 0;        // kept for the host, like the next one
     double rangeHigh = 0;
     int denominator = 0;
     int maximumDigits = 0;  // decimals of the whole part

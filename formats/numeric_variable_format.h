@@ -23,8 +23,8 @@ class DPXLSX_API NumericVariableFormat : public INumericVariableFormat {
     bool ShowFullPrecision() const override;
 
     bool autoFormat = false;
-    int decimalPlaces = 0;
-    int significantDigits = 0;
+    int decimalPlaces = 0;      // 0 in scientific notation: as many as the value needs
+    int significantDigits = 0;  // kept for the host, like the next three
     double rangeLow = 0;
     double rangeHigh = 0;
     bool showsFullPrecision = false;

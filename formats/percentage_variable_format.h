@@ -24,11 +24,11 @@ class DPXLSX_API PercentageVariableFormat : public IPercentageVariableFormat {
     int GetDecimalPlaces() const override;
 
     bool autoFormat = false;
-    int decimalPlaces = 0;
-    int significantDigits = 0;
+    int decimalPlaces = 0;      // kept for the host, like the range
+    int significantDigits = 0;  // with full precision; 0 counts as 1
     double rangeLow = 0;
     double rangeHigh = 0;
-    int percentDecimalPlaces = 0;
+    int percentDecimalPlaces = 0;  // of the percentage itself: 2 for "12.34%"
     bool showsFullPrecision = false;
     NumericSubtype numericSubtype = NumericSubtype::Percentage;
 };

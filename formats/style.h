@@ -17,7 +17,7 @@ enum EXCEL_FORMAT_TYPE : std::int32_t {
     EXCEL_FORMAT_DATE = 7,
     EXCEL_FORMAT_TIME = 8,
     EXCEL_FORMAT_DATETIME = 9,
-    EXCEL_FORMAT_PARENTHESES = 10
+    EXCEL_FORMAT_PARENTHESES = 10  // negative numbers in parentheses
 };
 
 // One entry of a reader's style table. A cell's style index is a position in that table.

@@ -8,8 +8,9 @@
 #include "model/host/i_variable_format.h"
 #include "model/string.h"
 
-// The columns that loading makes. Their fields are filled once and then only read; the order of the
-// fields and of the operations is part of the binary contract.
+// The columns that loading makes. A getter returns the field of its name where there is one. Fields
+// are filled once, by the load, and then only read, but for the keys that the host sets; the order
+// of the fields and of the operations is part of the binary contract.
 namespace dp {
 
 class DPXLSX_API ColumnView : public IColumnView {
@@ -85,9 +86,9 @@ class DPXLSX_API NumericColumn : public INumericColumn {
     String description;  // never filled
     std::int32_t primeKey = 0;
     std::int32_t variableBodyPrimeKey = 0;
-    std::int32_t originalVariablePrimeKey = 0;
-    std::int32_t position = 0;  // 1-based
-    std::int32_t worksheetId = 0;
+    std::int32_t originalVariablePrimeKey = 0;  // never set by a load
+    std::int32_t position = 0;                  // 1-based
+    std::int32_t worksheetId = 0;               // never set
     std::int32_t missingCount = 0;
     std::int32_t lastModified = 0;  // never set
     std::int32_t rowCount = 0;
@@ -96,9 +97,9 @@ class DPXLSX_API NumericColumn : public INumericColumn {
     bool isCopy = false;
     bool formatDirty = false;
     bool useDefaultVariableBody = true;
-    std::int32_t dataType = kNumbers;
-    std::unique_ptr<double[]> values;
-    std::unique_ptr<IVariableFormat> format;
+    std::int32_t dataType = kNumbers;         // or kDateTimes
+    std::unique_ptr<double[]> values;         // at least rowCount; null until the load
+    std::unique_ptr<IVariableFormat> format;  // null until the load
     ColumnView view;
     std::uint32_t refCount = 0;
 };
@@ -144,9 +145,9 @@ class DPXLSX_API TextColumn : public ITextColumn {
     String description;  // never filled
     std::int32_t primeKey = 0;
     std::int32_t variableBodyPrimeKey = 0;
-    std::int32_t originalVariablePrimeKey = 0;
-    std::int32_t position = 0;  // 1-based
-    std::int32_t worksheetId = 0;
+    std::int32_t originalVariablePrimeKey = 0;  // never set by a load
+    std::int32_t position = 0;                  // 1-based
+    std::int32_t worksheetId = 0;               // never set
     std::int32_t missingCount = 0;
     std::int32_t lastModified = 0;  // never set
     std::int32_t rowCount = 0;
@@ -154,9 +155,9 @@ class DPXLSX_API TextColumn : public ITextColumn {
     bool isCopy = false;
     bool formatDirty = false;
     bool useDefaultVariableBody = true;
-    ReadOnlyStringCollection<IString&> textValues;
+    ReadOnlyStringCollection<IString&> textValues;  // rowCount texts
     ColumnOrdering ordering;
-    std::unique_ptr<IVariableFormat> format;
+    std::unique_ptr<IVariableFormat> format;  // null until the load
     ColumnView view;
     std::uint32_t refCount = 0;
 };

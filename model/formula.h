@@ -7,8 +7,9 @@
 #include "model/host/i_formula.h"
 #include "model/string.h"
 
-// The formula objects of the host's model. An import fills none of them. Field and slot order are
-// part of the binary contract.
+// The formula objects of the host's model. An import fills none of them. A getter returns the
+// field of its name; whoever makes the object fills the fields. Field and slot order are part of
+// the binary contract.
 namespace dp {
 
 class DPXLSX_API ExpressionError : public IExpressionError {
@@ -50,7 +51,9 @@ class DPXLSX_API FormulaNode : public IFormulaNode {
     IFormulaNode* GetParentNode(int index) const override;
     IFormulaNode* GetChildNode(int index) const override;
 
+    // Appends to the parents; the node is borrowed.
     virtual void SetParentNode(IFormulaNode* node);
+    // Appends to the children; the node is borrowed.
     virtual void SetChildNode(IFormulaNode* node);
     // This node through the interface of its own kind.
     virtual IFormulaNode* GetFormulaNodeInterface() = 0;
@@ -101,7 +104,7 @@ class DPXLSX_API FormulaVariableNode : public FormulaNodeOf<IFormulaVariableNode
     int GetExpressionErrorCount() const override;
     const IExpressionError* GetExpressionError(int index) const override;
 
-    std::map<int, int> variablePositions;
+    std::map<int, int> variablePositions;  // value by key
     std::vector<ExpressionError> expressionErrors;
     int variablePrimeKey = 0;
     String formula;
@@ -137,6 +140,7 @@ class DPXLSX_API FormulaModelVariableNode : public FormulaNodeOf<IFormulaModelVa
     int variablePrimeKey = 0;
 };
 
+// Deletes its nodes when it goes.
 class DPXLSX_API FormulaManager : public IFormulaManager {
   public:
     FormulaManager();

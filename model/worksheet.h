@@ -6,7 +6,9 @@
 #include "model/host/i_worksheet.h"
 #include "model/string.h"
 
-// The worksheet objects handed to the host. Field and slot order are part of the binary contract.
+// The worksheet objects handed to the host. A getter returns the field of its name. The provider
+// fills the key and the title of a worksheet; an import leaves all other fields at their defaults.
+// Field and slot order are part of the binary contract.
 namespace dp {
 
 class DPXLSX_API WorksheetView : public IWorksheetView {

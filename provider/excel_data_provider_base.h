@@ -21,7 +21,7 @@
 
 namespace dp {
 
-// How a column is wanted.
+// How a column is wanted; Automatic stands for the kind of its first data cell.
 enum class ColumnType : int { Numeric = 0, Text = 1, Automatic = 2 };
 
 // The provider without the file: settings, read options, the worksheets that a reader announced and
@@ -173,9 +173,9 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     // The host's helper, owned by the provider; null when none was set.
     virtual IDateTimeVariableFormat* GetDateTimeVariableFormatHelper() const;
     // Loads the column `key` in the kind `requested` unless a column option asks for another;
-    // `*formatType` becomes the kind of its first data cell or that of the option. Both
-    // out-pointers may be null. False, and a null `*column`, for an unknown key and for an excluded
-    // column unless `ignoreExclusion`.
+    // `*formatType` becomes the kind of its first data cell or that of the option, which is Numeric
+    // for date-times too. Both out-pointers may be null. False, and a null `*column`, for an
+    // unknown key and for an excluded column unless `ignoreExclusion`.
     virtual bool FindColumn(int key, IColumn** column, ColumnType requested,
                             IVariableFormat::FormatType* formatType, bool ignoreExclusion) const;
     // The cell as text, cut to GetMaximumTextLength() bytes when `truncate`.
@@ -199,11 +199,15 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
                              const IString* dateTimeFormat, bool& converted) const;
 
     // --- Row layout; a key that names no worksheet finds no rows, but options are made for it ---
-    // Makes the worksheet's name row and first data row concrete.
+    // Makes the worksheet's name row and first data row concrete, unless it is excluded.
     void CalculateRowOffsets(unsigned key) const;
-    // Decides from the first row whether the worksheet has a row of variable names.
+    // Decides from the first row whether the worksheet has a row of variable names, when its
+    // setting is VNR_INFER.
     void InferVariableNameRow(unsigned key) const;
+    // Notes the worksheet's last row, when blank rows are ignored or columns padded; what was noted
+    // before stays.
     void FindLastRow(unsigned key) const;
+    // Notes the worksheet's blank rows, when they are ignored; what was noted before stays.
     void FindBlankRows(unsigned key) const;
     // Rows that a column of the worksheet gets when it is loaded.
     unsigned GetLoadColumnRowCount(unsigned key, const CellColumn& column) const;
@@ -213,6 +217,9 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
                              unsigned rowCount, CellColumn::const_iterator cell) const;
 
     // --- Loading; the columns are new, with a reference count of 0 ---
+    // `columnIndex` and `position` are 0-based places, in the sheet and towards the host. A null
+    // `formatType` stands for Numeric; it tells how the first data cell is shown and stays as it
+    // is.
     INumericColumn* LoadNumericColumn(unsigned worksheetKey, const CellColumn& cells,
                                       unsigned columnIndex, unsigned position,
                                       const std::string& name, int key,
@@ -230,15 +237,18 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     std::string GetWorksheetName(int position) const;
     // Worksheets of the write side: none in this read-only provider.
     int GetWorksheetCount() const;
+    // Always empty.
     std::string GetFileName() const;
 
-    // --- Settings of the process ---
+    // --- Settings of the process, as the operations of slots 31 to 39 set them; texts are valid
+    // until they are set again ---
     static double GetMissingValue();
     static const char* GetMissingValueTextRepresentation();
     static const char* GetBooleanTrueValue();
     static const char* GetBooleanFalseValue();
     static double GetNumericMinimumValue();
     static double GetNumericMaximumValue();
+    // 2147000000; the library neither changes nor uses it.
     static double GetNumericMaximumInt();
     static int GetMaximumTextLength();
     static char GetInputDecimal();

@@ -21,8 +21,8 @@ struct NumberKind {
 // the workbook's list in order.
 class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
   public:
-    // `dir` is the directory of the unpacked package. Throws CmXmlException when its workbook part
-    // cannot be opened.
+    // `dir` is the directory of the unpacked package, and `hasSharedStrings` tells whether it has
+    // that part. Throws CmXmlException when the workbook part cannot be opened.
     ExcelXLSXReader(const std::string& dir, bool hasSharedStrings, std::string shortDateFormat,
                     double missingValue, IExcelDataProvider* provider,
                     IDateTimeVariableFormat* dateTimeHelper);
@@ -30,8 +30,13 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
 
     void mReadExcelWorkbook() override;
 
+    // Reads the texts that cells share by index, in place of those read before. Throws
+    // CmXmlException, like the next one.
     void mReadSharedStrings();
+    // Reads the number formats, in place of the style table before, and which of them the cell
+    // formats use.
     void mReadExcel2007Styles();
+    // Appends the built-in number formats to the style table.
     void mAddPredefined2007Styles();
     // Delivers the cells of the worksheet part that the relationship target names. Like the next
     // one, for use while mReadExcelWorkbook runs.

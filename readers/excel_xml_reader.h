@@ -42,13 +42,16 @@ class DPXLSX_API ExcelXmlReader {
     virtual IVariableFormat* createVextralNumericFormat(int styleIndex);
     // The style's EXCEL_FORMAT_TYPE, 0 for an index outside the table.
     virtual EXCEL_FORMAT_TYPE GetExcelFormatType(int styleIndex) const;
+    // True for the date, time and date-time types.
     virtual bool IsDateTimeFormatType(EXCEL_FORMAT_TYPE type);
-    // The masks of which default date-time codes are made: "hh:mm", ":" and "AM/PM".
+    // The masks of which default date-time codes are made: "hh:mm", ":" and "AM/PM". Valid as long
+    // as the reader.
     virtual const std::string& GetTimeMask();
     virtual const std::string& GetTimeSeparator();
     virtual const std::string& GetAMPMMask();
 
     // --- The style table ---
+    // Sets the names of elements and the codes of descriptive formats; the constructor does it.
     void mInitialize();
     // Classifies one style that was read from the file; may rewrite its code.
     void mSetFmtType(xStyle& style);
@@ -56,6 +59,8 @@ class DPXLSX_API ExcelXmlReader {
     void mReplaceDescWithFormat();
     // Gives the built-in date-time styles the default codes of the masks.
     void UpdateFormatsForLocale();
+    // Composes the default code of the DateTimePart `flags` into `code`; without date and time part
+    // `code` stays as it is.
     void GetLocaleDefaultDateTimeFormat(std::string& code, unsigned flags);
     // The default style of a cell position (0-based), or the style resolved last. False when there
     // is none; `styleIndex` is -1 when the style is not in the table.
@@ -68,16 +73,23 @@ class DPXLSX_API ExcelXmlReader {
     // is no helper.
     double mFormatExcelDateTime(const std::string& text);
 
-    // --- XML Spreadsheet 2003 ---
+    // --- XML Spreadsheet 2003, in the order of the document; reading throws CmXmlException ---
+    // Reads the style table as far as the first worksheet.
     void mReadExcelStyles();
     // Appends the worksheet's index to `emptySheets` when it delivered nothing.
     void mReadExcelWorksheet(std::vector<unsigned>& emptySheets);
+    // Reads the default styles of columns, as far as the first row.
     void mReadExcelWorksheetDataHeader();
+    // Delivers the cells of at most `rowCount` rows and `columnCount` columns.
     void mReadExcelWorksheetData(unsigned columnCount, unsigned rowCount);
     // Delivers the next value of the row, if there is one, moving `column` on; true when it met the
     // options behind the table.
     bool mReadExcelWorksheetCell(unsigned& column, unsigned row, unsigned columnCount);
+    // Delivers the value of the current data element as a cell at `column` and `row` (0-based),
+    // unless it has none.
     void mReadExcelWorksheetCellData(unsigned column, unsigned row);
+    // Delivers a cell; with `lookUpFormat` it gets the style of its place first, and a number under
+    // a date or date-time format becomes a date-time.
     void mAddExternalDataRecord(ExternalDataRecord& record, bool lookUpFormat);
     // True for the empty text and for one of spaces only.
     static bool IsStringAllBlank(const std::string& text);

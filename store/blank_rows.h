@@ -16,11 +16,13 @@ class DPXLSX_API BlankRows {
     // Adds the rows from `first` to `last` inclusive; they must lie after all rows added before.
     void append(std::uint32_t first, std::uint32_t last);
 
+    // Whether `row` is blank.
     bool contains(std::uint32_t row) const {
         return countBetween(row, std::uint64_t{row} + 1) != 0;
     }
     // Number of blank rows r with from <= r < end; 0 when end is not above from.
     std::uint32_t countBetween(std::uint64_t from, std::uint64_t end) const;
+    // Number of all blank rows.
     std::uint64_t size() const { return countBelow(std::uint64_t{1} << 32); }
 
   private:

@@ -12,6 +12,7 @@ namespace dp {
 // A row, column or id that is not set.
 inline constexpr std::uint32_t kNotSet = 0xFFFFFFFF;
 
+// The rows of a worksheet. kNotSet in a row or count leaves the choice to the library.
 struct SheetReadOptions {
     EVariableNameRowSetting variableNameRowSetting = VNR_GIVEN;
     std::uint32_t variableNameRow = kNotSet;
@@ -22,6 +23,7 @@ struct SheetReadOptions {
     bool rowsOneBased = true;
 };
 
+// One column of a worksheet.
 struct ColumnReadOptions {
     std::uint32_t column = kNotSet;  // 1-based
     bool exclude = false;

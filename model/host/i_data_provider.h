@@ -173,8 +173,8 @@ class DPXLSX_API IDataProvider : public IResource {
     // Replaces ? * / : < > | " \ in the titles of worksheets that are opened from then on by "_"
     // and trims them; GetWorksheets still lists the names as they are.
     virtual void SetReadOptionCleanWorksheetNames(bool clean) = 0;
-    // Columns that begin with a date-time arrive as texts. Date-times in columns that are loaded as
-    // numeric all the same become missing and count as converted.
+    // Columns that begin with a date-time arrive as texts. Date-times in a column that is loaded as
+    // numeric all the same, or that begins with a number, become missing and count as converted.
     virtual void SetReadOptionConvertDateTimeToText(bool convert) = 0;
 
     // --- 53-56: read options per worksheet ---
