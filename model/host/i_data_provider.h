@@ -178,16 +178,15 @@ class DPXLSX_API IDataProvider : public IResource {
     virtual void SetReadOptionConvertDateTimeToText(bool convert) = 0;
 
     // --- 53-56: read options per worksheet ---
-    // Where the names and the data of a worksheet are, settled at once; VNR_INFER waits for the
-    // worksheet and then for GetWorksheetPrimeKeys. A row of 0 is not given: names are then in row
-    // 1, data from the row behind the names, or from row 1 without names. `nameRow` counts with
-    // VNR_GIVEN only.
+    // Where a worksheet has its names and its data, settled at once, or by GetWorksheetPrimeKeys
+    // where VNR_INFER has no worksheet to look at yet. A row of 0 is not given: names are then in
+    // row 1, and data from the row behind the names, or from row 1 without names. `nameRow` counts
+    // with VNR_GIVEN only.
     virtual void SetReadOptionDataRowPositions(unsigned key, EVariableNameRowSetting setting,
                                                unsigned nameRow, unsigned firstRow) = 0;
-    // The setting of worksheets without options of their own, VNR_GIVEN by default. Worksheets take
-    // it over in the first GetWorksheetPrimeKeys that lists them; no longer those for which
-    // SetReadOptionDataRowPositions, SetReadOptionDataRowCount, SetReadOptionExclude or FindColumn
-    // came before it.
+    // The setting of worksheets that were given none, VNR_GIVEN by default. A worksheet takes it in
+    // the first GetWorksheetPrimeKeys that lists it, but not if SetReadOptionDataRowPositions,
+    // SetReadOptionDataRowCount, SetReadOptionExclude or FindColumn was called for it before.
     virtual void SetReadOptionDefaultUseVariableNameRow(EVariableNameRowSetting setting) = 0;
     // Reads at most `count` rows from the first data row, blank ones counted; 0 reads none. Before
     // the first GetWorksheetPrimeKeys this also fixes the worksheet's setting of the name row at

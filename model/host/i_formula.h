@@ -14,7 +14,7 @@ class DPXLSX_API IExpressionError {
   public:
     virtual ~IExpressionError() = default;
 
-    // --- What is wrong and where, as its maker set them; 0 until then ---
+    // --- What is wrong and where, in the host's numbering; 0 until the maker sets it ---
     virtual int GetCode() const = 0;
     virtual int GetPosition() const = 0;
     virtual int GetLine() const = 0;
