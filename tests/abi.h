@@ -2,12 +2,15 @@
 
 #include <cxxabi.h>
 #include <dlfcn.h>
+#include <elf.h>
+#include <link.h>
 
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
+#include <fstream>
 #include <iterator>
 #include <map>
 #include <memory>
@@ -55,16 +58,49 @@ Result call(const void* object, std::size_t slot, Arguments... arguments) {
     return reinterpret_cast<Function>(table[slot])(object, arguments...);
 }
 
-// The operation that stands in a slot, "name(types)", as the symbols of the program call it.
-inline std::string operationIn(const void* object, std::size_t slot) {
-    void* const* table = *static_cast<void* const* const*>(object);
-    Dl_info symbol{};
-    if (!dladdr(table[slot], &symbol) || symbol.dli_saddr != table[slot]) return "no symbol";
-    const std::unique_ptr<char, void (*)(void*)> name(abi::__cxa_demangle(symbol.dli_sname, nullptr, nullptr, nullptr),
+// The mangled names of the program's symbols by their place in it.
+inline std::multimap<std::uintptr_t, std::string> programSymbols() {
+    std::ifstream file("/proc/self/exe", std::ios::binary);
+    const auto read = [&file](auto items, std::uint64_t offset) {
+        file.seekg(static_cast<std::streamoff>(offset));
+        file.read(reinterpret_cast<char*>(items.data()), static_cast<std::streamsize>(items.size() * sizeof items[0]));
+        return items;
+    };
+    const ElfW(Ehdr) header = read(std::vector<ElfW(Ehdr)>(1), 0)[0];
+    const auto sections = read(std::vector<ElfW(Shdr)>(header.e_shnum), header.e_shoff);
+    std::multimap<std::uintptr_t, std::string> names;
+    for (const ElfW(Shdr) & section : sections) {
+        if (section.sh_type != SHT_DYNSYM) continue;
+        const ElfW(Shdr)& texts = sections[section.sh_link];
+        const std::string text = read(std::string(texts.sh_size, '\0'), texts.sh_offset);
+        for (const ElfW(Sym) & symbol :
+             read(std::vector<ElfW(Sym)>(section.sh_size / sizeof(ElfW(Sym))), section.sh_offset))
+            names.emplace(symbol.st_value, text.c_str() + symbol.st_name);
+    }
+    return names;
+}
+
+// "name(types)" of a member function.
+inline std::string operationName(const std::string& mangled) {
+    const std::unique_ptr<char, void (*)(void*)> name(abi::__cxa_demangle(mangled.c_str(), nullptr, nullptr, nullptr),
                                                       std::free);
     std::string text = name ? name.get() : "";
     if (const auto tag = text.find("[abi:cxx11]"); tag != text.npos) text.erase(tag, 11);
-    return text.substr(text.rfind("::", text.find('(')) + 2);
+    const auto scope = text.rfind("::", text.find('('));
+    return scope == text.npos ? text : text.substr(scope + 2);
+}
+
+// The operation that stands in a slot, by all its names: optimised, those of one body are one.
+inline std::vector<std::string> operationsIn(const void* object, std::size_t slot) {
+    static const auto symbols = programSymbols();
+    void* const operation = (*static_cast<void* const* const*>(object))[slot];
+    Dl_info unused{};
+    link_map* program = nullptr;
+    if (!dladdr1(operation, &unused, reinterpret_cast<void**>(&program), RTLD_DL_LINKMAP)) return {};
+    const auto [begin, end] = symbols.equal_range(reinterpret_cast<std::uintptr_t>(operation) - program->l_addr);
+    std::vector<std::string> names;
+    for (auto symbol = begin; symbol != end; ++symbol) names.push_back(operationName(symbol->second));
+    return names;
 }
 
 // Size and alignment of a field by its type in the table.

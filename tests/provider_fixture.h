@@ -76,6 +76,7 @@ class HandFilledProvider : public ExcelDataProviderBase {
     }
 
     using ExcelDataProviderBase::_blankRows;
+    using ExcelDataProviderBase::_cells;
     mutable int formatsMade = 0;
 };
 
@@ -177,15 +178,17 @@ inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key, Colum
 inline auto processSettings() {
     using Settings = ExcelDataProviderBase;
     return std::tie(Settings::_missingValue, Settings::_minNumericValue, Settings::_maxNumericValue,
-                    Settings::_maxTextLength, Settings::_inputDecimal, Settings::_missingValueText,
-                    Settings::_trueValue, Settings::_falseValue);
+                    Settings::_maxTextLength, Settings::_inputDecimal, Settings::_outputDecimal,
+                    Settings::_outputGroupingSymbol, Settings::_missingValueText, Settings::_trueValue,
+                    Settings::_falseValue);
 }
 
 // Puts the settings of the process back at its end.
 struct KeptSettings {
     ~KeptSettings() { processSettings() = before; }
 
-    std::tuple<double, double, double, int, char, std::string, std::string, std::string> before{processSettings()};
+    std::tuple<double, double, double, int, char, char, char, std::string, std::string, std::string> before{
+        processSettings()};
 };
 
 class ProviderTest : public testing::Test {
