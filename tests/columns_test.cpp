@@ -1,3 +1,5 @@
+#include "model/columns.h"
+
 #include <algorithm>
 #include <functional>
 #include <sstream>
@@ -184,13 +186,16 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     provider.SetWorksheetIndex(1);
     file(provider, 4, "|5");
     file(provider, 2, "|4");
+    provider.AddWorksheet("third");
+    provider.SetWorksheetIndex(2);
+    file(provider, 0, "|6");
     provider.SetWorksheetIndex(0);
     file(provider, 3, "|3");  // moves all later keys
     provider.GetWorksheetPrimeKeys();
-    EXPECT_EQ(keysOf(1) + "," + keysOf(2) + keysOf(0) + keysOf(3) + keysOf(-1), " 1 2 3, 4 5");
+    EXPECT_EQ(keysOf(1) + "," + keysOf(2) + keysOf(0) + keysOf(3) + keysOf(-1), " 1 2 3, 4 5 6");
     std::string values;
     for (int key = -1; key < 8; ++key) values += factsOf(provider, key).rows();
-    EXPECT_EQ(values, "13245");
+    EXPECT_EQ(values, "132456");
 
     provider.SetReadColumnOptionDestinationId(2, 5, 9);
     provider.SetReadColumnOptionExclude(2, 5, true);
@@ -199,7 +204,7 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     EXPECT_TRUE(provider.FindColumn(4, nullptr, ColumnType::Automatic, nullptr, false));
 
     provider.RemoveWorksheet(0);
-    EXPECT_EQ(keysOf(1) + keysOf(2), " 1 2");
+    EXPECT_EQ(keysOf(1) + keysOf(2) + keysOf(3), " 1 2 3");
     EXPECT_EQ(factsOf(provider, 1).rows(), "4");
     IColumn* column = nullptr;
     ASSERT_TRUE(provider.GetVariableFinder()->FindColumn(2, &column, true));
@@ -230,6 +235,122 @@ TEST_F(ColumnsOnDemand, KeepsTheRegistryThroughRemovals) {
     EXPECT_EQ(brief(2), ": 2");
     provider.AddWorksheet("d");
     EXPECT_EQ(provider.GetWorksheetPrimeKey(2), 4) << "never a key in use";
+}
+
+// A provider that was used in every way and cleared shows a workbook as a new one does.
+TEST_F(ColumnsOnDemand, ForgetsEverythingWithItsWorksheets) {
+    const auto shown = [](HandFilledProvider& p) {
+        std::ostringstream out;
+        out << p.IsPreviewing() << p.GetWriteOptionVariableNames() << p.GetError();
+        out << (p.GetMissingNumericFrom() == kMissing && p.GetMissingNumericTo() == kMissing) << ", ";
+        p.AddWorksheet("S:1");
+        p.file(9, 9, cellOf("9"));  // goes nowhere: no worksheet was selected
+        p.SetWorksheetIndex(0);
+        file(p, 0, "'name|1||3||'NA");
+        file(p, 1, "'d|@3");
+        file(p, 2, "'t|'a  b");
+        IWorksheet* worksheet = nullptr;
+        for (unsigned long n = p.GetWorksheetPrimeKeys()->Count(); n > 0 && p.FindWorksheet(1, &worksheet); n = 0) {
+            worksheet->AddRef();
+            out << worksheet->GetTitle();
+            worksheet->Release();
+        }
+        const auto columns = [&] {
+            p.GetWorksheetPrimeKeys();
+            for (int key = 1; key <= 3; ++key) out << ", " << factsOf(p, key).name << ": " << factsOf(p, key).rows();
+        };
+        columns();
+        p.SetMissingNumeric(kMissing, -1);
+        columns();
+        p.SetReadOptionPadColumnsWithMissingValues(true);
+        p.SetReadOptionIgnoreBlankRows(true);
+        columns();
+        return out.str();
+    };
+    const std::string expected =
+        "0101, S:1, name: 1 * 3 * *, d: 3, t: 'a  b', name: 1 -1 3 -1 -1, d: 3, t: 'a  b', name: 1 3 -1, d: 3 * *, "
+        "t: 'a  b' '' ''";
+    EXPECT_EQ(shown(provider), expected);
+
+    provider.RemoveWorksheet(0);
+    provider.SetReadOptionCleanTextValues(true);
+    provider.SetReadOptionCleanWorksheetNames(true);
+    provider.SetReadOptionConvertDateTimeToText(true);
+    provider.SetReadOptionDefaultUseVariableNameRow(VNR_NONE);
+    provider.AddWorksheet("a");
+    provider.AddWorksheet("b");
+    provider.SetWorksheetIndex(0);
+    file(provider, 3, "1||2");
+    const auto* worksheets = provider.GetWorksheetPrimeKeys();
+    const auto* columns = provider.GetColumnPrimeKeys(1);
+    EXPECT_EQ(worksheets->Count() + columns->Count(), 3U);
+    provider.SetReadOptionDataRowPositions(1, VNR_NONE, 0, 2);
+    provider.SetReadColumnOptionName(1, 1, "given");
+    provider.SetMaxVariableNameLength(2);
+    provider.SetWriteOptionVariableNames(false);
+    provider.SetMissingNumeric(1, 2);
+    provider.SetAlphaMissingNumeric("NA", 3);
+    provider.SetPreviewing(true);
+    provider.SetError(5);
+    provider.ClearWorksheets();
+    EXPECT_EQ(worksheets->Count() + columns->Count(), 0U);
+    provider.SetMissingValue(-9);
+    provider.ClearWorksheets();
+    provider.SetMissingValue(kMissing);
+    EXPECT_EQ(shown(provider), expected);
+}
+
+TEST_F(ColumnsOnDemand, GivesAKeyOutAgainWithoutItsRows) {
+    fileSheet("'a|1", [](auto& p) {
+        p.SetReadOptionPadColumnsWithMissingValues(true);
+        p.SetReadOptionIgnoreBlankRows(true);
+    });
+    provider.RemoveWorksheet(0);
+    provider.AddWorksheet("again");
+    file(provider, 0, "'b||2|3");
+    file(provider, 1, "'c");
+    provider.GetWorksheetPrimeKeys();
+    EXPECT_EQ(brief(1) + ", " + brief(2), "b: 2 3, c: * *");
+    provider.SetReadOptionIgnoreBlankRows(false);
+    EXPECT_EQ(brief(1), "b: * 2 3");
+    file(provider, 1, "|1");
+    provider.SetReadOptionIgnoreBlankRows(true);
+    EXPECT_EQ(brief(1), "b: * 2 3") << "the blank rows are those at the time of the call";
+}
+
+TEST_F(ColumnsOnDemand, PassesOverBlankRowsForItsHost) {
+    const auto filled = [this](double from, double to) {
+        provider.SetMissingNumeric(from, to);
+        NumericColumn column;
+        column.values.reset(new double[4]{9, 9, 9, 9});
+        const CellColumn& cells = provider._cells[0].nth(0).second;
+        const unsigned slots = provider.HandleBlankRows(&column, 1, 2, 4, cells.lower_bound(4));
+        std::string text = std::to_string(slots) + ":";
+        for (int row = 0; row < 4; ++row) text += " " + std::to_string(static_cast<int>(column.values[row]));
+        return text;
+    };
+    fileSheet("'n|1|||4|5", {});
+    EXPECT_EQ(filled(1, -7), "2: 9 9 9 9") << "missing numbers stay";
+    EXPECT_EQ(filled(kMissing, -7), "2: 9 -7 -7 9");
+    provider.SetReadOptionIgnoreBlankRows(true);
+    EXPECT_EQ(filled(kMissing, -7), "0: 9 9 9 9");
+}
+
+TEST_F(ColumnsOnDemand, TakesItsOwnAnswersAsArguments) {
+    struct Counted : HandHelper {
+        explicit Counted(int& count) : deleted(count) {}
+        ~Counted() override { ++deleted; }
+        int& deleted;
+    };
+    int deleted = 0;
+    provider.SetDateTimeVariableFormatHelper(new Counted(deleted));
+    provider.SetDateTimeVariableFormatHelper(provider.GetDateTimeVariableFormatHelper());
+    EXPECT_EQ(deleted, 0);
+    provider.SetDateTimeVariableFormatHelper(nullptr);
+    EXPECT_EQ(deleted, 1);
+    provider.SetMissingText("from", "to");
+    provider.SetMissingText(provider.GetMissingTextTo(), provider.GetMissingTextFrom());
+    EXPECT_EQ(std::string(provider.GetMissingTextFrom()) + provider.GetMissingTextTo(), "tofrom");
 }
 
 TEST_F(ColumnsOnDemand, ConvertsAPreviewAndAsksForAFormatOnceAStyle) {

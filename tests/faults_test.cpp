@@ -1,11 +1,13 @@
 #include <dlfcn.h>
 
 #include <csignal>
+#include <deque>
 #include <functional>
 #include <sys/resource.h>
 #include <sys/statvfs.h>
 
 #include "provider/xlsx_data_provider.h"
+#include "readers/file_copy.h"
 #include "readers/limits.h"
 #include "tests/package_builder.h"
 #include "tests/temporary_files.h"
@@ -14,25 +16,60 @@
 
 // Faults of the machine, made on purpose: this program stands between the library and the C library.
 // Whatever fails, the disk is clean once the provider is closed, and the same provider opens a good
-// workbook. What lacks memory or descriptors and what has
-// spoilt bytes is tested in fuzz/.
+// workbook. What lacks memory or descriptors and what has damaged bytes is tested in fuzz/.
 namespace {
 
-std::uint64_t freeBytes = 0;                         // of every file system; 0 for the truth
+// What the next looks at the file systems find free, the last one from then on; none for the truth.
+std::deque<std::uint64_t> freeBytes;
 std::function<bool()> copies = [] { return true; };  // asked once; false for an error
+bool slow = false;                                   // reads and writes are interrupted, and of one byte
+bool closes = true;                                  // asked once; false for an error
+
+constexpr std::uint64_t kNoBlocks = 0;  // free bytes of a file system that does not count them
+
+// Every other call, while they are slow.
+bool interrupted() {
+    static bool turn = false;
+    turn = slow && !turn;
+    if (turn) errno = EINTR;
+    return turn;
+}
 
 }  // namespace
 
+template <class Function>
+Function* realOne(Function*, const char* name) {
+    return reinterpret_cast<Function*>(::dlsym(RTLD_NEXT, name));
+}
+
 extern "C" int statvfs(const char* path, struct statvfs* status) noexcept {
-    static const auto real = reinterpret_cast<decltype(&statvfs)>(::dlsym(RTLD_NEXT, "statvfs"));
+    static const auto real = realOne(&statvfs, "statvfs");
     const int result = real(path, status);
-    if (freeBytes > 0) status->f_bavail = freeBytes / status->f_frsize;
+    if (freeBytes.empty()) return result;
+    status->f_frsize = 1;
+    status->f_bavail = freeBytes.front();
+    status->f_blocks = freeBytes.front() == kNoBlocks ? 0 : 1;
+    if (freeBytes.size() > 1) freeBytes.pop_front();
     return result;
+}
+
+// Called by the library alone: the C++ library does not see these.
+extern "C" ssize_t read(int file, void* bytes, std::size_t size) {
+    static const auto real = realOne(&read, "read");
+    return interrupted() ? -1 : real(file, bytes, slow ? std::min<std::size_t>(size, 1) : size);
+}
+extern "C" ssize_t write(int file, const void* bytes, std::size_t size) {
+    static const auto real = realOne(&write, "write");
+    return interrupted() ? -1 : real(file, bytes, slow ? std::min<std::size_t>(size, 1) : size);
+}
+extern "C" int close(int file) {
+    static const auto real = realOne(&close, "close");
+    return real(file) == 0 && std::exchange(closes, true) ? 0 : -1;
 }
 
 // Called by the C++ library, which must see it.
 extern "C" [[gnu::visibility("default")]] ssize_t sendfile(int out, int in, off_t* offset, std::size_t size) noexcept {
-    static const auto real = reinterpret_cast<decltype(&sendfile)>(::dlsym(RTLD_NEXT, "sendfile"));
+    static const auto real = realOne(&sendfile, "sendfile");
     if (std::exchange(copies, [] { return true; })()) return real(out, in, offset, size);
     errno = EIO;
     return -1;
@@ -66,6 +103,15 @@ class Faults : public TemporaryFiles {
         EXPECT_EQ(provider.GetColumnPrimeKeys(1)->Count(), 1UL);
         provider.CloseFile();
         provider.ClearWorksheets();
+    }
+    // Opens with so much free space; what does not fit leaves nothing.
+    void expectOutcome(const char* name, const std::deque<std::uint64_t>& space, long result) {
+        SCOPED_TRACE(name + std::to_string(space.back()));
+        freeBytes = space;
+        EXPECT_EQ(open(file(name)), result);
+        freeBytes.clear();
+        EXPECT_EQ(fs::exists(provider.GetTempDirectoryPath()), result == 0);
+        expectRecovery();
     }
     void expectResult(const std::string& path, long result) {
         EXPECT_EQ(open(path), result);
@@ -109,12 +155,29 @@ TEST_F(Faults, OfFullDisks) {
         EXPECT_EQ(open(file("large.xlsx")), result) << bytes;
         ::setrlimit(RLIMIT_FSIZE, &limit);
         expectRecovery();
-        freeBytes = bytes;
-        EXPECT_EQ(open(file("large.xlsx")), result) << bytes;
-        EXPECT_EQ(fs::exists(provider.GetTempDirectoryPath()), result == 0);
-        freeBytes = 0;
-        expectRecovery();
+        expectOutcome("large.xlsx", {bytes}, result);
     }
+    // A part is left to others; they, too, fill the disk while an entry is written.
+    constexpr std::uint64_t kLarge = 1 << 30;
+    PackageBuilder::of({""}).add("a", std::string(2 * dp::kSpaceCheckInterval + 100'000, ' ')).write(file("huge.xlsx"));
+    expectOutcome("large.xlsx", {105'000}, -1);
+    expectOutcome("large.xlsx", {115'000}, 0);
+    expectOutcome("huge.xlsx", {kLarge, kLarge, kLarge / dp::kSpareSpaceDivisor}, 0);
+    expectOutcome("huge.xlsx", {kLarge, kLarge, kLarge, kLarge / dp::kSpareSpaceDivisor - 1}, -1);
+    expectOutcome("huge.xlsx", {kNoBlocks}, 0);
+}
+
+TEST_F(Faults, OfSlowAndBadDisks) {
+    slow = true;
+    EXPECT_EQ(open(good()), 0);
+    slow = false;
+    EXPECT_EQ(provider.GetColumnPrimeKeys(1)->Count(), 1UL);
+    expectRecovery();
+    closes = false;
+    expectResult(good(), -1);
+    copies = [] { return false; };
+    EXPECT_FALSE(dp::copyFile(good(), file("copy.xlsx")));
+    EXPECT_FALSE(fs::exists(file("copy.xlsx")));
 }
 
 TEST_F(Faults, OfPackagesBeyondTheLimits) {

@@ -4,6 +4,9 @@
 
 #include "model/host/entry_points.h"
 #include "provider/entry_name.h"
+#include "provider/package.h"
+#include "provider/temporary_directory.h"
+#include "readers/file_copy.h"
 #include "readers/xml_reader.h"
 #include "tests/case_table.h"
 #include "tests/package_builder.h"
@@ -109,6 +112,10 @@ TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
         ::umask(before);
         ASSERT_EQ(result, 0);
         EXPECT_EQ(fs::status(provider.GetTempDirectoryPath()).permissions(), fs::owner_all);
+        for (const char* entry : {"book.xlsx", "docs", "docs/deep/er/a.txt", "xl/workbook.xml"}) {
+            const fs::file_status status = fs::status(provider.GetTempDirectoryPath() + "/" + entry);
+            EXPECT_EQ(status.permissions(), status.type() == fs::directory_file ? 0700 : 0600) << entry;
+        }
     }
     const fs::path directory = provider.GetTempDirectoryPath();
     EXPECT_EQ(directory.parent_path(), temporary());
@@ -179,6 +186,33 @@ TEST_F(Opening, WritesNothingOutside) {
         EXPECT_TRUE(fs::is_empty(temporary()));
         EXPECT_FALSE(fs::exists(file("escaped")) || fs::exists(temporary() / "escaped"));
     }
+}
+
+// Somebody else may have put links where entries go.
+TEST_F(Opening, FollowsNoLinks) {
+    sound().write(file("book.xlsx"));
+    write("outside/styles.xml", "kept");
+    const std::pair<const char*, std::string> links[] = {{"xl", "outside"}, {"xl/styles.xml", "outside/styles.xml"}};
+    for (const auto& [link, target] : links) {
+        const fs::path directory = files() / "unpacked";
+        fs::create_directories((directory / link).parent_path());
+        fs::create_symlink(file(target), directory / link);
+        EXPECT_EQ(dp::unpackArchive(file("book.xlsx"), directory.string()), dp::PackageStatus::EntryError) << link;
+        EXPECT_EQ(fs::file_size(file("outside/styles.xml")), 4U) << link;
+        fs::remove_all(directory);
+    }
+    EXPECT_EQ(std::distance(fs::directory_iterator(files() / "outside"), fs::directory_iterator()), 1);
+    dp::removeDirectoryAndContents(file("book.xlsx"));
+    EXPECT_TRUE(fs::exists(file("book.xlsx"))) << "no directory";
+}
+
+TEST_F(Opening, CopiesForItsOwnerAndOverNothing) {
+    fs::permissions(write("from", "new"), fs::owner_all | fs::group_read | fs::others_read);
+    EXPECT_TRUE(dp::copyFile(file("from"), file("to")));
+    EXPECT_EQ(fs::status(file("to")).permissions(), fs::owner_read | fs::owner_write);
+    write("there", "kept by all means");
+    EXPECT_FALSE(dp::copyFile(file("from"), file("there")));
+    EXPECT_EQ(fs::file_size(file("there")), 17U);
 }
 
 TEST_F(Opening, CopiesAcrossFileSystems) {

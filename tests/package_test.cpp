@@ -97,6 +97,22 @@ TEST_F(Packages, SharedStringTables) {
         EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", c[1])), c[2]) << c[0];
 }
 
+// A provider whose memory runs out gets no more of what was on its way to it.
+TEST_F(Packages, NothingFollowsAnErrorOfTheReceiver) {
+    struct Full : dp::xlsxDataProvider {
+        void AddExternalDataRecord(const dp::ExternalDataRecord&) override {
+            ++calls;
+            throw std::bad_alloc();
+        }
+        int calls = 0;
+    } provider;
+    PackageBuilder::of({"<row><c t='s'><v>0</v></c><c><v>1</v></c><c><v>2</v></c></row>"})
+        .set("xl/sharedStrings.xml", kStrings)
+        .write(file("book.xlsx"));
+    EXPECT_THROW(provider.OpenFile(file("book.xlsx").c_str(), Access::Read), std::bad_alloc);
+    EXPECT_EQ(provider.calls, 1);
+}
+
 // One long string in many cells: as many as are in proportion to the package, and then no more.
 TEST_F(Packages, RepeatedTextsHaveALimit) {
     const auto outcomeOf = [this](unsigned cells) {
