@@ -134,6 +134,11 @@ TRAITS = [
                          '<c r="A4"><v>7.5</v></c>'), "one column: 2 in My Data!A: ", 0),
     ("mixed-dates", rows('<c r="A2"><v>7</v></c>', '<c r="A3" s="1"><v>45296</v></c>'),
      "1 in My Data!A: the first value", 0),
+    ("worksheet-without-part", changed(WORKBOOK, "</sheets>", '<sheet name="Lost" r:id="b"/></sheets>'),
+     'worksheet "Lost" for which .*: it is not imported', 0),
+    ("worksheet-without-part", {**changed(LINKS, "</R", '<Relationship Id="b" Type="/worksheet" Target=""/>'
+     "</R"), WORKBOOK: PARTS[WORKBOOK].replace("</sheets>", '<sheet name="L" r:id="c"/><sheet name="M" r:id="b"/>'
+                                               "</sheets>")}, 'worksheets "L", "M" .*they are', 0),
     ("iso-dates", changed(SHEET, CELL, '<c r="B2" t = \'d\'><v>2024-01-05</v></c>'),
      r"1 date \(My Data!B2\).*of a date the year", 0),
     ("date-system-1904", changed(WORKBOOK, "<workbookPr", '<workbookPr date1904="true"'),
@@ -167,7 +172,10 @@ TRAITS = [
     ("not-taken-for-dates", with_format("DD/MM/YYYY"), "--type 'My Data!B=datetime'", 0),
     ("not-taken-for-dates", changed(STYLES, '<xf numFmtId="164"/>', '<xf numFmtId="31"/>'),
      "built-in 31", 0),
-    ("not-taken-for-dates", changed(STYLES, ' count="1"', ""), "day numbers arrive", 0),
+    ("number-format-count", changed(STYLES, ' count="1"', ""),
+     r"1 date \(My Data!B2\).*\(the count of numFmts\).*'My Data!B=datetime'", 0),
+    ("number-format-count", changed(STYLES, "<numFmt ", '<numFmt numFmtId="170" formatCode="0.0"/>'
+     "<numFmt "), '"m/d/yyyy": day numbers arrive', 0),
     ("default-date-style", with_format("dd\\.mm\\.yyyy"), '"dd.mm.yyyy".*default date style', 0),
     ("default-date-style", with_format("[HH]:mm"), "values are right", 0),
     ("taken-for-dates", with_format('0.0_h"dmy"\\s*y[>5]'), "0.0_h", 0),
@@ -185,12 +193,22 @@ TRAITS = [
      '</r></is></c>'), "only the last piece", 0),
     ("inline-values", changed(SHEET, CELL, '<c r="B2" t="inlineStr"><v>1.0</v><is><t>1.</t></is></c>'),
      r"1 cell \(My Data!B2\) with an inline text and a value", 0),
+    ("values-in-pieces", rows('<c r="A2"><v>1<![CDATA[5]]></v></c>', '<c r="A3"><v>1<!-- . -->5</v></c>'),
+     r"2 cells \(first: My Data!A2\) with .* divide: only the first piece", 0),
+    ("values-in-pieces", rows('<c r="A2" t="inlineStr"><is><t>a<![CDATA[b]]></t></is></c>'), r"1 cell \(My Data!A2\)", 0),
+    ("booleans-as-words", rows('<c r="A2" t="b"><v> true </v></c>', '<c r="A3" t="b"><v>false</v></c>',
+                               '<c r="A4" t="b"><v>TRUE</v></c>'), r"2 Booleans \(first: My Data!A2\)", 0),
+    ("not-a-number", rows('<c r="A2"><v>1,5</v></c>', '<c r="A3" t="b"><v>abc</v></c>', '<c r="A4"><v> </v></c>'),
+     r'3 cells \(first: My Data!A2\) .* such as "1,5": the number at the beginning .* or 0', 0),
+    ("lower-case-references", rows('<c r="a2"><v>1</v></c>', '<c r="Ab3"><v>2</v></c>'),
+     r"2 cells \(first: My Data!a2\).* in column AG, the others", 0),
+    ("lower-case-references", rows('<c r="aaa2"><v>1</v></c>'), r"1 cell \(My Data!aaa2\).*the import fails", 13),
     ("unreadable", changed(SHEET, "</sheetData>", ""), '"xl/worksheets/sheet1.xml" is .*damaged', 13),
     ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
 ]
 # Those that a plain import tells of when it goes well.
 WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904",
-         "shared-strings-missing")
+         "shared-strings-missing", "worksheet-without-part")
 
 
 def repacked(target, change, packing=zipfile.ZIP_STORED):
@@ -589,6 +607,21 @@ class ToolTest(unittest.TestCase):
                 "[Red]0.00")[STYLES]}, []),
             ("a date of the default style among numbers", {**rows(dated, lost), STYLES: with_format(
                 "dd.mm.yyyy")[STYLES]}, ["mixed-dates"]),
+            ("a sheet of macros", {**changed(LINKS, "</R", '<Relationship Id="b" Target="m.xml" Type="/xlMacrosheet"/>'
+             "</R"), WORKBOOK: PARTS[WORKBOOK].replace("</sheets>", '<sheet name="M" r:id="b"/></sheets>')}, []),
+            ("numbers in unusual forms", rows(
+                '<c r="A2"><v> +7.5\n</v></c>', '<c r="A3"><v><![CDATA[5]]></v></c>', '<c r="A4"><v><!-- x -->1E5</v></c>',
+                '<c r="A5" t="b"><v>False</v></c>', '<c r="b6" t="n"><v></v> </c>'), []),
+            ("more formats declared than there are", changed(STYLES, 'count="1"', 'count="2"'), []),
+            ("a text of several reads", rows('<c r="A2" t="inlineStr"><is> <t>' + "x" * 100000 + "</t> </is></c>"),
+             ["--max-text", "none"]),
+            ("a last name that is a text", {**PARTS, SHEET: SHEET_OF.format(
+                '<row r="1"><c r="A1"><v>1</v></c><c r="B1" t="inlineStr"><is><t>n</t></is></c></row>'
+                '<row r="2"><c r="A2"><v>1</v></c></row>')}, []),
+            ("inline texts in a column that is left out", rows(
+                '<c r="A2"><v>1</v></c><c r="B2" t="inlineStr"><is><t>a<!-- -->b</t><t>c</t><rPh><t>d</t></rPh></is></c>',
+                '<c r="B3"><f>1+1</f></c>', '<c r="b4"><v>abc</v></c>', '<c r="A5"><v>1</v></c>'),
+             ["--exclude", "B", "--exclude", "AH"]),
             ("a column that is left out", rows(dated, lost), ["--exclude", "A"]),
             ("a worksheet that is left out", rows(dated, lost), ["--exclude-sheet", "1"]),
             ("a kind that the user chose", rows(dated, lost), ["--type", "A=datetime"])]

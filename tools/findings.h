@@ -33,6 +33,7 @@ struct MovedPart {
 struct UsedFormat {
     std::string code;  // "built-in 30" for one that has none
     bool isDate;       // by the rules of spreadsheet programs
+    bool isUncounted;  // beyond the number of formats that the style sheet declares
 };
 
 // The cells of one style in one column.
@@ -71,6 +72,7 @@ struct Findings {
     FileKind kind = FileKind::Workbook;
     bool namedXlsx = true;
 
+    Names lostWorksheets;  // without a relationship that leads to their part
     Names prefixedParts;
     std::string prefixedName;  // the first one, such as "x:workbook"
     // Notes a part whose elements have a prefix, with the name of the first such element in it.
@@ -104,6 +106,13 @@ struct Findings {
     Names hiddenWorksheets;           // those that are imported
     Places runs;                      // inline texts of several runs
     Places inlineValues;              // inline texts of cells that have a value too
+    Places pieces;                    // values and inline texts of which a first piece arrives
+    Places booleanWords;              // TRUE in letters
+    Places notNumbers;                // texts where numbers belong
+    std::string notNumber;            // the first of them
+    Places lowerCase;                 // references, of cells with content
+    std::string lowerCaseColumn;      // where the first of them arrives
+    bool lowerCaseFails = false;      // one of them is beyond the last column
     std::vector<std::string> broken;  // parts that are missing or break off
 
     // What an import lost, which the package alone does not show.

@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <filesystem>
 #include <map>
+#include <set>
 #include <vector>
 
 #include "tools/number_formats.h"
@@ -145,13 +146,22 @@ class Inspector {
     }
 
     void takeRelationship(const PartReader& reader, const std::string& folder) {
-        const std::string type = lastStep(reader.attribute("Type").value_or(""));
-        const std::string part = resolved(folder, reader.attribute("Target").value_or(""));
-        if (type == "worksheet" && worksheetParts_.size() < kMostRelationships) {
-            worksheetParts_.emplace(reader.attribute("Id").value_or(""), part);
-        } else if (type == "officeDocument" || type == "styles" || type == "sharedStrings") {
-            partsByType_.emplace(type, part);
+        const std::string type = reader.attribute("Type").value_or("");
+        const std::string kind = lastStep(type);
+        const std::string id = reader.attribute("Id").value_or("");
+        const std::string target = reader.attribute("Target").value_or("");
+        if (kind == "worksheet") {
+            const bool leads = type.size() > kind.size() + 1 && !target.empty();
+            if (leads && !isFull()) worksheetParts_.emplace(id, resolved(folder, target));
+        } else if (kind.ends_with("sheet")) {
+            if (!isFull()) otherSheets_.insert(id);
+        } else if (kind == "officeDocument" || kind == "styles" || kind == "sharedStrings") {
+            partsByType_.emplace(kind, resolved(folder, target));
         }
+    }
+
+    bool isFull() const {
+        return worksheetParts_.size() + otherSheets_.size() >= kMostRelationships;
     }
 
     void readWorkbook(const std::string& part) {
@@ -172,12 +182,20 @@ class Inspector {
         const auto id = reader.relationshipId();
         if (id && !reader.hasWritten("r:id")) findings_.relationshipPrefixed = true;
         const auto found = worksheetParts_.find(id.value_or(""));
-        if (found == worksheetParts_.end() || worksheets_.size() >= kMostWorksheets) return;
+        if (found == worksheetParts_.end()) return noteLost(reader, id.value_or(""));
+        if (worksheets_.size() >= kMostWorksheets) return;
         const std::string part = partOf(found->second);
         if (part.empty()) return findings_.broken.push_back(found->second);
         const std::string state = reader.attribute("state").value_or("visible");
         worksheets_.push_back(
             {reader.attribute("name").value_or(""), part, state != "visible", worksheets_.size()});
+    }
+
+    // Charts and dialogs have other relationships, and an import leaves them out by intent.
+    void noteLost(const PartReader& reader, const std::string& id) {
+        const bool known = id.empty() || otherSheets_.count(id) != 0 || isFull();
+        if (known || !findings_.broken.empty()) return;  // a broken part explains more
+        findings_.lostWorksheets.add(reader.attribute("name").value_or(""));
     }
 
     std::string partOf(const std::string& wanted) {
@@ -252,6 +270,7 @@ class Inspector {
     Findings findings_;
     std::map<std::string, std::string> partsByType_;
     std::map<std::string, std::string> worksheetParts_;  // by relationship id
+    std::set<std::string> otherSheets_;                  // relationship ids
     std::vector<WorksheetPart> worksheets_;
     NumberFormats formats_;
     bool counted_ = true;  // the table of shared texts

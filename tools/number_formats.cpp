@@ -5,8 +5,6 @@
 #include <string_view>
 #include <utility>
 
-#include "tools/part_reader.h"
-
 namespace dp::tool {
 
 namespace {
@@ -36,10 +34,10 @@ constexpr std::pair<int, const char*> kBuiltInDates[] = {
 
 UsedFormat builtIn(int id) {
     for (const auto& [date, code] : kBuiltInDates) {
-        if (id == date) return {code, true};
+        if (id == date) return {code, true, false};
     }
     const bool eastAsian = (id >= 27 && id <= 36) || (id >= 50 && id <= 58);
-    return {"built-in " + std::to_string(id), eastAsian};
+    return {"built-in " + std::to_string(id), eastAsian, false};
 }
 
 int number(const std::optional<std::string>& text) {
@@ -62,9 +60,9 @@ void NumberFormats::read(Package& package, const std::string& name, Findings& fi
             findings.stylesPrefixed = true;
             findings.notePrefix(name, reader.writtenName());
         }
+        if (reader.element() == "numFmts") declared_ = number(reader.attribute("count"));
         if (section == "numFmts" && reader.element() == "numFmt" && codes_.size() < kMostStyles) {
-            const std::string code = reader.attribute("formatCode").value_or("");
-            codes_[number(reader.attribute("numFmtId"))] = code.substr(0, kLongestCode);
+            takeCode(reader);
         }
         if (section == "cellXfs" && reader.element() == "xf" && formatIds_.size() < kMostStyles) {
             formatIds_.push_back(number(reader.attribute("numFmtId")));
@@ -73,10 +71,21 @@ void NumberFormats::read(Package& package, const std::string& name, Findings& fi
     if (reader.isBroken()) findings.broken.push_back(name);
 }
 
+void NumberFormats::takeCode(const PartReader& reader) {
+    const std::string text = reader.attribute("formatCode").value_or("");
+    Code& code = codes_[number(reader.attribute("numFmtId"))];
+    code.text = text.substr(0, kLongestCode);
+    if (text.empty()) return;
+    if (taken_ < declared_) code.isUncounted = false;
+    ++taken_;
+}
+
 UsedFormat NumberFormats::of(int style) const {
     const int id = formatIds_[static_cast<size_t>(style)];
     const auto code = codes_.find(id);
-    if (code != codes_.end()) return {code->second, isDateCode(code->second)};
+    if (code != codes_.end()) {
+        return {code->second.text, isDateCode(code->second.text), code->second.isUncounted};
+    }
     return builtIn(id);
 }
 

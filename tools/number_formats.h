@@ -6,6 +6,7 @@
 
 #include "tools/findings.h"
 #include "tools/package.h"
+#include "tools/part_reader.h"
 
 namespace dp::tool {
 
@@ -21,7 +22,16 @@ class NumberFormats {
     UsedFormat of(int style) const;
 
   private:
-    std::map<int, std::string> codes_;
+    struct Code {
+        std::string text;
+        bool isUncounted = true;  // beyond the declared number of codes
+    };
+
+    void takeCode(const PartReader& reader);
+
+    std::map<int, Code> codes_;   // by id
+    int declared_ = 0;            // codes, as the style sheet says
+    int taken_ = 0;               // codes, so far
     std::vector<int> formatIds_;  // by cell style
 };
 

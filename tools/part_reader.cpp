@@ -98,7 +98,9 @@ bool PartReader::nextElement() {
 }
 
 bool PartReader::isText() const {
-    return xmlTextReaderNodeType(reader_.get()) == XML_READER_TYPE_TEXT || isCData();
+    const int type = xmlTextReaderNodeType(reader_.get());
+    return type == XML_READER_TYPE_TEXT || type == XML_READER_TYPE_SIGNIFICANT_WHITESPACE ||
+           isCData();
 }
 
 bool PartReader::isCData() const {

@@ -24,6 +24,7 @@ class PartReader {
     // Skips texts.
     bool nextElement();
 
+    // White space between elements is a text too.
     bool isText() const;
     // Whether the text is written as a CDATA section.
     bool isCData() const;

@@ -1,8 +1,6 @@
 #include "tools/traits.h"
 
 #include <algorithm>
-#include <optional>
-#include <set>
 
 #include "tools/exit_code.h"
 #include "tools/text.h"
@@ -10,41 +8,6 @@
 namespace dp::tool {
 
 namespace {
-
-using Found = std::optional<Trait>;
-
-constexpr const char* kOpenFails = "the import fails";
-constexpr const char* kSaveAgain =
-    "open the book in a spreadsheet program and save it as .xlsx again";
-
-std::string quoted(const std::string& text) { return "\"" + text + "\""; }
-
-// "A", "B", "C" and 4 more
-std::string listed(const Names& names, bool quotes) {
-    std::string text;
-    for (const std::string& name : names.first) {
-        text += (text.empty() ? "" : ", ") + (quotes ? quoted(name) : name);
-    }
-    if (names.count > names.first.size()) {
-        text += " and " + std::to_string(names.count - names.first.size()) + " more";
-    }
-    return text;
-}
-
-std::string worksheets(const Names& names) {
-    return (names.count == 1 ? "worksheet " : "worksheets ") + listed(names, true);
-}
-
-std::string placed(const Places& places, const std::string& unit) {
-    const std::string first = places.count == 1 ? " (" : " (first: ";
-    return counted(places.count, unit) + first + places.first + ")";
-}
-
-std::string joined(const std::vector<std::string>& texts, const char* between) {
-    std::string result;
-    for (const std::string& text : texts) result += (result.empty() ? "" : between) + text;
-    return result;
-}
 
 Found namespacePrefix(const Findings& findings) {
     const bool fatal = findings.workbookPrefixed || findings.relationshipPrefixed;
@@ -110,6 +73,20 @@ Found datesFrom1904(const Findings& findings) {
                  "add 1462 to them after the import",
                  false,
                  "dates, if there are any, arrive 1,462 days early"};
+}
+
+Found lostWorksheets(const Findings& findings) {
+    const Names& sheets = findings.lostWorksheets;
+    if (sheets.count == 0) return std::nullopt;
+    const bool one = sheets.count == 1;
+    return Trait{"worksheet-without-part",
+                 worksheets(sheets) +
+                     " for which the package has no relationship to a worksheet's "
+                     "part (xl/_rels/workbook.xml.rels)",
+                 one ? "it is not imported" : "they are not imported",
+                 "get a fresh copy, or " + std::string(kSaveAgain),
+                 false,
+                 worksheets(sheets) + (one ? " is not imported" : " are not imported")};
 }
 
 struct OtherFile {
@@ -178,110 +155,6 @@ Found movedParts(const Findings& findings) {
     }
     return Trait{"part-names", found, textsOnly ? "the shared texts are missing" : kOpenFails,
                  kSaveAgain, !textsOnly};
-}
-
-// The code without the backslashes, which spreadsheet programs do not show.
-std::string asDisplayed(std::string code) {
-    code.erase(std::remove(code.begin(), code.end(), '\\'), code.end());
-    return code;
-}
-
-// The cells of some styles in some columns.
-struct Collected {
-    Places cells;
-    Names codes;                          // each one once
-    std::vector<std::string> references;  // the columns, each one once
-    std::set<std::string> seen;
-
-    void add(const StyledCells& of, const std::string& code) {
-        if (cells.count == 0) cells.first = of.cells.first;
-        cells.count += of.cells.count;
-        if (seen.insert(code).second) codes.add(asDisplayed(code));
-        const bool isNew = references.empty() || references.back() != of.reference;
-        if (isNew) references.push_back(of.reference);  // they come column by column
-    }
-
-    std::string types(const char* type) const {
-        std::string text;
-        for (const std::string& reference : references) {
-            const std::string column = reference.empty() ? "COLUMN" : reference;
-            text += (text.empty() ? "--type " : " --type ") + shellWord(column + "=" + type);
-        }
-        return text;
-    }
-};
-
-// Those for which `matches` holds: of the format's being a date, the library's answer, and the kind
-// of the column.
-template <class Matches>
-Collected collected(const Findings& findings, const std::map<int, StyleAnswer>& answers,
-                    Matches matches) {
-    Collected result;
-    for (const auto& [key, cells] : findings.styledCells) {
-        const auto format = findings.formats.find(key.style);
-        const auto answer = answers.find(key.style);
-        if (format == findings.formats.end() || answer == answers.end()) continue;
-        if (matches(format->second.isDate, answer->second, cells.kind)) {
-            result.add(cells, format->second.code);
-        }
-    }
-    return result;
-}
-
-bool mayBe(const std::optional<Kind>& kind, Kind wanted) { return !kind || *kind == wanted; }
-
-Found takenForDates(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    const Collected found = collected(findings, answers, [](bool isDate, auto answer, auto kind) {
-        return answer.isDate && !isDate && mayBe(kind, Kind::DateTime);
-    });
-    if (found.cells.count == 0) return std::nullopt;
-    return Trait{"taken-for-dates",
-                 placed(found.cells, "number") +
-                     " in formats with words or colours: " + listed(found.codes, true),
-                 "date-times arrive", "read the column as numbers: " + found.types("numeric")};
-}
-
-Found notTakenForDates(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    const Collected found = collected(findings, answers, [](bool isDate, auto answer, auto kind) {
-        return !answer.isDate && isDate && mayBe(kind, Kind::Number);
-    });
-    if (found.cells.count == 0) return std::nullopt;
-    return Trait{
-        "not-taken-for-dates",
-        placed(found.cells, "date") +
-            " in formats that the import does not know as dates: " + listed(found.codes, true),
-        "day numbers arrive", "read the column as dates: " + found.types("datetime")};
-}
-
-Found defaultDateStyle(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    const Collected found = collected(findings, answers, [](bool isDate, auto answer, auto kind) {
-        return answer.isDate && isDate && !answer.hasPattern && mayBe(kind, Kind::DateTime);
-    });
-    if (found.cells.count == 0) return std::nullopt;
-    return Trait{"default-date-style",
-                 placed(found.cells, "date") +
-                     " in formats without a counterpart: " + listed(found.codes, true),
-                 "the values are right, the look is that of the default date style",
-                 "for a fixed look, use a format such as m/d/yyyy"};
-}
-
-// The first value decides what all cells of a column are.
-Found mixedDates(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
-    Tally cells;
-    for (const auto& [key, styled] : findings.styledCells) {
-        const auto format = findings.formats.find(key.style);
-        const auto answer = answers.find(key.style);
-        const bool isDate = format != findings.formats.end() && format->second.isDate;
-        const bool taken = answer != answers.end() && answer->second.isDate;
-        const bool mixed = (styled.kind == Kind::Number && isDate && taken) ||
-                           (styled.kind == Kind::DateTime && !isDate && !taken);
-        if (mixed && !styled.isChosen) cells.add({styled.reference, "", styled.cells.count});
-    }
-    if (cells.empty()) return std::nullopt;
-    return Trait{
-        "mixed-dates", "dates and numbers in one column: " + cells.text(cells.columns()),
-        "the first value of the column decides: dates arrive as day numbers, or numbers as dates",
-        "give them columns of their own"};
 }
 
 Found shownInTexts(const Findings& findings) {
@@ -370,6 +243,45 @@ Found cdataTexts(const Findings& findings) {
                  "what stands in them is missing", kSaveAgain};
 }
 
+Found piecesOfValues(const Findings& findings) {
+    if (findings.pieces.count == 0) return std::nullopt;
+    return Trait{"values-in-pieces",
+                 placed(findings.pieces, "cell") +
+                     " with a value or text that CDATA sections or comments divide",
+                 "only the first piece arrives", kSaveAgain};
+}
+
+Found booleanWords(const Findings& findings) {
+    if (findings.booleanWords.count == 0) return std::nullopt;
+    return Trait{"booleans-as-words",
+                 placed(findings.booleanWords, "Boolean") + " written as the word true",
+                 "0 arrives, as for FALSE", kSaveAgain};
+}
+
+Found notNumbers(const Findings& findings) {
+    if (findings.notNumbers.count == 0) return std::nullopt;
+    return Trait{"not-a-number",
+                 placed(findings.notNumbers, "cell") + " of numbers with " +
+                     (findings.notNumbers.count == 1 ? "" : "texts such as ") +
+                     quoted(findings.notNumber),
+                 "the number at the beginning of such a text arrives, or 0",
+                 "let the program that makes the book write plain numbers, such as 1.5"};
+}
+
+Found lowerCase(const Findings& findings) {
+    if (findings.lowerCase.count == 0) return std::nullopt;
+    const std::string found =
+        placed(findings.lowerCase, "cell") + " with lower-case letters in the reference";
+    if (findings.lowerCaseFails) {
+        return Trait{"lower-case-references", found, kOpenFails, kSaveAgain, true};
+    }
+    const std::string first = findings.lowerCase.count == 1 ? "it" : "the first one";
+    return Trait{"lower-case-references", found,
+                 first + " arrives in column " + findings.lowerCaseColumn +
+                     (findings.lowerCase.count == 1 ? "" : ", the others are moved as well"),
+                 kSaveAgain};
+}
+
 Found lostCells(const Findings& findings) {
     const Tally& cells = findings.lost.cells;
     if (cells.empty()) return std::nullopt;
@@ -396,7 +308,7 @@ void add(std::vector<Trait>& traits, Found found) {
 
 }  // namespace
 
-std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleAnswer>& answers) {
+std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers) {
     std::vector<Trait> traits = quickTraitsOf(findings);
     add(traits, noStyleSheet(findings));
     add(traits, movedParts(findings));
@@ -408,11 +320,13 @@ std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleA
     if (!findings.stylesPrefixed) {  // else that explains what becomes of the formats
         add(traits, takenForDates(findings, answers));
         add(traits, notTakenForDates(findings, answers));
+        add(traits, uncountedFormats(findings, answers));
         add(traits, mixedDates(findings, answers));
         add(traits, defaultDateStyle(findings, answers));
     }
-    for (const auto trait : {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns,
-                             inlineValues, cdataTexts}) {
+    for (const auto trait :
+         {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns, inlineValues,
+          cdataTexts, piecesOfValues, booleanWords, notNumbers, lowerCase}) {
         add(traits, trait(findings));
     }
     return traits;
@@ -420,8 +334,8 @@ std::vector<Trait> traitsOf(const Findings& findings, const std::map<int, StyleA
 
 std::vector<Trait> quickTraitsOf(const Findings& findings) {
     std::vector<Trait> traits;
-    for (const auto trait :
-         {namespacePrefix, stringsWithoutCount, missingTexts, isoDates, datesFrom1904, otherFile}) {
+    for (const auto trait : {namespacePrefix, stringsWithoutCount, missingTexts, lostWorksheets,
+                             isoDates, datesFrom1904, otherFile}) {
         add(traits, trait(findings));
     }
     return traits;

@@ -1,6 +1,8 @@
 #include "tools/worksheet_inspection.h"
 
 #include <algorithm>
+#include <cctype>
+#include <cmath>
 #include <cstdlib>
 #include <cstring>
 #include <fstream>
@@ -14,6 +16,28 @@
 namespace dp::tool {
 
 namespace {
+
+bool isSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
+
+// Whether an import takes all of the text for a number. One that is none or infinite does not
+// arrive as another one.
+bool isNumber(const std::string& text) {
+    char* end = nullptr;
+    const double value = std::strtod(text.c_str(), &end);
+    const bool found = end != text.c_str();
+    while (isSpace(*end)) ++end;
+    return found && (*end == '\0' || !std::isfinite(value));
+}
+
+// The text without the white space around it, in lower case.
+std::string lowerWord(std::string_view text) {
+    while (!text.empty() && isSpace(text.front())) text.remove_prefix(1);
+    while (!text.empty() && isSpace(text.back())) text.remove_suffix(1);
+    std::string word(text);
+    std::transform(word.begin(), word.end(), word.begin(),
+                   [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
+    return word;
+}
 
 // One forward pass over the cells.
 class Pass {
@@ -47,16 +71,26 @@ class Pass {
   private:
     void takeNode() {
         if (reader_.isText()) {
-            if (inValue_) countValue();
-            inValue_ = false;
+            takeText();
         } else {
             takeElement(reader_.element());
         }
     }
 
+    // Comments and CDATA sections divide a text, and an import takes the first piece of it.
+    void takeText() {
+        if (reader_.depth() != contentDepth_ + 1) return;
+        if (++pieces_ == 1) return inValue_ ? countValue() : noteReference();
+        (inValue_ ? valueInPieces_ : textInPieces_) = true;
+    }
+
     void takeElement(std::string_view name) {
         inPhonetic_ = inPhonetic_ && reader_.depth() > phoneticDepth_;
         inValue_ = name == "v";
+        const bool inText = name == "t" && type_ == "inlineStr" && isInline();
+        if (inText) textInPieces_ = false;  // of several texts the last one arrives
+        contentDepth_ = inValue_ || inText ? reader_.depth() : kNoContent;
+        pieces_ = 0;
         if (name == "c") beginCell();
         if (name == "row") beginRow();
         if (name == "is") inlineDepth_ = reader_.depth();
@@ -80,7 +114,10 @@ class Pass {
     }
 
     void beginRow() {
-        row_ = static_cast<unsigned>(number(reader_.attribute("r")).value_or(row_ + 1));
+        endCell();
+        const auto given = number(reader_.attribute("r"));
+        rowIsGiven_ = given.has_value();
+        row_ = static_cast<unsigned>(given.value_or(row_ + 1));
         column_ = 0;
     }
 
@@ -97,10 +134,38 @@ class Pass {
     // A cell without a place follows the one before.
     void takeReference(const std::optional<std::string>& reference) {
         ++column_;
+        isLowerCase_ = false;
         if (!reference) return;
         const size_t digits = std::min(reference->find_first_of("0123456789"), reference->size());
-        if (const auto column = columnNumber(reference->substr(0, digits))) column_ = *column;
+        const std::string letters = reference->substr(0, digits);
+        if (const auto column = columnNumber(letters)) {
+            isLowerCase_ = std::any_of(letters.begin(), letters.end(), isLower);
+            column_ = isLowerCase_ ? columnOfImport(letters) : *column;
+        }
+        if (rowIsGiven_) return;
         if (const auto row = number(reference->substr(digits))) row_ = static_cast<unsigned>(*row);
+    }
+
+    static bool isLower(char c) { return c >= 'a' && c <= 'z'; }
+
+    // An import takes all letters for upper-case ones, which lower-case ones are 32 characters
+    // behind.
+    static unsigned columnOfImport(const std::string& letters) {
+        unsigned column = 0;
+        for (const char letter : letters) column = column * 26 + static_cast<unsigned>(letter - 64);
+        return column;
+    }
+
+    // Of a cell with content.
+    void noteReference() {
+        if (!isLowerCase_ || !isRead()) return;
+        const ImportedSheet* const sheet = tables_.imported;
+        const bool fails = column_ > kWorksheetColumns;
+        const bool arrives = sheet != nullptr && sheet->columns.count(column_) != 0;
+        if (!fails && !arrives) return;
+        if (findings_.lowerCase.count == 0) findings_.lowerCaseColumn = columnLetters(column_);
+        findings_.lowerCase.add(place_);
+        findings_.lowerCaseFails = findings_.lowerCaseFails || fails;
     }
 
     static std::optional<long> number(const std::optional<std::string>& text) {
@@ -111,29 +176,55 @@ class Pass {
     }
 
     void endCell() {
-        if (hasFormula_ && !hasValue_ && type_ != "str" && isRead()) findings_.formulas.add(place_);
-        hasFormula_ = false;
-        if (type_ == "inlineStr" && phonetic_) findings_.phoneticCells.add(place_);
-        if (type_ == "inlineStr" && runs_ > 0 && hasValue_) {
-            findings_.inlineValues.add(place_);
-        } else if (type_ == "inlineStr" && runs_ > 1) {
-            findings_.runs.add(place_);
-        }
+        if (isRead()) noteCell();
         if (runs_ > 0 && isName()) nameIsText_ = true;
+        hasFormula_ = false;
         runs_ = 0;
         hasValue_ = false;
         phonetic_ = false;
+        valueInPieces_ = false;
+        textInPieces_ = false;
+    }
+
+    void noteCell() {
+        const bool isInlineText = type_ == "inlineStr";
+        if (hasFormula_ && !hasValue_ && type_ != "str") findings_.formulas.add(place_);
+        if (isInlineText && phonetic_) findings_.phoneticCells.add(place_);
+        if (isInlineText && runs_ > 0 && hasValue_) {
+            findings_.inlineValues.add(place_);
+        } else if (isInlineText && runs_ > 1) {
+            findings_.runs.add(place_);
+        }
+        const bool inPieces = hasValue_ ? valueInPieces_ : textInPieces_;
+        if (inPieces && type_ != "e") findings_.pieces.add(place_);
     }
 
     void countValue() {
         hasValue_ = true;
         if (!isRead()) return;
+        if (type_ != "e") noteReference();
+        if (isTakenForNumber()) checkNumber();
         const bool isNumber = type_.empty() || type_ == "n";
         if (type_ == "s") countSharedText();
         if (type_ == "d") findings_.isoDates.add(place_);
         if (type_ == "e") findings_.errors.add(place_);
         if (isName()) return noteName(isNumber);
         if (isNumber || type_ == "b") countStyle();
+    }
+
+    // Types that an import does not know count as numbers, like Booleans.
+    bool isTakenForNumber() const {
+        constexpr std::string_view kOthers[] = {"s", "str", "inlineStr", "e", "d"};
+        return std::find(std::begin(kOthers), std::end(kOthers), type_) == std::end(kOthers);
+    }
+
+    void checkNumber() {
+        const std::string text = reader_.text();
+        const std::string word = type_ == "b" ? lowerWord(text) : std::string();
+        if (word == "true") findings_.booleanWords.add(place_);
+        if (word == "true" || word == "false" || isNumber(text)) return;
+        if (findings_.notNumbers.count == 0) findings_.notNumber = text.substr(0, kLongest);
+        findings_.notNumbers.add(place_);
     }
 
     // Whether the cell is not above the data or in a column that is left out.
@@ -223,10 +314,13 @@ class Pass {
     }
 
     std::string at(const std::optional<std::string>& reference) const {
-        constexpr size_t kLongest = 32;
         if (!reference) return worksheet_.name;
         return worksheet_.name + "!" + reference->substr(0, kLongest);
     }
+
+    static constexpr size_t kLongest = 32;  // bytes of what is quoted from a cell
+    static constexpr int kNoContent = -2;   // no depth, nor is the one below it
+    static constexpr unsigned kWorksheetColumns = 16384;
 
     PartReader reader_;
     const WorksheetPart& worksheet_;
@@ -237,7 +331,11 @@ class Pass {
     std::string style_;
     std::string place_;
     bool inValue_ = false;
-    bool hasValue_ = false;  // the cell
+    int contentDepth_ = kNoContent;  // of the value or inline text
+    size_t pieces_ = 0;              // of its text
+    bool hasValue_ = false;          // the cell
+    bool valueInPieces_ = false;
+    bool textInPieces_ = false;
     size_t runs_ = 0;
     bool phonetic_ = false;
     bool inPhonetic_ = false;
@@ -245,7 +343,9 @@ class Pass {
     bool hasFormula_ = false;
     int inlineDepth_ = 0;  // of the inline text of the cell, 0 for none
     unsigned row_ = 0;     // 1-based
-    unsigned column_ = 0;  // 1-based
+    unsigned column_ = 0;  // 1-based, where an import puts the cell
+    bool rowIsGiven_ = false;
+    bool isLowerCase_ = false;  // the reference
     bool nameIsText_ = false;
     Places numbersAsNames_;  // in the row of names
     bool prefixed_ = false;
