@@ -47,8 +47,8 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
     bool autoFormat = true;
     unsigned dateTimeParameters[4] = {};  // the host's
     String pattern;                       // set once, by the constructor
-    // Owned; null until the first value is rendered. Making one costs a hundred times what the
-    // rest of the object does, and most formats never render.
+    // Owned; null until the first value is rendered. Making one takes as long as rendering some
+    // twenty values, and most formats never render.
     mutable icu::DateFormat* formatter = nullptr;
 };
 

@@ -36,7 +36,8 @@ void replaceDescriptiveNames(std::vector<xStyle>& styles, const NamedFormats& fo
 // The parts of a default date-time code, to be combined.
 enum DateTimePart : unsigned { DATE_PART = 1, TIME_PART = 2, SECONDS_PART = 4, AMPM_PART = 8 };
 
-// Where the masks of a locale come from. Each source is asked only when a code needs its mask.
+// Where the masks of a locale come from. Every code asks for that of the time, the others are asked
+// for only by codes that need them.
 struct DateTimeMasks {
     using Source = std::function<const std::string&()>;
 

@@ -38,7 +38,7 @@ class DPXLSX_API BlankRows {
 };
 
 // The rows from 0 to `last` in which no column that `counts` (0-based column) holds a cell. Costs
-// time in proportion to the stored cells and to the rows.
+// time in proportion to the stored cells, however many rows there are.
 BlankRows findBlankRows(const WorksheetCells& cells, std::uint32_t last,
                         const std::function<bool(std::uint32_t)>& counts);
 

@@ -62,8 +62,8 @@ class CellFormats {
     virtual std::unique_ptr<IVariableFormat> create(const CellContent& cell) const = 0;
 };
 
-// The formats of one load, made once per style: making a date-time format costs fifty times what
-// rendering with it does.
+// The formats of one load, made once per style: the first value that a date-time format renders
+// costs twenty times what the next ones do.
 class FormatCache {
   public:
     explicit FormatCache(const CellFormats& source) : source_(source) {}
