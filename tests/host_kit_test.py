@@ -39,6 +39,16 @@ void fragment([[maybe_unused]] dp::IDataProvider& provider) {
 %s}
 """
 
+README_HOST = """#include <dlfcn.h>
+#include <cstdio>
+%s
+static void importWorksheet(dp::IDataProvider& provider, int key) {
+    std::printf("%%d: %%u rows\\n", key, provider.GetWorksheetRowCount(static_cast<unsigned>(key)));
+}
+int main() {
+%s}
+"""
+
 DATES = """#include "date_times.h"
 int main() {
     HostDateTimes dates;
@@ -193,6 +203,18 @@ int main() {
         settings = set(re.findall(r"\b((?:Set|Clear)\w+)\(", (self.headers / "model/host/i_data_provider.h").read_text()))
         inner = {"SetWorksheetIndex"}  # is the readers' own
         self.assertEqual({name for name in settings - inner if f"{name}" not in guide}, set())
+
+    def test_the_host_of_the_readme_runs(self):
+        (code,) = re.findall(r"^```cpp\n(.*?)^```", (SOURCE / "README.md").read_text(), re.MULTILINE | re.DOTALL)
+        includes, body = code.split("\n\n", 1)
+        made = self.work / "readme"
+        made.mkdir()
+        (made / "host.cpp").write_text(README_HOST % (includes, body))
+        shutil.copy(SAMPLE, made / "book.xlsx")
+        for compiler in COMPILERS:
+            run(compiler, "-std=c++17", *WARNINGS, *self.flags("--cflags"), "host.cpp", "-o", "host", cwd=made)
+            self.assertEqual(run(made / "host", cwd=made, env={"LD_LIBRARY_PATH": str(self.libraries)}),
+                             "1: 13 rows\n2: 10 rows\n")
 
     def test_tool_finds_its_library_and_its_page_names_every_option(self):
         tool = self.prefix / "bin" / "dpxlsx"
