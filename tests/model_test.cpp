@@ -133,17 +133,28 @@ class Round {
         if (coin()) naive_.alpha = oneOf<std::string>({"", "", "NA"});
         if (coin()) naive_.missingText = oneOf<std::string>({"", "", "NA", "(3)", " "});
         if (coin()) naive_.missingTextTo = oneOf<std::string>({"", "?", "none"});
+        if (coin()) naive_.clean = coin();
+        if (coin()) naive_.helped = coin();
+        if (coin()) naive_.most = oneOf({1e5, 1e31});
+        if (coin()) naive_.textLength = oneOf({80, 4, 0});
+        if (coin()) naive_.none = oneOf({1.23456e30, -99.0});
+        if (coin()) naive_.missingShown = oneOf<std::string>({"*", " n. a. "});
+        if (coin()) naive_.trueText = oneOf<std::string>({"TRUE", "  y"});
+        if (coin()) naive_.falseText = oneOf<std::string>({"", "n\x01o"});
         provider_.SetReadOptionConvertDateTimeToText(naive_.convert);
         provider_.SetPreviewing(naive_.previewing);
         provider_.SetMaxVariableNameLength(naive_.nameLength);
         provider_.SetMissingNumeric(naive_.from, naive_.to);
         provider_.SetAlphaMissingNumeric(naive_.alpha.c_str(), naive_.to);
         provider_.SetMissingText(naive_.missingText.c_str(), naive_.missingTextTo.c_str());
-        if (coin()) provider_.SetReadOptionCleanTextValues(coin());
-        if (coin()) provider_.SetDateTimeVariableFormatHelper(coin() ? new HandHelper : nullptr);
-        if (coin()) provider_.SetNumericRange(-99, oneOf({1e5, 1e31}));
-        if (coin()) provider_.SetMaximumTextLength(oneOf({80, 4, 0}));
-        if (coin()) provider_.SetMissingValue(oneOf({1.23456e30, -99.0}));
+        provider_.SetReadOptionCleanTextValues(naive_.clean);
+        provider_.SetDateTimeVariableFormatHelper(naive_.helped ? new HandHelper : nullptr);
+        provider_.SetNumericRange(naive_.least = -99, naive_.most);
+        provider_.SetMaximumTextLength(naive_.textLength);
+        provider_.SetMissingValue(naive_.none);
+        provider_.SetMissingValueTextRepresentation(naive_.missingShown.c_str());
+        provider_.SetBooleanTrueValue(naive_.trueText.c_str());
+        provider_.SetBooleanFalseValue(naive_.falseText.c_str());
     }
 
     void compareWorksheets() {
@@ -165,7 +176,7 @@ class Round {
     KeptSettings settings_;
     std::mt19937 random_;
     HandFilledProvider provider_;
-    naive::Provider naive_{provider_};
+    naive::Provider naive_;
 };
 
 TEST(Columns, AgreeWithTheNaiveModel) {

@@ -1,6 +1,11 @@
 #pragma once
 
+#include <regex.h>
+
 #include <algorithm>
+#include <cmath>
+#include <cstdlib>
+#include <iomanip>
 #include <map>
 #include <memory>
 #include <optional>
@@ -8,12 +13,12 @@
 #include <string>
 #include <vector>
 
-#include "store/text_cleaning.h"
 #include "tests/provider_fixture.h"
 
-// The layout and the loading of columns in the plainest form: full grids, every question answered
-// by walking them. It has the host's operations by their names, so that one call serves both it and
-// the provider that it judges.
+// The layout, the conversion and the loading of columns in the plainest form: full grids, every
+// question answered by walking them. Of the library it uses the formats alone, which have judges of
+// their own. It has the host's operations by their names, so that one call serves both it and the
+// provider that it judges.
 namespace dp::naive {
 
 using Cell = ExternalDataRecordCell;
@@ -21,14 +26,56 @@ using Column = std::vector<std::optional<Cell>>;  // by row
 
 constexpr unsigned kUnset = 0xFFFFFFFF;
 
-inline std::string variableName(std::string name, unsigned maximumLength) {
-    truncateToCharLength(name, static_cast<unsigned short>(maximumLength));
+inline std::string trimmed(const std::string& text) {
+    const char* const space = " \t\n\v\f\r";
+    const std::size_t first = text.find_first_not_of(space);
+    return first == text.npos ? "" : text.substr(first, text.find_last_not_of(space) + 1 - first);
+}
+inline bool isControl(char byte) { return (byte >= 0 && byte < 0x20) || byte == 0x7F; }
+inline std::string cleaned(const std::string& text) {
+    std::string kept;
+    for (const char byte : trimmed(text))
+        if (!isControl(byte) && !(byte == ' ' && kept.ends_with(' '))) kept += byte;
+    return kept;
+}
+
+// The number that a text holds: a regular expression and strtod.
+inline std::optional<double> numberIn(std::string text, char decimal) {
+    static const regex_t form = [] {
+        regex_t made;
+        const char* const pattern = "^([+-]?[0-9]+([.][0-9]*)?|-?[.][0-9]+)(E[+-]?[0-9]+)?$";
+        EXPECT_EQ(regcomp(&made, pattern, REG_EXTENDED | REG_NOSUB), 0);
+        return made;
+    }();
+    text = trimmed(text);
+    if (!text.empty() && text.front() == '(' && text.back() == ')') text = "-" + text.substr(1, text.size() - 2);
+    for (char& c : text) {
+        if (c != decimal && (c == '.' || c == '\0')) return std::nullopt;
+        c = c == decimal ? '.' : c == 'D' || c == 'd' || c == 'e' ? 'E' : c;
+    }
+    if (regexec(&form, text.c_str(), 0, nullptr, 0) != 0) return std::nullopt;
+    const double value = std::strtod(text.c_str(), nullptr);
+    return std::isfinite(value) ? std::optional(value == 0 ? 0.0 : value) : std::nullopt;
+}
+
+// The first characters of a text whose only marks are those from U+0300 to U+033F; 0 for all.
+inline std::string firstCharacters(const std::string& text, unsigned count) {
+    const auto joins = [&](std::size_t at) {
+        const auto byte = static_cast<unsigned char>(text[at]);
+        return (byte & 0xC0) == 0x80 || byte == 0xCC || (byte == '\n' && text[at - 1] == '\r');
+    };
+    std::size_t end = count == 0 ? text.size() : 0;
+    for (; count > 0 && end < text.size(); --count)
+        for (++end; end < text.size() && joins(end);) ++end;
+    return text.substr(0, end);
+}
+inline std::string variableName(const std::string& text, unsigned maximumLength) {
+    std::string name = firstCharacters(text, maximumLength % 0x10000);
     std::replace(name.begin(), name.end(), '\n', ' ');
-    trim(name);
+    name = trimmed(name);
     for (std::size_t i = 0; i < name.size(); ++i) {
-        const auto byte = static_cast<unsigned char>(name[i]);
-        const bool star = i == 0 && byte == '*';
-        if (star || byte == '\'' || byte == '#' || byte < 0x20 || byte == 0x7F) name[i] = '_';
+        const bool star = i == 0 && name[i] == '*';
+        if (star || name[i] == '\'' || name[i] == '#' || isControl(name[i])) name[i] = '_';
     }
     return name;
 }
@@ -53,11 +100,11 @@ struct Sheet {
 
 class Provider {
   public:
-    explicit Provider(const HandFilledProvider& library) : library_(library) {}
-
     std::vector<Sheet> sheets;
-    std::string missingText, missingTextTo, alpha;
-    double from = 1.23456e30, to = 1.23456e30;
+    std::string missingText, missingTextTo, alpha, missingShown = "*", trueText = "TRUE", falseText = "FALSE";
+    double none = 1.23456e30, least = -1.001e18, most = 1.001e18, from = 1.23456e30, to = 1.23456e30;
+    int textLength = 80;
+    bool clean = false, helped = false;
     bool convert = false, previewing = false, ignoreBlank = false, pad = false;
     unsigned nameLength = kUnset;
     EVariableNameRowSetting defaultSetting{kUnset};
@@ -182,7 +229,44 @@ class Provider {
 
     std::string nameInSheet(const SheetReadOptions& rows, const Column& column) {
         if (rows.variableNameRowSetting == VNR_NONE || !hasCell(column, rows.variableNameRow)) return "";
-        return library_.ConvertCellToString(*column[rows.variableNameRow], true);
+        return cut(textOf(*column[rows.variableNameRow]));
+    }
+    std::string cut(const std::string& text) const { return text.substr(0, static_cast<unsigned>(textLength)); }
+    std::string textOf(const Cell& cell) const {
+        std::ostringstream text;
+        if (cell.type == CELL_INTEGER) text << std::setw(12) << cell.intValue;
+        if (cell.type == CELL_BOOLEAN) text << (cell.boolValue ? trueText : falseText);
+        if (cell.type == CELL_TEXT) text << cell.textValue;
+        if (cell.type == CELL_NUMBER || cell.type == CELL_DATETIME) text << shown(cell);
+        return clean ? cleaned(text.str()) : text.str();
+    }
+    std::string shown(const Cell& cell) const {
+        if (cell.numValue == none) return missingShown;
+        const std::unique_ptr<IVariableFormat> format = formatOfStyle(cell.formatIndex);
+        const auto* dates = dynamic_cast<IDateTimeVariableFormat*>(format.get());
+        if (!dates || !helped || cell.type != CELL_DATETIME)
+            return std::unique_ptr<IString>(format->FormatValue(cell.numValue, false))->database_str();
+        return HandHelper::shown(dates->GetFormatString()->database_str(), cell.numValue);
+    }
+    // No number for content that is none; the missing value for a cell without content.
+    std::optional<double> numberOf(const Cell& cell, bool asDateTime, const std::string& pattern) const {
+        const bool isDate = cell.type == CELL_DATETIME;
+        if (cell.type == CELL_INTEGER) return cell.intValue;
+        if (cell.type == CELL_BOOLEAN) return cell.boolValue;
+        if (cell.type == CELL_TEXT && asDateTime)
+            return helped ? HandHelper::dateIn(pattern, cell.textValue) : std::nullopt;
+        if (cell.type == CELL_TEXT) return numberIn(cell.textValue, '.');
+        if (cell.type != CELL_NUMBER && !isDate) return none;
+        const bool refused = asDateTime && helped && !HandHelper::isValid(cell.numValue);
+        return refused || (isDate && convert) ? std::nullopt : std::optional(cell.numValue);
+    }
+    double realOf(const Cell& cell, bool asDateTime, const std::string& pattern, int& converted) const {
+        const std::optional<double> number = numberOf(cell, asDateTime, pattern);
+        double value = number.value_or(none);
+        if (alpha.empty() ? value == from : cell.textValue == alpha) value = to;
+        const bool within = value >= least && value <= most;
+        if (!number || !within) ++converted;
+        return within ? value : none;
     }
     unsigned rowCount(unsigned key, const Column& column) {
         const unsigned first = options[key].firstDataRow;
@@ -249,7 +333,6 @@ class Provider {
         return facts;
     }
     void loadNumbers(unsigned key, const Column& column, IVariable::BasicDataType wanted, ColumnFacts& facts) {
-        const double none = ExcelDataProviderBase::_missingValue;
         const bool dateWanted = wanted == IVariable::BasicDataType::DateTime;
         facts.values.assign(rowCount(key, column), none);
         facts.missing = static_cast<int>(facts.values.size());
@@ -259,13 +342,11 @@ class Provider {
         };
         const auto store = [&](const Cell& cell, unsigned slot) {
             const auto* dates = dynamic_cast<IDateTimeVariableFormat*>(format.get());
-            bool converted = false;
+            const std::string pattern = dates ? dates->GetFormatString()->database_str() : "";
             double& value = facts.values[slot];
             value = previewing && slot >= 101
                         ? 1.23456e30
-                        : library_.ConvertCellToReal(cell, dateWanted || facts.formatType == 1,
-                                                     dates ? dates->GetFormatString() : nullptr, converted);
-            facts.converted += converted ? 1 : 0;
+                        : realOf(cell, dateWanted || facts.formatType == 1, pattern, facts.converted);
             if (value == none) return;
             --facts.missing;
             if (!format) format = inferred(cell, wanted);
@@ -302,10 +383,10 @@ class Provider {
             if (missingText.empty()) facts.texts[slot] = missingTextTo;
         };
         const auto store = [&](const Cell& cell, unsigned slot) {
-            std::string value = previewing && slot > 100 ? "" : library_.ConvertCellToString(cell, false);
+            std::string value = previewing && slot > 100 ? "" : textOf(cell);
             if (value.find_first_not_of(' ') == std::string::npos) value.clear();
             if (value == missingText) value = missingTextTo;
-            value = value.substr(0, static_cast<unsigned>(ExcelDataProviderBase::_maxTextLength));
+            value = cut(value);
             if (!value.empty()) --facts.missing;
             longest = std::max(longest, value.size());
             facts.texts[slot] = value;
@@ -315,7 +396,6 @@ class Provider {
         facts.format = "text " + std::to_string(longest);
     }
 
-    const HandFilledProvider& library_;  // for the conversion of single cells alone
     std::map<unsigned, unsigned> lastRows_;
     std::map<unsigned, std::set<unsigned>> blankRows_;
 };

@@ -13,24 +13,7 @@
 namespace dp {
 namespace {
 
-// The judge: a regular expression and strtod.
-std::optional<double> numberIn(std::string text, char decimal) {
-    static const regex_t form = [] {
-        regex_t made;
-        const char* const pattern = "^([+-]?[0-9]+([.][0-9]*)?|-?[.][0-9]+)(E[+-]?[0-9]+)?$";
-        EXPECT_EQ(regcomp(&made, pattern, REG_EXTENDED | REG_NOSUB), 0);
-        return made;
-    }();
-    trim(text);
-    if (!text.empty() && text.front() == '(' && text.back() == ')') text = "-" + text.substr(1, text.size() - 2);
-    for (char& c : text) {
-        if (c != decimal && (c == '.' || c == '\0')) return std::nullopt;
-        c = c == decimal ? '.' : c == 'D' || c == 'd' || c == 'e' ? 'E' : c;
-    }
-    if (regexec(&form, text.c_str(), 0, nullptr, 0) != 0) return std::nullopt;
-    const double value = std::strtod(text.c_str(), nullptr);
-    return std::isfinite(value) ? std::optional(value == 0 ? 0.0 : value) : std::nullopt;
-}
+using naive::numberIn;
 
 // A number by its bits, or none.
 std::optional<std::uint64_t> bits(std::optional<double> value) {

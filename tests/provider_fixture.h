@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <sstream>
 #include <string>
 #include <tuple>
@@ -37,20 +38,25 @@ inline std::unique_ptr<IVariableFormat> formatOfStyle(int style) {
 // byte, and values below 0 and from 100000 on cannot be shown.
 class HandHelper : public DateTimeVariableFormat {
   public:
-    bool ConvertToDatetime(const IString* format, IString* text, double& value) const override {
-        const std::string read = text->database_str();
-        if (read.substr(0, 1) != "d") return false;
-        const std::string known = format ? format->database_str() : "";
-        value = std::stod("0" + read.substr(1)) + static_cast<double>(known.size()) / 1000;
-        return true;
+    static std::optional<double> dateIn(const std::string& pattern, const std::string& text) {
+        if (!text.starts_with("d")) return std::nullopt;
+        return std::stod("0" + text.substr(1)) + static_cast<double>(pattern.size()) / 1000;
     }
-    bool ValidVextralTime(double value) const override { return value >= 0 && value < 100000; }
+    static bool isValid(double value) { return value >= 0 && value < 100000; }
+    static std::string shown(const std::string& pattern, double value) {
+        return "by helper " + pattern + " " + std::to_string(value);
+    }
+
+    bool ConvertToDatetime(const IString* format, IString* text, double& value) const override {
+        const std::optional<double> date = dateIn(format ? format->database_str() : "", text->database_str());
+        if (date) value = *date;
+        return date.has_value();
+    }
+    bool ValidVextralTime(double value) const override { return isValid(value); }
     void SetDateTimeParameters(const IDateTimeVariableFormat* other) override {
         taken_ = other->GetFormatString()->database_str();
     }
-    IString* FormatValue(double value, bool) const override {
-        return new String("by helper " + taken_ + " " + std::to_string(value));
-    }
+    IString* FormatValue(double value, bool) const override { return new String(shown(taken_, value)); }
 
   private:
     std::string taken_;
@@ -158,6 +164,8 @@ inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key, Colum
     EXPECT_EQ(column != nullptr, facts.found);
     if (!facts.found || !column) return facts;
     EXPECT_EQ(column->AddRef(), 1U);
+    EXPECT_EQ(std::pair(column->GetPrimeKey(), column->GetVariableBodyPrimeKey()), std::pair(key, key));
+    EXPECT_TRUE(column->IsFormatDirty() && !column->UseDefaultVariableBody());
     facts.dataType = column->GetDataType();
     facts.missing = column->GetMissingCount();
     facts.position = column->GetPosition();
