@@ -384,11 +384,22 @@ class ToolTest(unittest.TestCase):
             (["--exclude-sheet", "1"], lambda c: len(c) == 1),
             (["--rename", "Measurements!B=a=b!"], lambda c: "a=b!" in c),
             (["--position", "C=40"], lambda c: c["Fixed"]["position"] == 40),
-            (["--true", "", "--false", "no", "--clean-sheet-names"], lambda c: "Passed" in c),
         ]
         for arguments, holds in cases:
             with self.subTest(arguments):
                 self.assertTrue(holds(self.columns(*arguments)))
+
+    def test_booleans_take_the_texts_of_the_options(self):
+        library = pathlib.Path(TOOL).parent.parent / "lib" / "libboolean_library.so"
+        for options, wanted in (([], ["TRUE", "FALSE"]), (["--true", "ja", "--false", "no"], ["ja", "no"])):
+            column = self.columns("--library", library, "--type", "K=text", *options)["Passed"]
+            self.assertEqual(column["values"][:2], wanted)
+
+    def test_worksheet_names_are_cleaned_on_demand(self):
+        book = self.book(changed(WORKBOOK, "My Data", "a?b:c"))
+        for options, wanted in (([], "a?b:c"), (["--clean-sheet-names"], "a_b_c")):
+            sheet = json.loads(self.run_tool(book, "--json", *options))["worksheets"][0]
+            self.assertEqual(sheet["title"], wanted)
 
     def test_a_preview_reads_101_rows(self):
         book = json.loads(self.run_tool(self.many_rows(), "--json", "--preview"))
