@@ -24,10 +24,10 @@ unsigned long read(const dp::IString* text) { return text ? std::strlen(text->da
 void show(dp::IString* text) { read(std::unique_ptr<dp::IString>(text).get()); }
 
 void readNumbers(const dp::INumericColumn& column, unsigned long rows) {
-    const double* values = column.GetValues();
-    unsigned long infinite = 0;
-    for (unsigned long row = 0; row < rows; ++row) infinite += values[row] - values[row] != 0;
-    require(infinite <= rows, "no numbers");
+    const volatile double* values = column.GetValues();
+    require(column.GetConvertedMissingCount() >= 0, "a negative count");
+    // Every value must be there.
+    for (unsigned long row = 0; row < rows; ++row) static_cast<void>(values[row]);
     for (unsigned long row = 0; row < std::min(rows, kShown); ++row) {
         show(column.GetFormat()->FormatValue(values[row], row % 2 == 1));
         show(column.GetFormattedValue(values[row], ','));
@@ -98,7 +98,8 @@ dp::IString* Helper::CovertVextralDateTimeToString(double value) const {
 
 unsigned long read(dp::IColumn& column) {
     const auto rows = static_cast<unsigned long>(column.GetRowCount());
-    require(column.GetRowCount() >= 0 && column.GetMissingCount() >= 0, "negative counts");
+    require(column.GetMissingCount() >= 0 && column.GetMissingCount() <= column.GetRowCount(),
+            "more missing values than rows");
     read(column.GetName());
     read(column.GetDescription());
     require(column.GetView() && column.GetFormat(), "a column without view or format");

@@ -128,14 +128,6 @@ TEST(FormatCodes, IcuPatterns) {
         EXPECT_EQ(icuPatternOf(code), nullptr) << code;
 }
 
-TEST(FormatCodes, Vocabulary) {
-    EXPECT_EQ(GENERAL_FORMAT + TEXT_FORMAT + SIGNIFICANT_DIGITS_MASK + SCIENTIFIC_SIGNIFICANT_DIGITS_MASK,
-              "General@#,##0##");
-    EXPECT_EQ(
-        SCIENTIFIC_SHORT_FORM + " " + SCIENTIFIC_LONG_FORM + LANG_ID_MASK + FORMAT_TOKEN_SEPARATOR + PERCENT_SYMBOL,
-        "E+0 E+00[$;%");
-}
-
 TEST(FormatCodes, RightSubString) {
     EXPECT_EQ(getRightSubString("mm/yy", 2), "yy");
     EXPECT_EQ(getRightSubString("mm", 2), "mm");
