@@ -1,3 +1,5 @@
+#include <malloc.h>
+
 #include <algorithm>
 #include <bit>
 #include <cstdint>
@@ -5,13 +7,17 @@
 #include <iterator>
 #include <map>
 #include <memory>
+#include <optional>
 #include <random>
+#include <set>
 #include <string>
 #include <tuple>
 #include <utility>
 
 #include <gtest/gtest.h>
 
+#include "store/blank_rows.h"
+#include "store/row_layout.h"
 #include "store/worksheet_cells.h"
 
 namespace dp {
@@ -146,22 +152,13 @@ TEST(CellStore, AnswersAsPlainMapsDo) {
     }
 }
 
-TEST(CellStore, FilesByColumnThenRow) {
+TEST(CellStore, ReachesToTheLargestNumbers) {
     WorksheetCells cells;
     EXPECT_EQ(cells.rowCount(), 0U);
-    cells.add(recordOf(5, 2, cellOf(CELL_NUMBER, 0, 0, 1.0, "", 3)));
-    cells.add(recordOf(0, 2, textCell("first")));
-    cells.add(recordOf(5, 2, cellOf(CELL_DATETIME, 0, 0, 60.0, "", 9)));
-    ASSERT_EQ(cells.size(), 1U);
-    EXPECT_EQ(cells.rowCount(), 6U);
-    const CellColumn& column = cells.find(2)->second;
-    EXPECT_EQ(column.find(5)->second.type(), CELL_DATETIME);
-    EXPECT_EQ(column.find(5)->second.formatIndex(), 9);
-    EXPECT_EQ(std::prev(column.end())->second.numValue(), 60.0);
-    EXPECT_EQ(column.upper_bound(0xFFFFFFFF), column.end());
     cells.add(recordOf(0xFFFFFFFE, 0xFFFFFFFE, textCell("far")));
     EXPECT_EQ(cells.rowCount(), 0xFFFFFFFFU);
-    EXPECT_EQ(cells.nth(1).first, 0xFFFFFFFEU);
+    const CellColumn& column = cells.nth(0).second;
+    EXPECT_EQ(column.upper_bound(0xFFFFFFFF), column.end());
 }
 
 TEST(CellStore, MovesKeepCellsAndClearForgetsThem) {
@@ -173,6 +170,13 @@ TEST(CellStore, MovesKeepCellsAndClearForgetsThem) {
     EXPECT_EQ(cells.rowCount(), 601U);
     CellColumn column = std::move(cells[2]);
     EXPECT_EQ(column.size(), 200U);
+    EXPECT_TRUE(cells[2].empty());
+    for (unsigned row = 0; row < 9; ++row) cells[2].assign(row, textCell("again"));
+    EXPECT_EQ(cells[2].size(), 9U);
+    EXPECT_EQ(&cells.nth(0), &*cells.begin());
+    cells.clear();
+    for (unsigned i = 0; i < 3; ++i) cells.add(recordOf(i, i + 5, textCell("t")));
+    EXPECT_EQ(cells.nth(0).first, 5U);
     column.clear();
     EXPECT_EQ(column.begin(), column.end());
     column.assign(4, cellOf(CELL_TEXT, 1, 2, 3.0, "rare", -7));
@@ -184,7 +188,6 @@ TEST(CellStore, KeepsEqualTextsOnce) {
     WorksheetCells first(pool);
     WorksheetCells second(pool);
     const std::string text(26, 'x');
-    WorksheetCells(pool).add(recordOf(0, 0, textCell(text)));  // gone before the text is looked for
     first.add(recordOf(0, 0, textCell(text)));
     first.add(recordOf(9, 7, cellOf(CELL_TEXT, 0, 0, 1.0, text, 2)));
     second.add(recordOf(3, 1, cellOf(CELL_TEXT, 0, 0, 0.0, text, 0x7FFFFFFF)));
@@ -195,6 +198,79 @@ TEST(CellStore, KeepsEqualTextsOnce) {
     EXPECT_EQ(address(first, 0), address(second, 1));
     EXPECT_EQ(second.find(1)->second.begin()->second.formatIndex(), 0x7FFFFFFF);
     EXPECT_EQ(pool->size(), 1U);
+}
+
+// New cells take the memory of those that went while the pool still looked for their texts.
+TEST(CellStore, DeliversTextsBeforeTheirCellsGo) {
+    const auto pool = std::make_shared<TextPool>();
+    const ExternalDataRecordCell number = cellOf(CELL_NUMBER, 0, 0, 5.0, "", -1);
+    std::optional<CellColumn> gone(std::in_place, pool);
+    gone->assign(0, textCell("gone"));
+    gone.reset();
+    CellColumn column(pool);
+    for (const char* text : {"cleared", "known", "known"}) {
+        column.assign(0, number);
+        EXPECT_EQ(column.begin()->second.numValue(), 5.0) << "before " << text;
+        column.clear();
+        column.assign(0, textCell(text));
+        column.clear();
+    }
+}
+
+std::size_t allocatedBytes() {
+    const auto info = mallinfo2();
+    return info.uordblks + info.hblkhd;
+}
+
+TEST(CellStore, CellsThatAreFiledAgainTakeNoMemory) {
+    WorksheetCells cells;
+    const std::size_t before = allocatedBytes();
+    for (unsigned i = 0; i < 100000; ++i)
+        cells.add(recordOf(i / 2 % 3, i % 7 ? 0 : 1, cellOf(CELL_TEXT, 1, 2, 3.0, "rare", -7)));
+    EXPECT_LT(allocatedBytes() - before, 100000U);
+}
+
+TEST(TextPool, KeepsManyTextsInLittleMemory) {
+    TextPool pool;
+    const std::size_t before = allocatedBytes();
+    for (int i = 0; i < 400000; ++i)
+        pool.intern("a text of forty-two bytes, the last ones " + std::to_string(100000 + i));
+    EXPECT_LT(allocatedBytes() - before, 30'000'000U);
+    EXPECT_EQ(pool.size(), 400000U);
+}
+
+TEST(BlankRows, AreCountedAsInASet) {
+    RandomCells random;
+    for (unsigned round = 0; round < 40; ++round) {
+        WorksheetCells cells;
+        std::set<unsigned> occupied;
+        const unsigned height = round % 2 ? 300 : 20000;
+        for (unsigned i = 0; i < 200; ++i) {
+            const unsigned row = random.below(height);
+            const unsigned column = random.below(4);
+            cells.add(recordOf(row, column, textCell("t")));
+            if (column != 3) occupied.insert(row);
+        }
+        const unsigned last = random.below(height);
+        const BlankRows blank = findBlankRows(cells, last, [](unsigned column) { return column != 3; });
+        for (unsigned i = 0; i < 100; ++i) {
+            const unsigned from = random.below(height), end = random.below(height + 100);
+            unsigned expected = 0;
+            for (unsigned row = from; row < std::min(end, last + 1); ++row) expected += occupied.count(row) ? 0 : 1;
+            ASSERT_EQ(blank.countBetween(from, end), expected) << from << " to " << end;
+        }
+    }
+}
+
+TEST(RowLayout, DecidesAtItsLimits) {
+    EXPECT_EQ(lastRow(WorksheetCells()), 0U);
+    EXPECT_EQ(rowCountUpTo({0, kNotSet}, 0x7FFFFFFE), 0x7FFFFFFFU);
+    EXPECT_EQ(rowCountUpTo({0, kNotSet}, 0x7FFFFFFF), 0U) << "more than a host can count";
+    WorksheetCells cells;
+    cells.add(recordOf(0, 0, textCell("name")));
+    SheetReadOptions options{VNR_INFER, 5};
+    inferRows(options, cells);
+    EXPECT_EQ(options.variableNameRow, 0U) << "whatever it was";
 }
 
 TEST(TextPool, TellsTextsApartAtAnyLength) {

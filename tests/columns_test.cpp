@@ -103,6 +103,35 @@ TEST_F(ColumnsOnDemand, FillsTheGapsOfExcludedColumnsFromTheRowsThatCount) {
     EXPECT_EQ(factsOf(provider, 1, ColumnType::Automatic, true).rows(), "'p' '' '' '' '' 'r'");
 }
 
+TEST_F(ColumnsOnDemand, HandlesBlankRowsForProvidersThatLoadThemselves) {
+    const Options numbers = [](auto& p) { p.SetMissingNumeric(kMissing, -1); };
+    const Options others = [](auto& p) { p.SetMissingNumeric(-99, -1); };
+    const Options words = [](auto& p) { p.SetAlphaMissingNumeric("NA", -1); };
+    const Options blank = [](auto& p) { p.SetReadOptionIgnoreBlankRows(true); };
+    const struct {
+        const char* name;
+        std::vector<Options> options;
+        unsigned rowCount, slots;
+        std::vector<double> values;
+    } cases[] = {{"other numbers are replaced", {others}, 5, 3, {9, 9, 9, 9, 9}},
+                 {"missing numbers are replaced", {numbers}, 5, 3, {9, -1, -1, -1, 9}},
+                 {"up to the last row", {numbers}, 3, 3, {9, -1, -1, 9, 9}},
+                 {"not with a missing word", {numbers, words}, 5, 3, {9, 9, 9, 9, 9}},
+                 {"blank rows have no slot", {numbers, blank}, 5, 1, {9, -1, 9, 9, 9}}};
+    for (const auto& [name, options, rowCount, slots, values] : cases) {
+        fileSheet("'n|1||||5", [&options = options](HandFilledProvider& p) {
+            file(p, 1, "'m|||'x");
+            for (const Options& option : options) option(p);
+        });
+        NumericColumn column;
+        column.values.reset(new double[values.size()]);
+        std::fill_n(column.values.get(), values.size(), 9);
+        const CellColumn& cells = provider._cells[0].begin()->second;
+        EXPECT_EQ(provider.HandleBlankRows(&column, 1, 2, rowCount, cells.find(5)), slots) << name;
+        EXPECT_EQ(std::vector(column.values.get(), column.values.get() + values.size()), values) << name;
+    }
+}
+
 TEST_F(ColumnsOnDemand, TakesItsKindFromItsFirstCell) {
     const auto type = [](Basic kind) { return [kind](auto& p) { p.SetReadColumnOptionColumnType(1, 1, kind); }; };
     const Options none;
@@ -173,6 +202,27 @@ TEST_F(ColumnsOnDemand, BearsACleanName) {
     EXPECT_EQ(factsOf(provider, 1).name, "_given_");
 }
 
+TEST_F(ColumnsOnDemand, TellsTheSettingsOfTheProcess) {
+    using Settings = ExcelDataProviderBase;
+    provider.SetMissingValue(-1);
+    provider.SetNumericRange(-2, 3);
+    provider.SetMaximumTextLength(4);
+    provider.SetInputDecimal('i');
+    provider.SetOutputDecimal('o');
+    provider.SetOutputGroupingSymbol('g');
+    provider.SetMissingValueTextRepresentation("m");
+    provider.SetBooleanTrueValue("t");
+    provider.SetBooleanFalseValue("f");
+    EXPECT_EQ(
+        std::tuple(Settings::GetMissingValue(), Settings::GetNumericMinimumValue(), Settings::GetNumericMaximumValue(),
+                   Settings::GetNumericMaximumInt(), Settings::GetMaximumTextLength(), Settings::GetInputDecimal(),
+                   Settings::GetOutputDecimal(), Settings::GetOutputGroupingSymbol()),
+        std::tuple(-1.0, -2.0, 3.0, 2147000000.0, 4, 'i', 'o', 'g'));
+    EXPECT_EQ(std::string(Settings::GetMissingValueTextRepresentation()) + Settings::GetBooleanTrueValue() +
+                  Settings::GetBooleanFalseValue(),
+              "mtf");
+}
+
 TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     const auto keysOf = [this](int worksheet) {
         std::string keys;
@@ -208,8 +258,7 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     EXPECT_EQ(factsOf(provider, 1).rows(), "4");
     IColumn* column = nullptr;
     ASSERT_TRUE(provider.GetVariableFinder()->FindColumn(2, &column, true));
-    EXPECT_EQ(column->GetPrimeKey() * 10 + column->GetVariableBodyPrimeKey(), 22);
-    EXPECT_TRUE(column->IsFormatDirty() && !column->UseDefaultVariableBody());
+    EXPECT_EQ(column->GetPrimeKey(), 2);
     column->AddRef();
     column->Release();
     provider.ClearWorksheets();

@@ -1,5 +1,6 @@
 #include "store/text_cleaning.h"
 
+#include "store/conversion.h"
 #include "tests/case_table.h"
 
 namespace {
@@ -15,6 +16,13 @@ TEST(TextCleaning, CutsAndReplacesInPlace) {
             dp::truncateToCharLength(text, static_cast<unsigned short>(std::stoi(c[0].substr(4))));
         EXPECT_EQ(text, c[2]) << c[0] << " of " << c[1];
     }
+}
+
+TEST(TextCleaning, ATextThatIsCutReturnsItsMemory) {
+    std::string text(1000, 'x');
+    dp::cutToBytes(text, 4);
+    EXPECT_EQ(text, "xxxx");
+    EXPECT_LT(text.capacity(), 300U);
 }
 
 }  // namespace
