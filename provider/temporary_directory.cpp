@@ -8,17 +8,16 @@
 
 #include <boost/filesystem.hpp>
 
+#include "readers/temporary_path.h"
+
 namespace dp {
 
 namespace fs = boost::filesystem;
 
 std::string makePrivateDirectory() {
-    boost::system::error_code error;
-    // Absolute, because the host may change its working directory before the file is closed. The
-    // whole name before the directory: from then on nothing may fail.
-    std::string directory =
-        (fs::absolute(fs::temp_directory_path()) / fs::unique_path("%%%%-%%%%", error)).string();
-    if (error || !makeOwnDirectory(directory)) directory.clear();
+    // The whole name before the directory: from then on nothing may fail.
+    std::string directory = unusedTemporaryPath();
+    if (!directory.empty() && !makeOwnDirectory(directory)) directory.clear();
     return directory;
 }
 

@@ -5,21 +5,21 @@
 #include <algorithm>
 #include <cstring>
 
-#include <boost/filesystem.hpp>
 #include <libxml/xmlreader.h>
 
 #include "readers/cm_xml_cast.h"
 #include "readers/file_copy.h"
 #include "readers/part_input.h"
 #include "readers/silence.h"
+#include "readers/temporary_path.h"
 
 namespace {
 
-namespace fs = boost::filesystem;
-
-// libxml2 takes a path with a scheme for the address of another file, on another machine even: no
-// file opens under such a name, but a copy of it does.
-bool looksLikeAddress(const std::string& path) { return path.find("://") != path.npos; }
+// libxml2 takes a relative path with a scheme for the address of another file, on another machine
+// even: no file opens under such a name, but a copy of it does.
+bool looksLikeAddress(const std::string& path) {
+    return !path.starts_with('/') && path.find("://") != path.npos;
+}
 
 // Null for a path that cannot be opened, or that names something else to libxml2.
 xmlTextReaderPtr openFile(const std::string& path, const std::uint32_t& moves) {
@@ -29,10 +29,9 @@ xmlTextReaderPtr openFile(const std::string& path, const std::uint32_t& moves) {
 // The path of a private copy of `path`; empty when it could not be made. Throws the file system's
 // error when there is no temporary directory.
 std::string copyToTemporary(const std::string& path) {
-    boost::system::error_code error;
-    std::string copy = (fs::temp_directory_path() / fs::unique_path("%%%%-%%%%", error)).string();
-    if (!error && dp::copyFile(path, copy)) return copy;
-    return {};
+    std::string copy = dp::unusedTemporaryPath();
+    if (!copy.empty() && !dp::copyFile(path, copy)) copy.clear();
+    return copy;
 }
 
 // A name with a prefix is put together when it is asked for, which libxml2 refuses once a document

@@ -216,6 +216,39 @@ TEST_F(Opening, CopiesForItsOwnerAndOverNothing) {
     EXPECT_EQ(fs::file_size(file("there")), 17U);
 }
 
+// All that a host does with absolute paths, where the directory it stands in is gone, and where the
+// temporary directory has a name like an address.
+TEST_F(Opening, NeedsNoWorkingDirectory) {
+    sound().write(file("book.xlsx"));
+    fs::create_directories(file("c:"));
+    fs::copy_file(file("book.xlsx"), file("c:/book.xlsx"));
+    const fs::path address = temporary() / "a:/b";
+    fs::create_directories(address);
+    ::setenv("TMPDIR", (temporary().string() + "/a://b").c_str(), 1);
+    fs::create_directory(file("gone"));
+    fs::current_path(file("gone"));
+    fs::remove(file("gone"));
+    for (const std::string& book : {file("book.xlsx"), files().string() + "/c://book.xlsx"}) {
+        SCOPED_TRACE(book);
+        std::vector<std::string> names;
+        EXPECT_EQ(provider.GetWorksheets(book.c_str(), names), 0);
+        EXPECT_EQ(names.size(), 1UL);
+        EXPECT_TRUE(dp::IsMicrosoftXLSXFile(book.c_str()));
+        EXPECT_EQ(open(book), 0);
+        EXPECT_EQ(provider.GetTempDirectoryPath().find(temporary().string()), 0UL);
+        EXPECT_EQ(provider.CloseFile(), 0);
+        EXPECT_EQ(provider.taken(), "+S1 @0 0,0=1 @0");
+        provider.ClearWorksheets();
+    }
+    EXPECT_THROW(open("book.xlsx"), fs::filesystem_error) << "a relative name has nothing to be relative to";
+    ::setenv("TMPDIR", ".", 1);
+    EXPECT_THROW(open(file("book.xlsx")), fs::filesystem_error);
+    fs::current_path(workingDirectory());
+    ::setenv("TMPDIR", temporary().c_str(), 1);
+    EXPECT_TRUE(fs::is_empty(address));
+    fs::remove_all(temporary() / "a:");
+}
+
 TEST_F(Opening, CopiesAcrossFileSystems) {
     const fs::path other = fs::path("/dev/shm") / fs::unique_path("dpxlsx-%%%%-%%%%");
     boost::system::error_code error;
