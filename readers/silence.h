@@ -7,19 +7,15 @@ namespace dp {
 // While it lives, libxml2 reports nothing through the thread's own two channels, which may be the
 // host's; then those are as they were. Errors are told by results. Handlers of single readers do
 // not suffice: files that cannot be opened and bytes that cannot be decoded are reported past them.
+// Only the outermost of a thread does anything: every node is read under one, and libxml2 takes
+// long to find the channels.
 class SilentLibxml2 {
   public:
-    SilentLibxml2()
-        : handler_(xmlStructuredError),
-          context_(xmlStructuredErrorContext),
-          printer_(xmlGenericError),
-          printerContext_(xmlGenericErrorContext) {
-        xmlSetStructuredErrorFunc(nullptr, ignore);
-        xmlSetGenericErrorFunc(nullptr, ignoreText);
+    SilentLibxml2() {
+        if (depth_++ == 0) before_ = silence();
     }
     ~SilentLibxml2() {
-        xmlSetStructuredErrorFunc(context_, handler_);
-        xmlSetGenericErrorFunc(printerContext_, printer_);
+        if (--depth_ == 0) restore(before_);
     }
     SilentLibxml2(const SilentLibxml2&) = delete;
     SilentLibxml2& operator=(const SilentLibxml2&) = delete;
@@ -27,12 +23,28 @@ class SilentLibxml2 {
     static void ignore(void*, xmlErrorPtr) {}
 
   private:
-    static void ignoreText(void*, const char*, ...) {}
+    struct Channels {
+        xmlStructuredErrorFunc handler;
+        void* context;
+        xmlGenericErrorFunc printer;
+        void* printerContext;
+    };
 
-    xmlStructuredErrorFunc handler_;
-    void* context_;
-    xmlGenericErrorFunc printer_;
-    void* printerContext_;
+    static void ignoreText(void*, const char*, ...) {}
+    static Channels silence() {
+        const Channels before{xmlStructuredError, xmlStructuredErrorContext, xmlGenericError,
+                              xmlGenericErrorContext};
+        xmlSetStructuredErrorFunc(nullptr, ignore);
+        xmlSetGenericErrorFunc(nullptr, ignoreText);
+        return before;
+    }
+    static void restore(const Channels& channels) {
+        xmlSetStructuredErrorFunc(channels.context, channels.handler);
+        xmlSetGenericErrorFunc(channels.printerContext, channels.printer);
+    }
+
+    static inline constinit thread_local unsigned depth_ = 0;
+    Channels before_;  // of the outermost
 };
 
 }  // namespace dp

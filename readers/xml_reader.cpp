@@ -68,6 +68,7 @@ void XmlReader::mInitialize(const std::string& path) {
 }
 
 bool XmlReader::readNode() {
+    const dp::SilentLibxml2 silent;
     ++moves_;
     const int result = xmlTextReaderRead(textReader);
     ++moves_;

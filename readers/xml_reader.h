@@ -24,7 +24,9 @@ class DPXLSX_API CmXmlException {
 inline constexpr int kXmlError = 13;
 
 // Reads one XML document forward, node by node. There is no way back: what must be read twice is
-// opened twice. The network, external entities and entity substitution stay off.
+// opened twice. The network, external entities and entity substitution stay off. Nothing is
+// printed, and the host's error handlers for libxml2 learn of nothing, except from calls that the
+// host itself makes on `textReader`.
 class DPXLSX_API XmlReader {
   public:
     XmlReader();
