@@ -35,7 +35,8 @@ inline constexpr int kXmlDepth = 256;
 // element with every other, and copies a whole comment for every error in it.
 inline constexpr std::size_t kMarkupSize = 256 << 10;
 // Bytes from which markup is looked at more closely, and how many attributes or hyphens it may have
-// then.
+// then. CDATA sections are text and hold any number, as far as the encoding lets us tell them
+// apart.
 inline constexpr std::size_t kLongMarkup = 16 << 10;
 inline constexpr std::size_t kLongMarkupMarks = 4096;
 

@@ -8,16 +8,35 @@
 #include <cerrno>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <memory>
+#include <optional>
+#include <string_view>
 
 #include <libxml/xmlreader.h>
 
 #include "readers/limits.h"
+#include "readers/markup_marks.h"
 #include "readers/silence.h"
 
 namespace dp {
 
 namespace {
+
+// Whether the bytes of ASCII stand for nothing else in the document's encoding, as in UTF-8, which
+// need not be declared, and in the usual ones of a byte a character. UTF-16 need not be declared
+// either, but has zero bytes.
+bool keepsAscii(xmlTextReaderPtr reader) {
+    const xmlNode* node = reader ? xmlTextReaderCurrentNode(reader) : nullptr;
+    if (!node || !node->doc) return false;
+    const xmlChar* encoding = node->doc->encoding;
+    const auto beginsWith = [encoding](const char* name) {
+        return xmlStrncasecmp(encoding, reinterpret_cast<const xmlChar*>(name),
+                              static_cast<int>(std::strlen(name))) == 0;
+    };
+    return !encoding || beginsWith("UTF-8") || beginsWith("US-ASCII") || beginsWith("ISO-8859-") ||
+           beginsWith("windows-125");
+}
 
 // The file behind a reader, and how far libxml2 has come in it.
 class PartInput {
@@ -41,9 +60,9 @@ class PartInput {
         const std::ptrdiff_t count = std::min<std::ptrdiff_t>(size, end_ - next_);
         std::copy_n(next_, count, bytes);
         next_ += count;
-        supplied_ += count;
-        marks_ = waiting > kLongMarkup ? marks_ + marksIn(bytes, bytes + count) : 0;
-        return marks_ > kLongMarkupMarks ? -1 : static_cast<int>(count);
+        const bool isLong = waiting > kLongMarkup;
+        const std::string_view supply(bytes, static_cast<std::size_t>(count));
+        return countMarks(supply, isLong) ? static_cast<int>(count) : -1;
     }
 
   private:
@@ -70,9 +89,42 @@ class PartInput {
         movesBefore_ = moves_;
         return supplied_ - runStart_;
     }
-    static std::size_t marksIn(const char* begin, const char* end) {
-        return static_cast<std::size_t>(
-            std::count_if(begin, end, [](char c) { return c == '=' || c == '-'; }));
+
+    // False when there are too many in the long markup that these bytes belong to. What is markup
+    // costs more to tell than to count, so that is left until there seem to be too many.
+    bool countMarks(std::string_view supply, bool isLong) {
+        if (!isLong) {
+            marks_ = 0;
+            longStart_ = supplied_ + static_cast<std::int64_t>(supply.size());
+        }
+        supplied_ += static_cast<std::int64_t>(supply.size());
+        if (exactMarks_) {
+            const std::size_t marks = exactMarks_->countIn(supply);
+            if (isLong) marks_ += marks;
+        } else if (isLong) {
+            marks_ +=
+                static_cast<std::size_t>(std::count_if(supply.begin(), supply.end(), isMarkupMark));
+            if (marks_ > kLongMarkupMarks && keepsAscii(reader_) && !countExactly()) return false;
+        }
+        return marks_ <= kLongMarkupMarks;
+    }
+    // Begins with the document anew. False when that cannot be read a second time.
+    bool countExactly() {
+        exactMarks_.emplace();
+        std::array<char, std::size_t{4} << 10> again;
+        for (std::int64_t at = 0; at < supplied_;) {
+            const std::int64_t end = at < longStart_ ? longStart_ : supplied_;
+            const std::size_t size =
+                std::min<std::size_t>(again.size(), static_cast<std::size_t>(end - at));
+            const ssize_t count = ::pread(descriptor_, again.data(), size, at);
+            if (count < 0 && errno == EINTR) continue;
+            if (count <= 0) return false;
+            const std::size_t marks =
+                exactMarks_->countIn({again.data(), static_cast<std::size_t>(count)});
+            marks_ = at < longStart_ ? 0 : marks_ + marks;
+            at += count;
+        }
+        return true;
     }
 
     int descriptor_;
@@ -83,8 +135,10 @@ class PartInput {
     const char* next_ = nullptr;  // behind what libxml2 has got
     const char* end_ = nullptr;   // of what is in the buffer
     xmlTextReaderPtr reader_ = nullptr;
-    std::int64_t supplied_ = 0;  // bytes
-    std::size_t marks_ = 0;      // in the long markup that is waiting
+    std::int64_t supplied_ = 0;   // bytes
+    std::int64_t longStart_ = 0;  // from where the waiting markup counts as long, in bytes
+    std::size_t marks_ = 0;       // from there on
+    std::optional<MarkupMarks> exactMarks_;
 };
 
 extern "C" {

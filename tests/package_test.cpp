@@ -113,6 +113,15 @@ TEST_F(Packages, NothingFollowsAnErrorOfTheReceiver) {
     EXPECT_EQ(provider.calls, 1);
 }
 
+TEST_F(Packages, CdataSectionsHoldAnyText) {
+    std::string text = "==--";
+    while (text.size() < 240'000) text += text.size() % 7 == 0 ? "<b c='--'" : "=-";
+    const auto package =
+        PackageBuilder::of({"<row><c t='str'><v><![CDATA[" + text + "]]></v></c><c t='s'><v>0</v></c></row>"})
+            .set("xl/sharedStrings.xml", "<sst uniqueCount='1'><si><t>kept<![CDATA[" + text + "]]></t></si></sst>");
+    EXPECT_TRUE(readCells(package) == "0,0='" + text + "' 0,1='kept'");
+}
+
 // One long string in many cells: as many as are in proportion to the package, and then no more.
 TEST_F(Packages, RepeatedTextsHaveALimit) {
     const auto outcomeOf = [this](unsigned cells) {

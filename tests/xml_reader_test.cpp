@@ -106,6 +106,9 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
     const auto sized = [&framed](std::size_t size, const std::string& frame) {
         return framed(frame, std::string(size, 'x'));
     };
+    // Nearly as much as markup may be; all of it looks like attributes, and like ends of comments.
+    const auto marked = [&repeated](const std::string& frame) { return repeated(14'000, "<b c=\"--", frame); };
+    const std::string japanese = "<?xml version='1.0' encoding='ISO-2022-JP'?>";
     const std::string western = "<?xml version='1.0' encoding='windows-1252'?>";
     const struct {
         const char* name;
@@ -129,6 +132,15 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
                  {"many attributes", repeated(1000, "b", "<a @/>"), 0},
                  {"too many attributes", repeated(10'000, "b", "<a @/>"), 13},
                  {"many comments", framed("<a>@</a>", times(2'000'000, "<!--x-->")), 13},
+                 {"too many marks in a comment", repeated(9'000, "b", "<a><!--@--></a>"), 13},
+                 {"marks in a CDATA section", marked("<a><![CDATA[@]]></a>"), 0},
+                 {"marks in one of another encoding", marked(western + "<a><![CDATA[@]]></a>"), 0},
+                 {"marks in one behind odd markup",
+                  marked("<!DOCTYPE a [<!--'-->]><a b='>'><!-->--><?c '?><!--'--><![CDATA[@]]></a>"), 0},
+                 {"a CDATA section in front of attributes", repeated(9'000, "b", "<a><![CDATA[]]><b @/></a>"), 13},
+                 {"one in a comment", repeated(9'000, "b", "<a><!--<![CDATA[--><b @/></a>"), 13},
+                 {"one in an instruction", repeated(9'000, "b", "<a><?c <![CDATA[?><b @/></a>"), 13},
+                 {"one by its bytes", repeated(9'000, "b", japanese + "<a>\x1B$B<![CDATA[x\x1B(B<b @/></a>"), 13},
                  {"bytes that are no character", sized(10'000, western + "<a>@<b>\x81</b></a>"), 13},
                  {"an entity", "<!DOCTYPE a [<!ENTITY e 'x'>]><a b='&e;'/>", 13},
                  {"declared attributes", "<!DOCTYPE a [<!ATTLIST a b IDREF #IMPLIED>]><a b='c'/>", 13},

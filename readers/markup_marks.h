@@ -1,0 +1,43 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+namespace dp {
+
+// Equal signs and hyphens: an element has at least one of them for each attribute, a comment for
+// each error in it.
+constexpr bool isMarkupMark(char c) { return c == '=' || c == '-'; }
+
+// Counts them in a document that it is shown from its first byte on, except those in CDATA
+// sections, which are text. Follows the markup as far as it is well-formed; a parser goes no
+// further. Only for encodings in which the bytes of ASCII stand for nothing else.
+class MarkupMarks {
+  public:
+    // Of the document's next bytes.
+    std::size_t countIn(std::string_view bytes);
+
+  private:
+    // What begins and ends with certain bytes, whatever is in between.
+    struct Enclosed {
+        std::string_view opening;  // behind the "<"
+        std::string_view closing;
+    };
+    static constexpr Enclosed kComment{"!--", "-->"};
+    static constexpr Enclosed kSection{"![CDATA[", "]]>"};
+    static constexpr Enclosed kInstruction{"?", "?>"};
+
+    void take(char c);
+    void takeInTag(char c);
+    bool endsWith(std::string_view text) const;
+
+    const Enclosed* enclosed_ = nullptr;  // that the last byte is in
+    bool inTag_ = false;                  // also in a declaration
+    char quote_ = '\0';                   // of the attribute's value, in a tag
+    bool isAscii_ = true;                 // a zero byte is one of a wider encoding
+    std::uint64_t last_ = 0;              // the last 8 bytes
+    std::size_t length_ = 0;              // of what begins with the last "<", without that
+};
+
+}  // namespace dp
