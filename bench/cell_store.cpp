@@ -1,6 +1,7 @@
 // Compares the cell store with plain maps of maps: time and resident memory, each measurement in a
 // process of its own, the best of several runs. Cells are filed as a reader files them, through one
-// record that is filled again and again. Ends with 1 when a goal is missed.
+// record that is filled again and again. Ends with 1 when a goal is missed, and with 2 when a
+// measurement cannot be made or does not see every cell.
 
 #include <unistd.h>
 
@@ -16,10 +17,12 @@
 #include <sys/wait.h>
 #include <vector>
 
+#include "bench/verify.h"
 #include "store/worksheet_cells.h"
 
 namespace {
 
+using bench::require;
 using dp::ExternalDataRecord;
 using dp::WorksheetCells;
 
@@ -40,6 +43,7 @@ struct Figures {
     double walk = 1e9;
     double destroy = 1e9;
     double sum = 0.0;
+    unsigned long cells = 0;  // that the walk saw
 
     void keepBest(const Figures& other) {
         file = std::min(file, other.file);
@@ -47,6 +51,7 @@ struct Figures {
         walk = std::min(walk, other.walk);
         destroy = std::min(destroy, other.destroy);
         sum = other.sum;
+        cells = other.cells;
     }
 };
 
@@ -63,13 +68,6 @@ double secondsOf(const Work& work) {
     const auto start = std::chrono::steady_clock::now();
     work();
     return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
-
-// Stops with words when a measurement cannot be made.
-void require(bool holds, const char* what) {
-    if (holds) return;
-    std::perror(what);
-    std::exit(2);
 }
 
 template <typename Measure>
@@ -92,12 +90,12 @@ Figures inOwnProcess(const Measure& measure) {
 }
 
 template <typename Cells>
-double walk(const Cells& cells) {
-    double sum = 0.0;
+void walk(const Cells& cells, Figures& figures) {
     for (const auto& column : cells)
-        for (auto cell = column.second.begin(); cell != column.second.end(); ++cell)
-            sum += valueOf(cell->second) + cell->first;
-    return sum;
+        for (auto cell = column.second.begin(); cell != column.second.end(); ++cell) {
+            figures.sum += valueOf(cell->second) + cell->first;
+            ++figures.cells;
+        }
 }
 
 // Files `count` records as `fill` makes them; the first read belongs to the filing.
@@ -115,7 +113,7 @@ Figures measure(unsigned count, const Fill& fill) {
         figures.sum = cells->begin()->second.begin()->first;
     });
     figures.bytes = (residentBytes() - before) / count;
-    figures.walk = secondsOf([&] { figures.sum += walk(*cells); });
+    figures.walk = secondsOf([&] { walk(*cells, figures); });
     figures.destroy = secondsOf([&] { cells.reset(); });
     return figures;
 }
@@ -134,6 +132,7 @@ Pair compare(unsigned count, const MakeFill& makeFill) {
         best.plain.keepBest(inOwnProcess([&] { return measure<PlainCells>(count, makeFill()); }));
     }
     require(best.ours.sum == best.plain.sum, "the two stores differ");
+    require(best.ours.cells == count && best.plain.cells == count, "cells are missing");
     return best;
 }
 
@@ -268,8 +267,10 @@ void bigText() {
             for (; record.row < kCells; ++record.row) cells.add(record);
         });
         measured.bytes = residentBytes() - before;
+        measured.cells = cells.begin()->second.size();
         return measured;
     });
+    require(figures.cells == kCells, "cells are missing");
     printLimit("1 MB text in 100,000 cells: MB", figures.bytes / 1e6, 8.0);
     std::printf("%-44s %10.2f\n", "  ns a cell", figures.file / kCells * 1e9);
 }
@@ -277,10 +278,12 @@ void bigText() {
 }  // namespace
 
 int main() {
-    printHead();
-    numbers();
-    texts();
-    bigText();
-    outOfOrder();
-    return allReached ? 0 : 1;
+    return bench::resultOf([] {
+        printHead();
+        numbers();
+        texts();
+        bigText();
+        outOfOrder();
+        return allReached ? 0 : 1;
+    });
 }

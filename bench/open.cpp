@@ -3,7 +3,8 @@
 // Each run is a process of its own; ours and the floor's alternate, and the medians are compared.
 //
 // open [RUNS] [WORKLOAD]: RUNS of each (5 by default), of all workloads but the largest, or of
-// those whose names hold WORKLOAD; "large" names the largest.
+// those whose names hold WORKLOAD; "large" names the largest. Ends with 1 when a goal is missed,
+// and with 2 when a run did not do all of its work.
 
 #include <unistd.h>
 
@@ -25,6 +26,7 @@
 #include <libxml/xmlreader.h>
 #include <minizip/unzip.h>
 
+#include "bench/verify.h"
 #include "bench/workbooks.h"
 #include "provider/xlsx_data_provider.h"
 #include "readers/excel_xml_reader.h"
@@ -70,7 +72,8 @@ Measurement inProcess(const std::function<double()>& work) {
     const pid_t child = fork();
     if (child == 0) {
         const auto start = std::chrono::steady_clock::now();
-        const double closing = work();
+        double closing = 0;
+        if (bench::resultOf([&] { return closing = work(), 0; }) != 0) _exit(2);
         const double seconds = secondsSince(start);
         rusage usage{};
         getrusage(RUSAGE_SELF, &usage);
@@ -83,18 +86,28 @@ Measurement inProcess(const std::function<double()>& work) {
     waitpid(child, &status, 0);
     close(ends[0]);
     close(ends[1]);
-    if (!complete || status != 0) {
-        std::fprintf(stderr, "open: a run failed\n");
-        std::exit(1);
-    }
+    bench::require(complete && status == 0, "a run failed");
     return result;
 }
 
+class Provider : public dp::xlsxDataProvider {
+  public:
+    unsigned long cells() const {
+        unsigned long count = 0;
+        for (const dp::WorksheetCells& worksheet : _cells)
+            for (const auto& column : worksheet) count += column.second.size();
+        return count;
+    }
+};
+
 // Opens, closes and clears; `look` sees what is in between.
 template <class Look>
-double openOurs(const std::string& path, const Look& look) {
-    std::optional<dp::xlsxDataProvider> provider(std::in_place);
-    if (provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read) != 0) _exit(1);
+double openOurs(const std::string& path, unsigned long cells, const Look& look) {
+    std::optional<Provider> provider(std::in_place);
+    provider->SetReadOptionDefaultUseVariableNameRow(dp::VNR_NONE);
+    bench::require(provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read) == 0,
+                   "the workbook does not open");
+    bench::requireCount(provider->cells(), cells, "cells");
     look(*provider);
     const auto start = std::chrono::steady_clock::now();
     provider->CloseFile();
@@ -103,27 +116,25 @@ double openOurs(const std::string& path, const Look& look) {
     return secondsSince(start);
 }
 
-double openOurs(const std::string& path) {
-    return openOurs(path, [](const auto&) {});
+double openOurs(const std::string& path, unsigned long cells) {
+    return openOurs(path, cells, [](const auto&) {});
 }
 
 // Cells that came out of order are put in their places by the first column that is asked for.
-double openAndLoadOurs(const std::string& path) {
-    return openOurs(path, [](const dp::IExcelDataProvider& provider) {
-        const auto columns = static_cast<int>(provider.GetColumnCount(0));
-        for (int column = 0; column < columns; ++column) {
-            dp::IColumn* loaded = provider.GetColumn(0, column);
-            if (!loaded) _exit(1);
-            loaded->AddRef();
-            loaded->Release();
-        }
+double openAndLoadOurs(const std::string& path, unsigned long cells) {
+    return openOurs(path, cells, [cells](Provider& provider) {
+        unsigned long values = 0;
+        bench::forEachColumn(provider,
+                             [&](const dp::IColumn& column) { values += bench::valuesOf(column); });
+        bench::requireCount(values, cells, "values");
     });
 }
 
-double listOurs(const std::string& path) {
+double listOurs(const std::string& path, unsigned sheets) {
     dp::xlsxDataProvider provider;
     std::vector<std::string> names;
-    if (provider.GetWorksheets(path.c_str(), names) != 0) _exit(1);
+    bench::require(provider.GetWorksheets(path.c_str(), names) == 0, "no names of worksheets");
+    bench::requireCount(names.size(), sheets, "names of worksheets");
     return 0;
 }
 
@@ -212,36 +223,46 @@ void readSheetFloor(const fs::path& part, const std::vector<std::string>& string
     xmlFreeTextReader(reader);
 }
 
-double openFloor(const std::string& path) {
+double openFloor(const std::string& path, unsigned long cells) {
     const fs::path directory = unpackFloor(path);
     const std::vector<std::string> strings = readStringsFloor(directory / "xl/sharedStrings.xml");
     std::vector<std::deque<FloorColumn>> sheets;
     for (const auto& entry : fs::directory_iterator(directory / "xl/worksheets"))
         readSheetFloor(entry.path(), strings, sheets.emplace_back());
+    unsigned long values = 0;
+    for (const auto& sheet : sheets)
+        for (const FloorColumn& column : sheet)
+            values += column.numbers.size() + column.texts.size();
+    bench::requireCount(values, cells, "values of the floor");
     sheets.clear();
     fs::remove_all(directory);
     return 0;
 }
 
 double listFloor(const std::string& path) {
-    fs::remove_all(unpackFloor(path));
+    const fs::path directory = unpackFloor(path);
+    bench::require(fs::exists(directory / "xl/workbook.xml"), "the floor unpacks nothing");
+    fs::remove_all(directory);
     return 0;
 }
 
 // --- XML Spreadsheet 2003 ---
 
-double readOurs2003(const std::string& path) {
-    dp::xlsxDataProvider provider;
+double readOurs2003(const std::string& path, unsigned long cells) {
+    Provider provider;
     dp::ExcelXmlReader reader(path, "m/d/yy", 1.23456e30, &provider, nullptr);
     reader.mReadExcelWorkbook();
+    bench::requireCount(provider.cells(), cells, "cells");
     return 0;
 }
 
-double passFloor2003(const std::string& path) {
+double passFloor2003(const std::string& path, unsigned long cells) {
     xmlTextReaderPtr reader = xmlReaderForFile(path.c_str(), nullptr, 0x60);
-    while (xmlTextReaderRead(reader) == 1) {
-    }
+    unsigned long texts = 0;
+    while (xmlTextReaderRead(reader) == 1)
+        if (xmlTextReaderNodeType(reader) == XML_READER_TYPE_TEXT) ++texts;
     xmlFreeTextReader(reader);
+    bench::requireCount(texts, cells, "texts of the bare pass");
     return 0;
 }
 
@@ -302,19 +323,23 @@ class Program {
 
     void openings() {
         bench::writeWorkbook(book_, kGoals[5].workload);
-        const double idle = inProcess([&] { return openOurs(book_); }).bytes;
+        const unsigned long few = kGoals[5].workload.cells();
+        const double idle = inProcess([&] { return openOurs(book_, few); }).bytes;
         std::printf("%-36s %9s %9s %6s %5s %6s %5s %6s %5s\n", "open, close and clear", "ours ms",
                     "floor ms", "ratio", "goal", "close", "goal", "B/cell", "goal");
         for (const Goal& goal : kGoals) {
             const bool large = goal.workload.rows > 100000;
             if (large ? only_ != "large" : !isWanted(goal.workload.name)) continue;
             bench::writeWorkbook(book_, goal.workload);
-            const Medians medians = compare([this] { return openFloor(book_); });
+            const unsigned long cells = goal.workload.cells();
+            const Medians medians = measure(
+                runs_, [&] { return openOurs(book_, cells); },
+                [&] { return openFloor(book_, cells); });
             printTimes(goal.workload.name, medians, goal.ratio);
             if (goal.bytesPerCell > 0) {
-                const auto cells = static_cast<double>(goal.workload.cells());
+                const double bytes = medians.ours.bytes - idle;
                 printFigure(6, 3, medians.ours.closing / medians.floor.seconds, 0.05);
-                printFigure(6, 1, (medians.ours.bytes - idle) / cells, goal.bytesPerCell);
+                printFigure(6, 1, bytes / static_cast<double>(cells), goal.bytesPerCell);
             }
             if (goal.milliseconds > 0) {
                 std::printf("  ms:");
@@ -329,7 +354,8 @@ class Program {
         if (!isWanted(name)) return;
         bench::writeWorkbook(book_, kGoals[2].workload);
         const Medians medians = measure(
-            runs_, [this] { return listOurs(book_); }, [this] { return listFloor(book_); });
+            runs_, [this] { return listOurs(book_, kGoals[2].workload.sheets); },
+            [this] { return listFloor(book_); });
         printTimes(name, medians, 1.1);
         endRow();
     }
@@ -337,10 +363,12 @@ class Program {
     void older() {
         const std::string name = "XML 2003, 100,000 x 10 / bare pass";
         if (!isWanted(name)) return;
-        bench::writeSpreadsheet2003(document_, 100000, 10);
+        constexpr unsigned kRows = 100'000;
+        constexpr unsigned kColumns = 10;
+        bench::writeSpreadsheet2003(document_, kRows, kColumns);
         const Medians medians = measure(
-            runs_, [this] { return readOurs2003(document_); },
-            [this] { return passFloor2003(document_); });
+            runs_, [this] { return readOurs2003(document_, kRows * kColumns); },
+            [this] { return passFloor2003(document_, kRows * kColumns); });
         printTimes(name, medians, 1.5);
         endRow();
     }
@@ -358,11 +386,6 @@ class Program {
   private:
     bool isWanted(const std::string& name) const { return name.find(only_) != name.npos; }
 
-    Medians compare(const Work& floor) const {
-        return measure(
-            runs_, [this] { return openOurs(book_); }, floor);
-    }
-
     void order(Workload workload, bench::Order other, const std::string& what, double goal) const {
         const std::string name = what + workload.name;
         if (!isWanted(name)) return;
@@ -371,8 +394,8 @@ class Program {
         workload.order = other;
         bench::writeWorkbook(book_, workload);
         const Medians medians = measure(
-            runs_, [this] { return openAndLoadOurs(book_); },
-            [&] { return openAndLoadOurs(ordered); });
+            runs_, [&] { return openAndLoadOurs(book_, workload.cells()); },
+            [&] { return openAndLoadOurs(ordered, workload.cells()); });
         printTimes(name, medians, goal);
         endRow();
     }
@@ -388,12 +411,15 @@ class Program {
 int main(int argc, char** argv) {
     const fs::path directory = fs::temp_directory_path() / fs::unique_path("bench-%%%%-%%%%");
     fs::create_directory(directory);
-    Program program(argc > 1 ? std::max(1, std::atoi(argv[1])) : 5, argc > 2 ? argv[2] : "",
-                    directory);
-    program.openings();
-    program.listing();
-    program.older();
-    program.orders();
+    const int result = bench::resultOf([&] {
+        Program program(argc > 1 ? std::max(1, std::atoi(argv[1])) : 5, argc > 2 ? argv[2] : "",
+                        directory);
+        program.openings();
+        program.listing();
+        program.older();
+        program.orders();
+        return missed ? 1 : 0;
+    });
     fs::remove_all(directory);
-    return missed ? 1 : 0;
+    return result;
 }

@@ -13,9 +13,9 @@
 #include <string>
 #include <vector>
 
+#include "bench/verify.h"
 #include "bench/workbooks.h"
 #include "model/host/i_column.h"
-#include "model/host/i_finders.h"
 #include "model/host/i_string.h"
 #include "provider/xlsx_data_provider.h"
 
@@ -49,30 +49,21 @@ class Columns {
     Columns& operator=(const Columns&) = delete;
 
     void pull(dp::IDataProvider& provider) {
-        const auto& worksheets = *provider.GetWorksheetFinder()->GetWorksheetPrimeKeys();
-        dp::IVariableFinder& finder = *provider.GetVariableFinder();
-        for (unsigned long sheet = 0; sheet < worksheets.Count(); ++sheet) {
-            const auto& keys = *finder.GetColumnPrimeKeys(worksheets.Item(sheet));
-            for (unsigned long key = 0; key < keys.Count(); ++key) {
-                dp::IColumn* column = nullptr;
-                if (finder.FindColumn(keys.Item(key), &column, false)) hold(column);
-            }
-        }
+        bench::forEachColumn(provider, [this](dp::IColumn& column) { hold(column); });
     }
 
     unsigned long values() const { return values_; }
     double sum() const { return sum_; }
 
   private:
-    void hold(dp::IColumn* column) {
-        column->AddRef();
-        held_.push_back(column);
-        values_ += static_cast<unsigned long>(column->GetRowCount() - column->GetMissingCount());
-        if (column->GetStorageType() == dp::IVariable::StorageType::Text)
-            look(*static_cast<const dp::ITextColumn*>(column)->GetTextValues());
+    void hold(dp::IColumn& column) {
+        column.AddRef();
+        held_.push_back(&column);
+        values_ += bench::valuesOf(column);
+        if (column.GetStorageType() == dp::IVariable::StorageType::Text)
+            look(*static_cast<const dp::ITextColumn&>(column).GetTextValues());
         else
-            look(static_cast<const dp::INumericColumn*>(column)->GetValues(),
-                 column->GetRowCount());
+            look(static_cast<const dp::INumericColumn&>(column).GetValues(), column.GetRowCount());
     }
 
     void look(const dp::IReadOnlyCollection<dp::IString&>& texts) {
