@@ -18,11 +18,19 @@ set_target_properties(dpxlsx PROPERTIES EXPORT_NAME dpxlsx)
 target_include_directories(dpxlsx INTERFACE $<INSTALL_INTERFACE:${headers_dir}>)
 target_compile_features(dpxlsx INTERFACE cxx_std_17)
 
-# The tool finds the library that was installed with it, wherever the two are moved.
-file(RELATIVE_PATH tool_to_library /${CMAKE_INSTALL_BINDIR} /${CMAKE_INSTALL_LIBDIR})
-set_target_properties(dpxlsx_tool PROPERTIES INSTALL_RPATH "$ORIGIN/${tool_to_library}")
-install(TARGETS dpxlsx_tool RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
-install(FILES docs/dpxlsx.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
+set(docs_dir ${CMAKE_INSTALL_DATADIR}/doc/dpxlsx)
+install(FILES docs/host-guide.md docs/import-rules.md docs/security.md CHANGELOG.md
+    DESTINATION ${docs_dir})
+install(FILES examples/minimal_host.cpp examples/linked_host.cpp DESTINATION ${docs_dir}/examples)
+
+if(DPXLSX_TOOL)
+    # The tool finds the library that was installed with it, wherever the two are moved.
+    file(RELATIVE_PATH tool_to_library /${CMAKE_INSTALL_BINDIR} /${CMAKE_INSTALL_LIBDIR})
+    set_target_properties(dpxlsx_tool PROPERTIES INSTALL_RPATH "$ORIGIN/${tool_to_library}")
+    install(TARGETS dpxlsx_tool RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
+    install(FILES docs/dpxlsx.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
+    install(FILES docs/tool.md docs/tool.schema.json DESTINATION ${docs_dir})
+endif()
 
 # The interfaces, and the headers of the classes and functions that a host may link to by name with
 # what those include.
@@ -88,11 +96,6 @@ file(RELATIVE_PATH pkgconfig_to_prefix /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
 string(REGEX REPLACE "/$" "" pkgconfig_to_prefix "${pkgconfig_to_prefix}")
 configure_file(cmake/dpxlsx.pc.in dpxlsx.pc @ONLY)
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/dpxlsx.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
-
-set(docs_dir ${CMAKE_INSTALL_DATADIR}/doc/dpxlsx)
-install(FILES docs/host-guide.md docs/import-rules.md docs/tool.md docs/tool.schema.json
-              docs/security.md CHANGELOG.md DESTINATION ${docs_dir})
-install(FILES examples/minimal_host.cpp examples/linked_host.cpp DESTINATION ${docs_dir}/examples)
 
 # `cpack --config BUILD/deb.cmake` makes the package. Under CPack's usual name the file would bring a
 # build target "package" into every folder, where one of the fuzz targets has that name.

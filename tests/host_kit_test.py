@@ -216,6 +216,14 @@ int main() {
             self.assertEqual(run(made / "host", cwd=made, env={"LD_LIBRARY_PATH": str(self.libraries)}),
                              "1: 13 rows\n2: 10 rows\n")
 
+    def test_the_library_alone_needs_nothing_of_the_tool(self):
+        alone = self.work / "alone"
+        run(CMAKE, "-S", SOURCE, "-B", alone, "-DDPXLSX_TOOL=OFF", "-DCMAKE_DISABLE_FIND_PACKAGE_CLI11=ON",
+            "-DCMAKE_DISABLE_FIND_PACKAGE_nlohmann_json=ON")
+        installs = (alone / "cmake_install.cmake").read_text()
+        self.assertIn("libdpxlsx.so", installs)
+        self.assertNotRegex(installs, r"bin/dpxlsx|dpxlsx\.1\b|tool\.md")
+
     def test_tool_finds_its_library_and_its_page_names_every_option(self):
         tool = self.prefix / "bin" / "dpxlsx"
         self.assertIn("Measurements", run(tool, "--list", SAMPLE, env=self.environment))
