@@ -1,48 +1,73 @@
 #include "tools/help.h"
 
+#include <algorithm>
+
+#include <nlohmann/json.hpp>
+
+#include "tools/option_table.h"
+
 namespace dp::tool {
 
-const char* helpText() {
-    return R"(Usage: dpxlsx [OPTIONS] BOOK.xlsx
-Imports an Excel workbook through the import library, as a host does, and shows
-each worksheet's columns and first rows. Instead, or for a part of it:
-  --list                    names of the worksheets, without reading cells
-  --explain                 what the import does to this book that may surprise
-  --csv [FILE|DIR/|-]       values as CSV; several worksheets go into a folder
-  --json [FILE|-]           all that a host can read; what --explain finds
-  --as-shown, --head N      CSV as displayed; first N rows (0 none; tables: 10)
-  --sheet NAME|KEY ...      only this worksheet
-Rows:
-  --names given|none|infer  where names are: a row (default), nowhere, look
-  --name-row ROW            row of the names (1)
-  --first-row ROW           first row of data (the one after the names)
-  --rows N                  number of data rows to read
-  --skip-blank-rows         leave out rows without any cell
-  --pad                     fill short columns with missing values
-  --preview                 read the first 101 rows of each column only
-Worksheets and columns (COLUMN is C, 3 or SHEET!C):
-  --exclude-sheet NAME|KEY ..., --exclude COLUMN ...         leave out
-  --type COLUMN=KIND ...    read as this kind: numeric, text or datetime
-  --rename COLUMN=NAME ..., --position COLUMN=N ...          at the host
-  --max-name N              longest variable name, in characters
-  --clean-sheet-names       replace ? * / : < > | " \ in names of worksheets
-Missing values (NUMBER is a number or the word missing):
-  --missing VALUE           number that marks a missing value (1.23456e30)
-  --missing-number NUMBER=NUMBER   numbers equal to the first become the second
-  --missing-word TEXT=NUMBER       such texts in numeric columns become a number
-  --missing-text TEXT=TEXT         texts equal to the first become the second
-  --missing-display TEXT           how a missing number is shown (*)
-Values:
-  --decimal SYMBOL          of numbers written as texts, and on display (.)
-  --range MIN:MAX           numbers outside become missing (-1.001e18:1.001e18)
-  --max-text N              longest text, in bytes (80), or none
-  --clean-text              trim texts, drop control characters
-  --dates-as-text           read date-times as their displayed texts
-  --true TEXT, --false TEXT texts of Booleans (TRUE, FALSE)
-Program: --library FILE, --help, --version. Options with ... may be repeated.
+namespace {
+
+constexpr const char* kIntroduction = R"(Usage: dpxlsx [OPTIONS] BOOK.xlsx
+Imports an Excel workbook as a statistics host does, and shows the columns and
+first rows of each worksheet.
+)";
+
+constexpr const char* kExitCodes =
+    R"(Options with ... may be repeated. Defaults are in parentheses.
 Exit codes: 0 done, 1 damaged, 2 usage, 3 output, 4 library, 5 system, 13 bad
 part, 17 no file, 18 temporary folder, 22 no package, 25 no workbook, 128+signal
 )";
+
+std::string valueText(const OptionRow& row) {
+    const std::string value = row.value;
+    if (row.action.takes == Takes::ValueOrNothing) return " [" + value + "]";
+    if (row.action.takes == Takes::ValueEachTime) return " " + value + " ...";
+    return value.empty() ? value : " " + value;
+}
+
+std::string line(const OptionRow& row) {
+    constexpr size_t kSummaryColumn = 28;
+    std::string text = "  " + std::string(row.names) + valueText(row) + "  ";
+    text.resize(std::max(text.size(), kSummaryColumn), ' ');
+    text += row.summary;
+    std::erase(text, '`');
+    return text + "\n";
+}
+
+std::string groupText(const OptionGroup& group) {
+    const std::string note = group.note;
+    std::string text = group.title + (note.empty() ? note : " (" + note + ")") + ":\n";
+    for (const OptionRow& row : group.rows) text += line(row);
+    return text;
+}
+
+}  // namespace
+
+std::string helpText() {
+    std::string text = kIntroduction;
+    for (const OptionGroup& group : optionGroups()) text += groupText(group);
+    return text + kExitCodes;
+}
+
+std::string shortHelpText() {
+    return kIntroduction + groupText(optionGroups().front()) + "All options: dpxlsx --help\n";
+}
+
+std::string optionTableText() {
+    auto groups = nlohmann::json::array();
+    for (const OptionGroup& group : optionGroups()) {
+        auto rows = nlohmann::json::array();
+        for (const OptionRow& row : group.rows) {
+            rows.push_back({{"names", row.names},
+                            {"value", valueText(row)},
+                            {"meaning", std::string(row.summary) + row.more}});
+        }
+        groups.push_back({{"title", group.title}, {"text", group.text}, {"options", rows}});
+    }
+    return groups.dump(1) + "\n";
 }
 
 }  // namespace dp::tool

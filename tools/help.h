@@ -1,8 +1,16 @@
 #pragma once
 
+#include <string>
+
 namespace dp::tool {
 
-// Usage, every option by group, and the exit codes, for a screen of 40 lines of 80 characters.
-const char* helpText();
+// Usage, every option by group, and the exit codes, for a screen of 50 lines of 80 characters.
+std::string helpText();
+
+// Usage and the first group, for somebody who gave no argument at all.
+std::string shortHelpText();
+
+// The table of the options as JSON, which the options of the pages are made from.
+std::string optionTableText();
 
 }  // namespace dp::tool

@@ -1,8 +1,10 @@
+#include <cstdio>
 #include <filesystem>
 
 #include "tools/csv.h"
 #include "tools/exit_code.h"
 #include "tools/explain.h"
+#include "tools/help.h"
 #include "tools/interrupt.h"
 #include "tools/json_view.h"
 #include "tools/library.h"
@@ -84,6 +86,10 @@ void carryOut(const Options& options) {
 int run(int count, const char* const* arguments) {
     constexpr int kSignalBase = 128;
     noteInterrupts();
+    if (count < 2) {
+        std::fputs(shortHelpText().c_str(), stderr);
+        return kUsage;
+    }
     try {
         const Request request = parseOptions(count, arguments);
         if (request.answer.empty()) {
