@@ -360,6 +360,11 @@ TEST_F(ColumnsOnDemand, GivesAKeyOutAgainWithoutItsRows) {
     file(provider, 1, "'c");
     provider.GetWorksheetPrimeKeys();
     EXPECT_EQ(brief(1) + ", " + brief(2), "b: 2 3, c: * *");
+    provider.SetReadOptionExclude(1, true);
+    provider.SetReadOptionIgnoreBlankRows(false);
+    provider.SetReadOptionIgnoreBlankRows(true);
+    provider.SetReadOptionExclude(1, false);
+    EXPECT_EQ(brief(1), "b: 2 3") << "found when the worksheet is shown again";
     provider.SetReadOptionIgnoreBlankRows(false);
     EXPECT_EQ(brief(1), "b: * 2 3");
     file(provider, 1, "|1");
