@@ -20,6 +20,14 @@ int closeFile(voidpf file, voidpf) {
     return std::fclose(std::exchange(*static_cast<std::FILE**>(file), nullptr));
 }
 
+// The end of the file where more is expected is an error. On its own minizip goes on, with the
+// bytes before the missing ones (1.1) or zeros (1.3), and each opens other archives that are cut
+// short.
+int failed(voidpf, voidpf stream) {
+    std::FILE* const file = static_cast<std::FILE*>(stream);
+    return std::ferror(file) != 0 || std::feof(file) != 0;
+}
+
 }  // extern "C"
 
 unzFile openArchive(const std::string& path, std::FILE** file) {
@@ -27,6 +35,7 @@ unzFile openArchive(const std::string& path, std::FILE** file) {
     fill_fopen64_filefunc(&functions);
     functions.zopen64_file = openFile;
     functions.zclose_file = closeFile;
+    functions.zerror_file = failed;
     functions.opaque = file;
     return unzOpen2_64(path.c_str(), &functions);
 }

@@ -275,6 +275,15 @@ TEST_F(Opening, ChecksEveryEntry) {
     provider.CloseFile();
 }
 
+TEST_F(Opening, NeedsAWholeEndRecord) {
+    sound().write(file("book.xlsx"));
+    const std::string bytes = content("book.xlsx");
+    for (std::size_t missing = 1; missing <= 22; ++missing) {
+        write("cut.xlsx", bytes.substr(0, bytes.size() - missing));
+        EXPECT_EQ(open(file("cut.xlsx")), -22) << missing;
+    }
+}
+
 TEST_F(Opening, StaysUsableAfterFailures) {
     EXPECT_THROW(openPackage(PackageBuilder::of({kRow, "<row>"})), CmXmlException);
     EXPECT_NE(provider.taken(), "");
