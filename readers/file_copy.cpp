@@ -2,6 +2,7 @@
 
 #include <unistd.h>
 
+#include <cstdint>
 #include <filesystem>
 #include <system_error>
 
@@ -13,13 +14,19 @@ bool copyFile(const std::string& source, const std::string& target) {
     const fs::path to(target);
     std::error_code error;
     try {
-        if (fs::copy_file(from, to, fs::copy_options::none, error) && !error)
-            fs::permissions(to, fs::perms::owner_read | fs::perms::owner_write, error);
+        const std::uintmax_t size = fs::file_size(from, error);
+        if (error) return false;
+        fs::copy_file(from, to, fs::copy_options::none, error);
+        if (error == std::errc::file_exists) return false;
+        // A source that became shorter meanwhile is no error to the library of g++ 14 and later.
+        if (!error && fs::file_size(to, error) < size)
+            error = std::make_error_code(std::errc::io_error);
+        if (!error) fs::permissions(to, fs::perms::owner_read | fs::perms::owner_write, error);
     } catch (...) {
         ::unlink(to.c_str());
         throw;
     }
-    if (error && error != std::errc::file_exists) ::unlink(to.c_str());
+    if (error) ::unlink(to.c_str());
     return !error;
 }
 

@@ -1,10 +1,12 @@
 #include <dlfcn.h>
 
+#include <cerrno>
 #include <csignal>
 #include <deque>
 #include <functional>
 #include <sys/resource.h>
 #include <sys/statvfs.h>
+#include <utility>
 
 #include "provider/xlsx_data_provider.h"
 #include "readers/file_copy.h"
@@ -67,7 +69,15 @@ extern "C" int close(int file) {
     return real(file) == 0 && std::exchange(closes, true) ? 0 : -1;
 }
 
-// Called by the C++ library, which must see it.
+// Called by the C++ library, which must see them; which of the two comes first depends on its version.
+extern "C" [[gnu::visibility("default")]] ssize_t copy_file_range(int in, off64_t* inOffset, int out,
+                                                                  off64_t* outOffset, std::size_t size,
+                                                                  unsigned flags) {
+    static const auto real = realOne(&copy_file_range, "copy_file_range");
+    if (std::exchange(copies, [] { return true; })()) return real(in, inOffset, out, outOffset, size, flags);
+    errno = EIO;
+    return -1;
+}
 extern "C" [[gnu::visibility("default")]] ssize_t sendfile(int out, int in, off_t* offset, std::size_t size) noexcept {
     static const auto real = realOne(&sendfile, "sendfile");
     if (std::exchange(copies, [] { return true; })()) return real(out, in, offset, size);
