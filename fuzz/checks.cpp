@@ -16,6 +16,8 @@
 #include <boost/filesystem.hpp>
 #include <libxml/parser.h>
 
+#include "readers/silence.h"
+
 namespace fuzz {
 
 namespace {
@@ -28,7 +30,9 @@ const int messages = ::dup(STDERR_FILENO);
 extern "C" void onXmlMessage(void*, const char*, ...) {
     fail("libxml2 reported to the host's handler");
 }
-extern "C" void onXmlError(void*, xmlErrorPtr) { fail("libxml2 reported to the host's handler"); }
+extern "C" void onXmlError(void*, dp::XmlErrorPointer) {
+    fail("libxml2 reported to the host's handler");
+}
 
 // The directories of this process, and a host's handlers of libxml2.
 class Surroundings {

@@ -7,6 +7,8 @@
 
 #include <cstdint>
 #include <cstdio>
+#include <fstream>
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -33,8 +35,8 @@ void closeStreams() {
 }
 
 void run(const fs::path& path) {
-    std::string content;
-    fs::load_string_file(path, content);
+    std::ifstream stream(path.string(), std::ios::binary);
+    const std::string content(std::istreambuf_iterator<char>(stream), {});
     ::dprintf(names, "%s\n", path.filename().c_str());
     LLVMFuzzerTestOneInput(reinterpret_cast<const std::uint8_t*>(content.data()), content.size());
 }

@@ -1,8 +1,16 @@
 #pragma once
 
 #include <libxml/xmlerror.h>
+#include <libxml/xmlversion.h>
 
 namespace dp {
+
+// What a handler of errors is given: constant from libxml2 2.12 on.
+#if LIBXML_VERSION >= 21200
+using XmlErrorPointer = const xmlError*;
+#else
+using XmlErrorPointer = xmlError*;
+#endif
 
 // While it lives, libxml2 reports nothing through the thread's own two channels, which may be the
 // host's; then those are as they were. Errors are told by results. Handlers of single readers do
@@ -20,7 +28,7 @@ class SilentLibxml2 {
     SilentLibxml2(const SilentLibxml2&) = delete;
     SilentLibxml2& operator=(const SilentLibxml2&) = delete;
 
-    static void ignore(void*, xmlErrorPtr) {}
+    static void ignore(void*, XmlErrorPointer) {}
 
   private:
     struct Channels {

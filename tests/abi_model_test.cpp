@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <memory>
 
 #include "formats/date_time_variable_format.h"

@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <regex>
 
 #include "readers/xml_reader.h"

@@ -2,6 +2,7 @@
 
 #include <cstdlib>
 #include <fstream>
+#include <iterator>
 #include <string>
 
 #include <boost/filesystem.hpp>
@@ -39,6 +40,10 @@ class TemporaryFiles : public testing::Test {
         boost::filesystem::create_directories(path.parent_path());
         std::ofstream(path.string(), std::ios::binary) << content;
         return path.string();
+    }
+    std::string content(const std::string& name) const {
+        std::ifstream stream(file(name), std::ios::binary);
+        return {std::istreambuf_iterator<char>(stream), {}};
     }
 
   private:
