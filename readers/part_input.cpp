@@ -175,6 +175,11 @@ xmlTextReaderPtr openDocument(const std::string& path, const std::uint32_t& move
     return reader;
 }
 
+void limitNames(xmlTextReaderPtr reader) {
+    const xmlNode* node = xmlTextReaderCurrentNode(reader);
+    if (node && node->doc && node->doc->dict) xmlDictSetLimit(node->doc->dict, kXmlNames);
+}
+
 bool declaresTooMuch(xmlTextReaderPtr reader) {
     const xmlNode* node = xmlTextReaderCurrentNode(reader);
     const xmlDtd* declarations = node && node->doc ? node->doc->intSubset : nullptr;

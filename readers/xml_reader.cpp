@@ -9,6 +9,7 @@
 
 #include "readers/cm_xml_cast.h"
 #include "readers/file_copy.h"
+#include "readers/limits.h"
 #include "readers/part_input.h"
 #include "readers/silence.h"
 #include "readers/temporary_path.h"
@@ -41,6 +42,11 @@ void requireNoElement(int nodeType) {
         throw CmXmlException(kXmlError);
 }
 
+bool isTooDeep(xmlTextReaderPtr reader) {
+    return xmlTextReaderDepth(reader) >= dp::kXmlDepth &&
+           xmlTextReaderNodeType(reader) == XML_READER_TYPE_ELEMENT;
+}
+
 }  // namespace
 
 CmXmlException::CmXmlException(int code) : code_(code) {}
@@ -65,6 +71,7 @@ void XmlReader::mInitialize(const std::string& path) {
     }
     if (!textReader || !readNode() || dp::declaresTooMuch(textReader))
         throw CmXmlException(kXmlError);
+    dp::limitNames(textReader);
 }
 
 bool XmlReader::readNode() {
@@ -73,7 +80,7 @@ bool XmlReader::readNode() {
     const int result = xmlTextReaderRead(textReader);
     ++moves_;
     endOfFile = result == 0;
-    if (result == -1) throw CmXmlException(kXmlError);
+    if (result == -1 || isTooDeep(textReader)) throw CmXmlException(kXmlError);
     return !endOfFile;
 }
 
