@@ -1,5 +1,6 @@
 #include <dlfcn.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <csignal>
 #include <deque>
