@@ -36,7 +36,7 @@ class DPXLSX_API ReadOnlyStringCollection<IString&> : public IReadOnlyCollection
     unsigned long Count() const override;
     IString& Item(unsigned long index) const override;
 
-    // The interface promises a modifiable string from a collection that is itself only read.
+    // Mutable, because the interface hands out modifiable strings from a const collection.
     mutable std::vector<String> items;
 };
 

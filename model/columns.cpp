@@ -12,8 +12,8 @@ namespace dp {
 
 namespace {
 
-// The decimal point of the environment's numbers, asked for once in the life of the process; only
-// its LC_NUMERIC counts, and a locale that the machine does not have gives the point.
+// The decimal point of the environment's locale, determined once per process. Only LC_NUMERIC
+// counts; when its locale is not installed, the result is ".".
 char environmentDecimalPoint() {
     static std::string output_decimal;
     if (output_decimal.empty()) {

@@ -8,9 +8,9 @@
 #include "model/host/i_variable_format.h"
 #include "model/string.h"
 
-// The columns that loading makes. A getter returns the field of its name where there is one. Fields
-// are filled once, by the load, and then only read, but for the keys that the host sets; the order
-// of the fields and of the operations is part of the binary contract.
+// The columns that loading makes. A getter returns the field of its name where there is one. A load
+// fills the fields; afterwards only the setters of keys change any. The order of the fields and of
+// the operations is part of the binary contract.
 namespace dp {
 
 class DPXLSX_API ColumnView : public IColumnView {

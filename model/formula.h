@@ -65,8 +65,8 @@ class DPXLSX_API FormulaNode : public IFormulaNode {
     std::vector<IFormulaNode*> childNodes;
 };
 
-// A node that the host reaches through FormulaNode and through the interface of its kind: answers
-// the shared questions once for both.
+// A node that the host reaches through FormulaNode and through the interface of its kind.
+// Implements once, for both bases, the operations that they have in common.
 template <class Interface, int kType>
 class DPXLSX_API FormulaNodeOf : public FormulaNode, public Interface {
   public:
@@ -140,7 +140,7 @@ class DPXLSX_API FormulaModelVariableNode : public FormulaNodeOf<IFormulaModelVa
     int variablePrimeKey = 0;
 };
 
-// Deletes its nodes when it goes.
+// Owns its nodes.
 class DPXLSX_API FormulaManager : public IFormulaManager {
   public:
     FormulaManager();
