@@ -8,7 +8,7 @@
 namespace dp {
 namespace {
 
-// A month has three letters or more where "m" could also mean minutes.
+// Where "m" could also mean minutes, only three letters or more mean a month.
 constexpr int kMostMinuteLetters = 2;
 constexpr int kMostFractionDigits = 3;
 
@@ -25,7 +25,7 @@ class DateTimeScan {
         return time_ ? EXCEL_FORMAT_TIME : EXCEL_FORMAT_NONE;
     }
 
-    // The section, its fractional seconds rewritten as far as it was read.
+    // The section; fractional seconds are rewritten in the part that was read.
     std::string takeText() { return std::move(text_); }
 
   private:

@@ -13,11 +13,12 @@
 namespace dp {
 namespace {
 
-// A null result of ICU's allocating functions is their only sign of exhausted memory.
+// ICU's allocating functions report exhausted memory only by returning null.
 icu::DateFormat* createICUFormatter(const std::string& pattern) {
     icu::DateFormat* formatter = nullptr;
     if (!pattern.empty()) {
-        // A pattern that ICU rejects still makes a formatter, which renders what ICU makes of it.
+        // A pattern that ICU rejects still gives a formatter, which renders as much as ICU
+        // understood.
         UErrorCode status = U_ZERO_ERROR;
         formatter = new icu::SimpleDateFormat(icu::UnicodeString::fromUTF8(pattern),
                                               icu::Locale::getUS(), status);
@@ -62,7 +63,7 @@ IString* DateTimeVariableFormat::FormatValue(double value, bool) const {
     utf8.clear();
     icu::StringByteSink<std::string> sink(&utf8);
     output.toUTF8(sink);
-    return new String(utf8.c_str());  // ends at the first NUL that a pattern may hold
+    return new String(utf8.c_str());  // ends at the first NUL: a pattern may contain one
 }
 
 void DateTimeVariableFormat::GetDateTimeParameters(unsigned* p1, unsigned* p2, unsigned* p3,

@@ -28,14 +28,16 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
 
     FormatType GetType() const override;
     bool GetAuto() const override;
-    // A new string. The days 60 (which never was) and 61 both show as 1 March 1900.
+    // A new string. Day 60, the 29 February 1900 that never existed, shows as 1 March 1900, as day
+    // 61 does.
     IString* FormatValue(double value, bool fullPrecision) const override;
     void GetDateTimeParameters(unsigned* p1, unsigned* p2, unsigned* p3,
                                unsigned* p4) const override;
     void SetDateTimeParameters(const IDateTimeVariableFormat* other) override;
     const IString* GetFormatString() const override;
 
-    // Neutral answers: conversions are the business of the host's own implementation.
+    // These do nothing and return neutral values: converting is left to the host's own
+    // implementation.
     bool ConvertToDatetime(const IString* format, IString* text, double& value) const override;
     double GenerateTime(int year, int month, int day, int hour, int minute, int second,
                         int millisecond) const override;
@@ -47,8 +49,8 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
     bool autoFormat = true;
     unsigned dateTimeParameters[4] = {};  // the host's
     String pattern;                       // set once, by the constructor
-    // Owned; null until the first value is rendered. Making one takes as long as rendering some
-    // twenty values, and most formats never render.
+    // Owned; created when the first value is rendered, hence mutable. Creating one takes as long as
+    // rendering some twenty values, and most formats never render any.
     mutable icu::DateFormat* formatter = nullptr;
 };
 

@@ -38,16 +38,16 @@ DPXLSX_API bool parseScientficFormat(const std::string& code);
 // A code whose first section groups thousands and carries a currency tag or a quoted text.
 DPXLSX_API bool parseCurrencyFormat(const std::string& code);
 
-// A code with date or time letters. Accepted: `cleaned` is the first section without backslashes
-// and without the locale tag and what stands before it, and `type` one of the three date-time
-// types; behind a bracketed part, the point after seconds becomes the input decimal symbol and up
-// to three zeros behind it become "s". Rejected: `cleaned` is the whole code without backslashes,
-// the tag and what stands before it, and `type` is left alone. `cleaned` may be `code` itself.
+// Whether the code shows dates or times. If so, `cleaned` is the first section without backslashes,
+// locale tag and what precedes the tag, and `type` is one of the three date-time types; after a
+// bracketed part such as "[h]", the point after the seconds becomes the input decimal symbol and up
+// to three zeros behind it become "s". If not, `cleaned` is the whole code without backslashes, tag
+// and what precedes the tag, and `type` is unchanged. `cleaned` may be `code` itself.
 DPXLSX_API bool parseDateTimeFormat(const std::string& code, std::string& cleaned,
                                     EXCEL_FORMAT_TYPE& type);
 
-// New formats for codes that the recogniser of the same kind accepted; the caller owns them. The
-// code is only read.
+// New formats for codes that the recogniser of the same kind accepted; the caller owns them. `code`
+// is not changed.
 DPXLSX_API NumericVariableFormat* createVextralDecimalFormat(std::string& code);
 DPXLSX_API PercentageVariableFormat* createVextralPercentageFormat(std::string& code);
 DPXLSX_API NumericVariableFormat* createVextralScientificFormat(std::string& code);

@@ -2,9 +2,9 @@
 
 namespace dp {
 
-// The decimal symbol that the host has set for the whole process, '.' by default. Formats render
-// with it although the setting belongs to the provider, two layers up: this one function, defined
-// beside the setting, is the only way by which they see it.
+// The decimal symbol that the host has set for the whole process, '.' by default. Formats need it
+// for rendering, but the setting belongs to the provider, two layers up. This function is therefore
+// declared here and defined beside the setting; formats see nothing else of the provider.
 char inputDecimal() noexcept;
 
 }  // namespace dp

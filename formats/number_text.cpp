@@ -30,7 +30,8 @@ std::string rendered(double value, std::chars_format notation, int precision) {
     return text;
 }
 
-// What a stream reads from the text: the largest double of its sign where the text exceeds it.
+// The value that a stream reads from the text. A text beyond the largest double reads as the
+// largest double of the same sign.
 double readBack(const std::string& text) {
     double value = 0;
     const auto result = std::from_chars(text.data(), text.data() + text.size(), value);
@@ -48,8 +49,9 @@ int shortestDigits(double value) {
     return static_cast<int>(std::count_if(buffer, mantissaEnd, isDigit));
 }
 
-// Doubles lie twice as dense below a power of two as above it: there the nearest decimal may miss
-// although one a little farther off reads back. Above the largest double there is none at all.
+// Whether the next doubles on both sides are equally far away. Below a power of two doubles are
+// twice as dense as above it: the nearest decimal may then read back as another double although a
+// slightly farther one reads back correctly. The largest double has no neighbour above.
 bool hasEvenNeighbours(double value) {
     int exponent = 0;
     return std::fabs(std::frexp(value, &exponent)) != 0.5 &&

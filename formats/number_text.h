@@ -22,8 +22,8 @@ std::string scientificText(double value, int decimals);
 // largest double.
 int roundTripDigits(double value);
 
-// Takes trailing zeros out of the mantissa of a scientific text, at most `decimals`, and the point
-// with them when all `decimals` were zeros; and the leading zero of an exponent of three digits.
+// Removes up to `decimals` trailing zeros from the mantissa of a scientific text, the point too
+// when all `decimals` are zeros, and the leading zero of a three-digit exponent.
 void tidyScientific(std::string& text, int decimals);
 
 // Replaces the first "." of the text by the process-wide input decimal symbol.

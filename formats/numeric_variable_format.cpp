@@ -27,7 +27,7 @@ bool NumericVariableFormat::GetAuto() const { return autoFormat; }
 IString* NumericVariableFormat::FormatValue(double value, bool fullPrecision) const {
     int decimals = 0;
     if (!fullPrecision) GetDecimalPlaces(&decimals, nullptr);
-    if (value == 0) value = 0;  // takes the sign from a negative zero
+    if (value == 0) value = 0;  // removes the sign of a negative zero
 
     std::string text;
     if (GetNumericSubtype() == NumericSubtype::Scientific) {

@@ -14,8 +14,8 @@ class DPXLSX_API NumericVariableFormat : public INumericVariableFormat {
 
     FormatType GetType() const override;
     bool GetAuto() const override;
-    // Scientific, fixed, or with as many digits as the value needs; a new string. `fullPrecision`
-    // sets the decimal places aside.
+    // A new string: in scientific or fixed notation, or with as many digits as the value needs.
+    // With `fullPrecision` the decimal places do not count.
     IString* FormatValue(double value, bool fullPrecision) const override;
     NumericSubtype GetNumericSubtype() const override;
     void GetDecimalPlaces(int* places, int* digits) const override;

@@ -64,7 +64,7 @@ void setFormatType(xStyle& style) {
     style.formatType = EXCEL_FORMAT_NONE;
     if (parseScientficFormat(style.formatCode) || parsePercentageFormat(style.formatCode) ||
         parseCurrencyFormat(style.formatCode))
-        return;  // letters in its quoted texts are no date letters
+        return;  // letters in its quoted texts are not date letters
 
     std::string cleaned;
     EXCEL_FORMAT_TYPE type = EXCEL_FORMAT_NONE;

@@ -17,11 +17,11 @@ namespace dp {
 // True for the date, time and date-time types.
 bool isDateTimeType(EXCEL_FORMAT_TYPE type) noexcept;
 
-// Sets the type of one style: a date-time type, whose code is then replaced by its cleaned first
-// section, or EXCEL_FORMAT_NONE.
+// Classifies one style: sets a date-time type and replaces the code by its cleaned first section,
+// or sets EXCEL_FORMAT_NONE.
 void setFormatType(xStyle& style);
 
-// The codes that stand for the descriptive format names that do not imply one code.
+// The codes for those descriptive format names that do not have one fixed code.
 struct NamedFormats {
     std::string_view shortDate;
     std::string_view percent;
@@ -36,8 +36,8 @@ void replaceDescriptiveNames(std::vector<xStyle>& styles, const NamedFormats& fo
 // The parts of a default date-time code, to be combined.
 enum DateTimePart : unsigned { DATE_PART = 1, TIME_PART = 2, SECONDS_PART = 4, AMPM_PART = 8 };
 
-// Where the masks of a locale come from. Every code asks for that of the time, the others are asked
-// for only by codes that need them.
+// Supplies the masks of a locale. The time mask is requested for every code, the others only for
+// codes that need them.
 struct DateTimeMasks {
     using Source = std::function<const std::string&()>;
 
@@ -54,7 +54,7 @@ void composeDateTimeCode(std::string& code, unsigned flags, const DateTimeMasks&
 // code; types are left alone.
 void updateFormatsForLocale(std::vector<xStyle>& styles, const DateTimeMasks& masks);
 
-// True for a style whose id equals the bound text.
+// Predicate: true for a style with the given id.
 class DPXLSX_API DateTimeFormatEqualCode {
   public:
     explicit DateTimeFormatEqualCode(std::string styleId);
@@ -65,11 +65,11 @@ class DPXLSX_API DateTimeFormatEqualCode {
     std::string styleId_;
 };
 
-// A new format for the style at `styleIndex`, owned by the caller. `isDateTime` says how the reader
-// counts the style: its code then loses its backslashes in the table and shows by its ICU pattern,
-// or in ICU's medium date style without one. Other codes show as decimals, percentage or in
-// scientific notation; the automatic numeric format stands for the rest, currency codes and an
-// index outside the table included.
+// A new format for the style at `styleIndex`, owned by the caller. `isDateTime` says whether the
+// reader classified the style as date-time: then the backslashes are removed from its code in the
+// table, and the format uses the code's ICU pattern, or ICU's medium date style when the code has
+// none. Other codes give a decimal, percentage or scientific format. Everything else, including
+// currency codes and an index outside the table, gives the automatic numeric format.
 IVariableFormat* createStyleFormat(std::vector<xStyle>& styles, int styleIndex, bool isDateTime);
 
 }  // namespace dp
