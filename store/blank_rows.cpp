@@ -9,8 +9,8 @@ namespace dp {
 
 namespace {
 
-// Marks of 4096 neighbouring rows. Pages exist only where a cell does: rows of a hostile sheet may
-// lie anywhere below 2^32, and one bit for every row would be half a gigabyte.
+// One bit for each of 4096 adjacent rows. Pages are made only where there are cells: the rows of a
+// hostile sheet may lie anywhere below 2^32, and one bit for every row would take half a gigabyte.
 constexpr std::uint32_t kRowsPerPage = 4096;
 using Page = std::array<std::uint64_t, kRowsPerPage / 64>;
 

@@ -37,8 +37,8 @@ class DPXLSX_API BlankRows {
     std::vector<Run> runs_;
 };
 
-// The rows from 0 to `last` in which no column that `counts` (0-based column) holds a cell. Costs
-// time in proportion to the stored cells, however many rows there are.
+// The rows from 0 to `last` in which no column that `counts` (0-based column) holds a cell. Takes
+// time proportional to the number of stored cells, not to that of rows.
 BlankRows findBlankRows(const WorksheetCells& cells, std::uint32_t last,
                         const std::function<bool(std::uint32_t)>& counts);
 

@@ -7,8 +7,9 @@ namespace dp {
 
 namespace {
 
-// So many cells may wait out of order before they are merged without a read, lest a workbook that
-// names the same cells again and again piles them up.
+// Cells filed out of order wait for the next read, but not in any number: once there are this many,
+// and as many as the cells in order, they are merged. Otherwise a workbook that names the same
+// cells over and over would fill the memory.
 constexpr std::size_t kLateCells = 64;
 
 // Format indices from -1 up to here are packed: 28 of the 32 bits beside the kind hold them.
@@ -50,7 +51,8 @@ PackedCell packed(unsigned row, std::uint32_t type, std::int32_t formatIndex, st
 
 bool byRow(const PackedCell& left, const PackedCell& right) { return left.row < right.row; }
 
-// The first index whose row is not below `row`, which has more bits than a row.
+// The first index whose row is not below `row`. `row` has 64 bits, so that it can be the one behind
+// the last possible row.
 std::size_t lowerIndex(const CellBlocks& cells, std::uint64_t row) {
     std::size_t first = 0;
     for (std::size_t left = cells.size(); left > 0;) {
@@ -173,7 +175,7 @@ void CellColumn::release(const PackedCell& cell) const noexcept {
     if (const RareCell* rare = cell.rare()) rare_->erase(rare);
 }
 
-// The cells that wait out of order, sorted, the last one of each row only.
+// The cells filed out of order, sorted by row; of several cells of a row only the one filed last.
 std::vector<PackedCell> CellColumn::lateCells() const {
     std::vector<PackedCell> late;
     late.reserve(cells_.size() - sorted_);
@@ -191,8 +193,8 @@ std::vector<PackedCell> CellColumn::lateCells() const {
     return late;
 }
 
-// Merges from the back, so that no cell is written over before it has moved; late cells replace
-// those of the same rows, which leaves a gap that is closed at the end.
+// Merges from the back, so that no cell is overwritten before it has moved. Late cells replace
+// those of the same rows; the gap that this leaves at the front is closed at the end.
 void CellColumn::mergeLateCells() const {
     const std::vector<PackedCell> late = lateCells();
     const std::size_t end = sorted_ + late.size();

@@ -15,8 +15,8 @@
 
 namespace dp {
 
-// A cell that does not fit a PackedCell: it holds more than the value its type names, a type
-// without a name, or a format index that is out of the usual range.
+// A cell that does not fit into a PackedCell: more fields than the one its type names are set, the
+// type has no name, or the format index needs more bits.
 struct RareCell {
     ExternalCellType type;
     std::int32_t intValue;
@@ -43,8 +43,8 @@ struct PackedCell {
 };
 static_assert(sizeof(PackedCell) == 16);
 
-// Reads as the ExternalDataRecordCell that was filed, all fields bit for bit, and touches no more
-// than the field that is asked for. Valid until its column changes.
+// Read access to a stored cell. Every field is bit for bit that of the ExternalDataRecordCell that
+// was filed, and each getter reads only its own field. Valid until the column changes.
 class DPXLSX_API CellView {
   public:
     explicit CellView(const PackedCell& cell) : cell_(cell) {}
@@ -76,7 +76,7 @@ class DPXLSX_API CellBlocks {
     std::size_t size() const { return size_; }
     PackedCell& operator[](std::size_t index) const;
     PackedCell& back() const { return next_[-1]; }
-    // The end of the run of cells in memory that starts with the cell at `index`.
+    // The end of the contiguous cells in memory that start with the one at `index`.
     const PackedCell* endOfRun(std::size_t index) const;
 
     // Throws std::bad_alloc and is then unchanged.
@@ -91,7 +91,8 @@ class DPXLSX_API CellBlocks {
     static constexpr std::size_t kFirst = 4;
     static constexpr std::size_t kLargest = 256;
     static constexpr std::size_t kDoublings = std::bit_width(kLargest / kFirst) - 1;
-    static constexpr std::size_t kGrowing = 2 * kLargest - kFirst;  // cells in the unequal blocks
+    static constexpr std::size_t kGrowing =
+        2 * kLargest - kFirst;  // cells in all blocks below kLargest and the first of kLargest
 
     struct Place {
         std::size_t block;
@@ -103,15 +104,15 @@ class DPXLSX_API CellBlocks {
 
     std::vector<std::unique_ptr<PackedCell[]>> blocks_;
     std::size_t size_ = 0;
-    PackedCell* next_ = nullptr;  // behind the last cell, in its block
+    PackedCell* next_ = nullptr;  // behind the last cell, in the same block
     PackedCell* end_ = nullptr;   // the end of that block
 };
 
-// The cells of one worksheet column, an ordered map from row (0-based) to cell. Cells that come in
-// ascending order of rows are appended; others are put in their places by the next read, which may
-// then throw std::bad_alloc and leaves the column as it was. Any change invalidates iterators and
-// views. Columns that share a pool are one object to threads: none may change while another thread
-// uses any, and reads change nothing once all are settled.
+// The cells of one worksheet column, an ordered map from row (0-based) to cell. Cells filed in
+// ascending order of rows are appended; cells filed out of order are merged by the next read, which
+// may throw std::bad_alloc and then leaves the column unchanged. Any change invalidates iterators
+// and views. For thread safety, columns that share a pool count as one object: none may be changed
+// while another thread uses any of them. Once all of them are settled, reads change nothing.
 class DPXLSX_API CellColumn {
   public:
     struct Entry {
@@ -126,7 +127,8 @@ class DPXLSX_API CellColumn {
     using value_type = Entry;
     using size_type = std::size_t;
 
-    // Keeps texts in `texts`, or in a pool of its own, made with the first text, when that is null.
+    // Keeps texts in `texts`; when that is null, in a pool of its own that is made with the first
+    // text.
     explicit CellColumn(std::shared_ptr<TextPool> texts = nullptr);
     CellColumn(CellColumn&& other) noexcept;
     ~CellColumn();
@@ -153,13 +155,15 @@ class DPXLSX_API CellColumn {
     const_iterator upper_bound(unsigned row) const;
     std::size_t count(unsigned row) const;
 
-    // Puts cells that came out of order in their places, and every text in its cell.
+    // Merges the cells that were filed out of order, and completes the lookups of texts that cells
+    // still wait for.
     void settle() const;
 
   private:
     using RareCells = std::unordered_map<const RareCell*, std::unique_ptr<const RareCell>>;
 
-    // Before cells are read, move, are replaced or go: the pool may still owe them their texts.
+    // To be called before cells are read, moved, replaced or destroyed: pending lookups of the pool
+    // write their results into the cells.
     void settleTexts() const noexcept;
     PackedCell& put(const PackedCell& cell);
     void assignRare(unsigned row, const ExternalDataRecordCell& cell);
@@ -168,8 +172,9 @@ class DPXLSX_API CellColumn {
     void mergeLateCells() const;
 
     std::shared_ptr<TextPool> texts_;
+    // Mutable, because reads merge what was filed out of order.
     mutable CellBlocks cells_;
-    mutable std::size_t sorted_ = 0;  // so many cells at the front are in order, each row once
+    mutable std::size_t sorted_ = 0;  // this many cells at the front are in order, one per row
     mutable std::unique_ptr<RareCells> rare_;
 };
 

@@ -13,7 +13,7 @@
 // Columns built from stored cells, in one pass in row order.
 namespace dp {
 
-// Who a column is towards the host.
+// How a column identifies itself to the host.
 struct ColumnIdentity {
     std::string name;
     int key;
@@ -31,7 +31,8 @@ struct LoadSettings {
     std::string_view missingTextTo;
 };
 
-// Whether the rows of a gap between cells receive the host's replacement of missing numbers.
+// Whether rows without a cell, between two cells, receive the host's replacement for missing
+// numbers.
 bool replacesMissingNumbers(const ConversionSettings& settings);
 
 // A new numeric or date-time column. `requested` is the kind that a column option asks for;

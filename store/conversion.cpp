@@ -10,8 +10,8 @@ namespace dp {
 
 namespace {
 
-// The value of a number or date-time cell, missing when it is wanted as a date-time that the host
-// cannot show.
+// The value of a number or date-time cell; missing when a date-time is wanted and the host's helper
+// rejects the value.
 double checkedNumber(double value, bool asDateTime, const ConversionSettings& settings,
                      bool& converted) {
     const IDateTimeVariableFormat* helper = settings.dateTimeHelper;
@@ -163,7 +163,7 @@ void cellToText(const CellContent& cell, const ConversionSettings& settings, For
 void cutToBytes(std::string& text, std::int32_t maxLength) {
     if (maxLength < 0 || text.size() <= static_cast<std::size_t>(maxLength)) return;
     text.resize(static_cast<std::size_t>(maxLength));
-    // A column of texts cut short would keep the memory of the long ones.
+    // Otherwise a column of shortened texts would occupy the memory of the long ones.
     constexpr std::size_t kWorthReturning = 256;  // bytes
     if (text.capacity() > text.size() + kWorthReturning) text.shrink_to_fit();
 }

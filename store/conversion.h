@@ -78,7 +78,7 @@ class FormatCache {
     const IVariableFormat* recent_ = nullptr;
 };
 
-// A number that the host's range allows; else the missing value, and `converted` is set.
+// `value` if it is in the host's range; otherwise the missing value, with `converted` set.
 inline double inRange(double value, const ConversionSettings& settings, bool& converted) {
     const bool outside =
         std::isnan(value) || value < settings.minNumericValue || value > settings.maxNumericValue;
@@ -87,10 +87,11 @@ inline double inRange(double value, const ConversionSettings& settings, bool& co
     return settings.missingValue;
 }
 
-// The cell as number; the missing value when it has none that the settings allow. `converted` is
-// then set for content that is no number or out of range, also where the missing-code mapping put
-// another number in, and for an empty cell when the missing value itself lies outside the range.
-// `dateTimeFormat` is the pattern by which texts are read as date-times, null when none is known.
+// The cell as a number; the missing value when it has no number that the settings allow.
+// `converted` is set when the content is not a number or is out of range, even if the host's
+// mapping of missing values supplies another number, and for an empty cell when the missing value
+// itself is out of range. `dateTimeFormat` is the pattern by which texts are read as date-times,
+// null when none is known.
 double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
                     const ConversionSettings& settings, bool& converted);
 

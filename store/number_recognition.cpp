@@ -78,7 +78,8 @@ bool recognise(std::string& text, char decimal) {
     return accepts(state);
 }
 
-// A number beyond the range of a double: infinity, or the nearest tiny one.
+// The number of a text that is out of a double's range: infinity when it is too large, the nearest
+// subnormal number or zero when it is too small.
 double convertExtreme(const std::string& text) {
     std::istringstream stream(text);
     stream.imbue(std::locale::classic());

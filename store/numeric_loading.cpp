@@ -11,8 +11,8 @@ namespace {
 using BasicDataType = IVariable::BasicDataType;
 using FormatType = IVariableFormat::FormatType;
 
-// A preview converts the values up to this slot, 101 of them, and fills the rest with the initial
-// missing value, whatever the host has made of that setting since.
+// A preview converts the first 101 values, up to this slot, and fills the rest with the missing
+// value that is set initially, whatever missing value the host has set since.
 constexpr std::uint32_t kLastPreviewSlot = 100;
 constexpr double kPreviewFiller = 1.23456e30;
 
@@ -95,7 +95,8 @@ class NumericLoad {
         return gap.slots;
     }
 
-    // Views of cells go by value here: in memory they cost more than the rest of the loop.
+    // CellView is passed by value to stay in registers: passed by reference it costs more than the
+    // rest of the loop.
     void store(CellView cell, std::uint32_t slot) {
         const double value = valueOf(cell, slot);
         column_.values[slot] = value;
@@ -163,7 +164,7 @@ std::unique_ptr<NumericColumn> loadNumericColumn(const CellColumn& cells,
     column->dataType =
         requested == BasicDataType::DateTime ? NumericColumn::kDateTimes : NumericColumn::kNumbers;
     column->formatDirty = true;
-    // Without a name and a data cell the column ends up without rows, however many the layout has.
+    // A column with neither a name nor a data cell has no rows, whatever the layout says.
     const bool hasData = cells.lower_bound(settings.layout.firstDataRow) != cells.end();
     const std::uint32_t rowCount = hasData || !identity.name.empty() ? settings.rowCount : 0;
     column->rowCount = column->missingCount = static_cast<std::int32_t>(rowCount);

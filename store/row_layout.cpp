@@ -70,7 +70,8 @@ std::uint32_t lastRow(const WorksheetCells& cells) {
 
 std::uint32_t rowCountUpTo(const RowLayout& layout, std::uint32_t last) {
     const std::uint32_t difference = last + 1 - layout.firstDataRow;
-    // Above 2^31 - 1 the difference is a negative number to the host's 32-bit row counts.
+    // The host's row counts are signed 32-bit numbers, in which a difference above 2^31 - 1 is
+    // negative.
     const std::uint32_t available = difference > 0x7FFFFFFF ? 0 : difference;
     std::uint32_t count = std::min(available, layout.dataRowCount);
     if (layout.blankRows && available != 0) {

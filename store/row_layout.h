@@ -6,12 +6,12 @@
 #include "store/read_options.h"
 #include "store/worksheet_cells.h"
 
-// From the host's row options to concrete rows, and from rows to the value slots of a column. All
+// Derives concrete rows from the host's row options, and the value slots of a column from rows. All
 // rows are 0-based here unless said otherwise; arithmetic on rows is that of unsigned 32-bit
 // numbers.
 namespace dp {
 
-// Turns the host's 1-based rows 0-based, once.
+// Converts the host's 1-based rows to 0-based ones; does nothing when called again.
 void makeRowsZeroBased(SheetReadOptions& options);
 
 // Fills in the rows that the host did not give, for a worksheet whose setting is not VNR_INFER. A
@@ -24,7 +24,7 @@ void inferRows(SheetReadOptions& options, const WorksheetCells& cells);
 // The largest row that holds a cell; 0 for a worksheet without cells.
 std::uint32_t lastRow(const WorksheetCells& cells);
 
-// The rows that a load reads, and the rows among them that it passes over.
+// The rows that a load reads, and which of them it skips.
 struct RowLayout {
     std::uint32_t firstDataRow = kNotSet;
     std::uint32_t dataRowCount = kNotSet;  // at most so many rows
@@ -39,7 +39,7 @@ std::uint32_t unpaddedRowCount(const RowLayout& layout, const CellColumn& column
 
 // The value slots between two handled cells.
 struct Gap {
-    std::uint32_t slots = 0;      // to be passed over
+    std::uint32_t slots = 0;      // to be skipped
     std::uint32_t firstSlot = 0;  // slot of the first row of the gap
     std::uint32_t emptyRows = 0;  // rows of the gap that are not blank
 };

@@ -27,10 +27,11 @@ std::uint64_t load(const char* bytes) {
     return word;
 }
 
-// Never that of a free slot, and of other bits than those that choose the first slot.
+// Never 0, which marks a free slot, and taken from other bits than those that choose the first
+// slot.
 std::uint8_t tagOf(std::uint64_t hash) { return static_cast<std::uint8_t>(hash >> 56 | 0x80); }
 
-// Bytes that a text takes, its length included.
+// Bytes that a text occupies, its length byte and padding included.
 constexpr std::size_t sizeOf(std::size_t length, std::size_t unit) {
     return (1 + length + unit - 1) / unit * unit;
 }
@@ -122,7 +123,7 @@ void ShortTexts::settle() noexcept {
     waitingCount_ = 0;
 }
 
-// Asks for the first text that may be the wanted one, and notes where the search goes on.
+// Prefetches the first text that may be the wanted one, and records where the lookup continues.
 void ShortTexts::fetchCandidate(Waiting& waiting) const {
     waiting.slot = table_.candidate(waiting.hash & table_.mask(), tagOf(waiting.hash));
     if (table_.tags[waiting.slot] == 0) return;
@@ -130,12 +131,12 @@ void ShortTexts::fetchCandidate(Waiting& waiting) const {
     const Page& page = pages_[id >> kUnitBits];
     const std::size_t begin = (id & ((Id{1} << kUnitBits) - 1)) * kUnit;
     __builtin_prefetch(&page.bytes[begin]);
-    // A text may reach into another line.
+    // A text may extend into the next cache line.
     __builtin_prefetch(&page.bytes[std::min(begin + waiting.length, page.used - 1)]);
 }
 
-// The stored text that equals the one at `text`, which is behind the used bytes; when it is new it
-// moves up to them.
+// The kept text that equals the waiting one at `text`. Waiting texts lie behind the used bytes of
+// the last page; a new one is moved to the end of the used bytes and kept.
 const char* ShortTexts::settleOne(const Waiting& waiting, const char* text) {
     const std::size_t slot = find(textAt(text), waiting.hash, waiting.slot);
     if (table_.tags[slot] != 0) return at(table_.ids[slot]);
@@ -167,7 +168,7 @@ std::size_t ShortTexts::find(std::string_view text, std::uint64_t hash, std::siz
     }
 }
 
-// Room for `size` bytes behind the texts that wait. False when all pages are full.
+// Makes room for `size` bytes behind the waiting texts. False when all pages are full.
 bool ShortTexts::makeRoom(std::size_t size) {
     const auto fits = [&] {
         return !pages_.empty() && pages_.back().used + waitingSize_ + size <= pageSize_;
@@ -182,20 +183,21 @@ bool ShortTexts::makeRoom(std::size_t size) {
     return true;
 }
 
-// Keeps a quarter of the slots free, the texts that wait included.
+// Grows the table before the texts, waiting ones included, fill more than three quarters of it.
 void ShortTexts::growTable() {
     const std::size_t count = table_.tags.size();
     const std::size_t most = count / 4 * 3;
     if (size_ + waitingCount_ < most) return;
     settle();
-    // Not many texts at a time would wait just below the limit.
+    // Without this margin, batches would be cut to a few lookups just below the limit.
     if (size_ + kMostWaiting < most) return;
     Table larger(std::max(kFirstSlots, count * 2));
     rehash(larger);
     table_ = std::move(larger);
 }
 
-// In the order of the texts in memory, which comes in faster than that of the slots.
+// In the order of the texts in memory: reading them in sequence is faster than in the order of the
+// slots.
 void ShortTexts::rehash(Table& table) const {
     for (std::size_t number = 0; number < pages_.size(); ++number) {
         const Page& page = pages_[number];

@@ -9,8 +9,8 @@
 
 namespace dp {
 
-// A hash of texts that differs from table to table, so that whoever writes a workbook cannot choose
-// texts that fall together.
+// A hash of texts that differs from table to table, so that nobody can write a workbook whose texts
+// all collide.
 class TextHash {
   public:
     TextHash();
@@ -21,8 +21,9 @@ class TextHash {
     std::array<std::uint64_t, 3> secret_;
 };
 
-// Keeps every distinct text of up to kLongest bytes once, until it goes itself. Searches wait for
-// each other: memory is slow to answer, and many questions at a time take little longer than one.
+// A set of texts of up to kLongest bytes, which keeps every distinct text once, until the set is
+// destroyed. Lookups are batched to hide cache misses: begin() only prefetches what a lookup will
+// read, and a whole batch is completed later, when the data has arrived.
 class ShortTexts {
   public:
     static constexpr std::size_t kLongest = 254;  // bytes
@@ -31,34 +32,38 @@ class ShortTexts {
     ShortTexts(const ShortTexts&) = delete;
     ShortTexts& operator=(const ShortTexts&) = delete;
 
-    // Begins to look for `text`, which has 1 to kLongest bytes; it is copied. False when there is
-    // no room for one more text. Throws std::bad_alloc. In both cases nothing has begun.
+    // Begins the lookup of `text`, which has 1 to kLongest bytes and is copied. Returns false when
+    // there is no room for another text, throws std::bad_alloc; either way no lookup has begun.
     bool begin(std::string_view text);
-    // Where the address of the text that was begun last is written: with any call from this one on,
-    // at the latest with settle. The place must stay until then.
+    // Writes the address of the text that was begun last to `place`: at once or in a later call, in
+    // settle at the latest. `place` must stay valid until then.
     void deliverTo(std::uint64_t& place) noexcept;
-    // The text that equals `text`, null if there is none; settles all that wait.
+    // The kept text that equals `text`, null if there is none. Completes all waiting lookups.
     const char* find(std::string_view text) noexcept;
-    // Finds or adds all texts that wait. The last one that was found stays known as recent().
+    // Completes all waiting lookups: finds their texts or adds them. recent() is then the last of
+    // them.
     void settle() noexcept;
     bool isWaiting() const { return waitingCount_ != 0; }
 
-    // The text that was settled last, as its length in one byte and then the text; null if none.
+    // The text whose lookup was completed last: its length in one byte, then its bytes. Null if
+    // none.
     const char* recent() const { return recent_; }
-    // Number of distinct texts that are settled.
+    // Number of distinct texts, without those whose lookups wait.
     std::size_t size() const { return size_; }
 
   private:
-    // A text's place: units of kUnit bytes in pages of kPage bytes, in 32 bits.
+    // A text's address in 32 bits: the number of its page, of kPage bytes, and its offset there in
+    // units of kUnit bytes.
     using Id = std::uint32_t;
     static constexpr std::size_t kUnit = 4;
     static constexpr std::size_t kPage = std::size_t{1} << 20;
     static constexpr unsigned kUnitBits = 18;
     static_assert(kUnit << kUnitBits == kPage);
     static constexpr std::size_t kMostPages = std::size_t{1} << (32 - kUnitBits);
-    // More than a processor can fetch at a time.
+    // Lookups in a batch: more than a processor can have cache misses in flight.
     static constexpr std::size_t kMostWaiting = 32;
-    // So many texts later, the slots that a text begins with have come in.
+    // After this many further lookups have begun, the first slots of a lookup have arrived in the
+    // cache.
     static constexpr std::size_t kFetched = 8;
 
     struct Page {
@@ -69,10 +74,10 @@ class ShortTexts {
         std::uint64_t hash;
         std::uint64_t* place;
         std::size_t length;
-        std::size_t slot;  // the first that can be the text's, as known when it was fetched
+        std::size_t slot;  // the first that may hold the text, as of the prefetch
     };
-    // A hash table with open addressing. The tags are few enough for the processor's caches, and
-    // they alone tell that a text is new.
+    // A hash table with open addressing. The tags, one byte a slot, are small enough for the
+    // processor's caches, and for most new texts they suffice to tell that the text is new.
     struct Table {
         explicit Table(std::size_t count = 0) : tags(count), ids(count) {}
 
@@ -82,7 +87,7 @@ class ShortTexts {
         void set(std::size_t slot, std::uint64_t hash, Id id);
 
         std::vector<std::uint8_t> tags;  // 0 for a free slot, else bits of the hash
-        std::vector<Id> ids;             // as many, none or a power of two
+        std::vector<Id> ids;             // as many as tags: 0 or a power of two
     };
 
     const char* at(Id id) const {
@@ -98,9 +103,9 @@ class ShortTexts {
     TextHash hash_;
     Table table_;
     std::size_t size_ = 0;
-    std::vector<Page> pages_;      // texts stand one behind the other in each
+    std::vector<Page> pages_;      // texts lie back to back in each
     std::size_t pageSize_ = 0;     // bytes of the last page
-    std::size_t waitingSize_ = 0;  // bytes behind the used ones of the last page
+    std::size_t waitingSize_ = 0;  // bytes of waiting texts, behind the used bytes of the last page
     std::size_t waitingCount_ = 0;
     std::array<Waiting, kMostWaiting> waiting_{};
     const char* recent_ = nullptr;

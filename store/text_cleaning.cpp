@@ -28,7 +28,7 @@ struct CloseText {
     void operator()(UText* text) const { utext_close(text); }
 };
 
-// One iterator serves all calls: making one costs far more than walking a name.
+// One iterator serves all calls, because creating one takes far longer than walking a name.
 const std::shared_ptr<icu::BreakIterator>& breakIterator() {
     static UErrorCode status = U_ZERO_ERROR;
     static const std::shared_ptr<icu::BreakIterator> iterator(

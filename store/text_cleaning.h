@@ -13,8 +13,8 @@ namespace dp {
 DPXLSX_API void trim(std::string& text);
 DPXLSX_API void ltrim(std::string& text);
 
-// Trims, removes control characters and makes every run of spaces one space. A space that a removed
-// control character uncovers at the end stays.
+// Trims, removes control characters and makes every run of spaces one space. A space that comes to
+// the end only because control characters are removed stays.
 DPXLSX_API void CleanText(std::string& text);
 
 // Replaces the characters that worksheet names may not have by "_", then trims.

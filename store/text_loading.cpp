@@ -8,7 +8,7 @@ namespace dp {
 
 namespace {
 
-// A preview renders the texts up to this slot, 101 of them.
+// A preview renders the first 101 texts, up to this slot.
 constexpr std::uint32_t kLastPreviewSlot = 100;
 
 class TextLoad {
@@ -76,7 +76,7 @@ std::unique_ptr<TextColumn> loadTextColumn(const CellColumn& cells, const Column
     column->formatDirty = true;
     auto format = std::make_unique<TextVariableFormat>();
     format->characterCount = 1;
-    // Without a data cell the column ends up without rows, however many the layout has.
+    // A column without a data cell has no rows, whatever the layout says.
     const bool hasData = cells.lower_bound(settings.layout.firstDataRow) != cells.end();
     const std::uint32_t rowCount = hasData ? settings.rowCount : 0;
     column->rowCount = column->missingCount = static_cast<std::int32_t>(rowCount);

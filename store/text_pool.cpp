@@ -24,7 +24,7 @@ void TextPool::settle() noexcept {
     if (short_.isWaiting()) short_.settle();
 }
 
-// A text that often repeats the one before need not be searched for.
+// Texts often repeat the one before, which is recognised without a lookup.
 void TextPool::begin(std::string_view text) {
     if (!isRecent_ && !short_.isWaiting()) recent_ = PooledText(short_.recent());
     isRecent_ = true;
@@ -36,7 +36,8 @@ void TextPool::begin(std::string_view text) {
     const bool isShort = text.size() <= ShortTexts::kLongest;
     isRecent_ = !isShort || !short_.begin(text);
     if (!isRecent_) return;
-    // Short texts join the long ones behind 16 GB of others, those that are not among these.
+    // When the 16 GB that short_ can address are full, further short texts are kept with the long
+    // ones; those that short_ already has are still found there.
     const char* kept = isShort ? short_.find(text) : nullptr;
     recent_ = kept ? PooledText(kept) : internLong(text);
 }

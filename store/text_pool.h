@@ -29,7 +29,7 @@ class DPXLSX_API PooledText {
   private:
     friend class TextPool;
 
-    // Stands for the length of a text that follows in full behind this byte.
+    // In place of the one-byte length of a short text: the length follows as a std::size_t.
     static constexpr unsigned char kLong = ShortTexts::kLongest + 1;
 
     explicit PooledText(const char* stored) : stored_(stored) {}
@@ -39,24 +39,25 @@ class DPXLSX_API PooledText {
     const char* stored_ = nullptr;
 };
 
-// Keeps every distinct text once, until it goes itself. Not to be used by two threads at a time.
+// Keeps every distinct text once, until the pool is destroyed. Not thread-safe.
 class TextPool {
   public:
     TextPool() = default;
     TextPool(const TextPool&) = delete;
     TextPool& operator=(const TextPool&) = delete;
 
-    // The pool's copy of `text`, made when it is new. Throws std::bad_alloc and keeps no text then.
-    // Costs one pass over `text`, also when it is known: who files one long text many times keeps
-    // the handle.
+    // The handle of the pool's copy of `text`, which is added when it is new. Throws
+    // std::bad_alloc, which leaves the pool unchanged. Reads all of `text` even when it is known:
+    // keep the handle to file one long text many times.
     PooledText intern(std::string_view text);
 
-    // The same in two steps that many texts can be in at a time: after begin, which throws as
-    // intern does, deliverTo names where the bits of the handle go. They are written with any call
-    // from this one on, at the latest with settle: until then the place must stay.
+    // The same in two steps, so that the lookups of many texts can overlap: begin, which throws as
+    // intern does, and deliverTo, which names where the bits of the handle are written. That
+    // happens at once or in a later call, in settle at the latest; `bits` must stay valid until
+    // then.
     void begin(std::string_view text);
     void deliverTo(std::uint64_t& bits) noexcept;
-    // Delivers what is still to be delivered.
+    // Writes all handles that have not been written yet.
     void settle() noexcept;
 
     // Number of distinct texts, the empty one not counted.
@@ -66,10 +67,10 @@ class TextPool {
     PooledText internLong(std::string_view text);
 
     ShortTexts short_;
-    // The long ones, and those for which the other table has no room.
+    // Long texts, and short ones that short_ has no room for.
     std::unordered_map<std::string_view, std::unique_ptr<char[]>, TextHash> long_;
-    PooledText recent_;     // the last text that was known when the next one was begun
-    bool isRecent_ = true;  // it is the one to deliver; else the short texts know it
+    PooledText recent_;     // a recent text, against which the next one is compared
+    bool isRecent_ = true;  // recent_ is the text begun last; otherwise short_ looks it up
 };
 
 }  // namespace dp

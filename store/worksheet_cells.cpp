@@ -72,7 +72,8 @@ CellColumn* WorksheetCells::known(unsigned column) {
     return &recent_->second;
 }
 
-// A column comes in with its first cell, so that a failure leaves no empty one behind.
+// A new column is inserted together with its first cell, so that a failure leaves no empty column
+// behind.
 template <typename File>
 void WorksheetCells::file(unsigned column, const File& fileIn) {
     if (CellColumn* cells = known(column)) return fileIn(*cells);

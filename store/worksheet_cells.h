@@ -14,9 +14,9 @@
 
 namespace dp {
 
-// The cells of one worksheet, an ordered map from column (0-based) to CellColumn. Not to be
-// changed while another thread uses it; worksheets that share a pool are one object to threads, and
-// after settle() of all of them reads change nothing.
+// The cells of one worksheet, an ordered map from column (0-based) to CellColumn. Not thread-safe;
+// worksheets that share a pool count as one object. After settle() of all of them, reads change
+// nothing.
 class DPXLSX_API WorksheetCells {
     using Columns = std::map<unsigned, CellColumn>;
 
@@ -25,15 +25,15 @@ class DPXLSX_API WorksheetCells {
     using const_iterator = Columns::const_iterator;
     using const_reverse_iterator = Columns::const_reverse_iterator;
 
-    // All columns keep their texts in `texts`, or in one pool made for them when that is null.
+    // All columns keep their texts in `texts`; when that is null, in one pool made for them.
     explicit WorksheetCells(std::shared_ptr<TextPool> texts = nullptr);
     WorksheetCells(WorksheetCells&& other) noexcept;
     WorksheetCells& operator=(WorksheetCells&& other) noexcept;
     ~WorksheetCells();
 
     // Files one cell at its row and column, replacing the one that is there. Throws std::bad_alloc
-    // and the cells are then as before. Consecutive calls for a column, the next one to the right
-    // or the leftmost one need no search.
+    // and the cells are then as before. Calls for the same column as the call before, the next one
+    // to its right or the leftmost one need no search.
     void add(const ExternalDataRecord& record);
     // The cells of `column`, an empty CellColumn if there were none.
     CellColumn& operator[](unsigned column);
@@ -58,11 +58,13 @@ class DPXLSX_API WorksheetCells {
     const value_type& nth(std::size_t position) const;
     // The largest row of all columns plus one, 0 without cells.
     std::uint64_t rowCount() const;
-    // Puts cells that came out of order in their places.
+    // Settles all columns.
     void settle() const;
 
-    // Columns of all worksheets before this one: a note of whoever numbers columns over several
-    // worksheets. It is about the place, so it does not move along with the cells.
+    // The number of columns in all worksheets before this one, cached by the code that numbers
+    // columns across worksheets. Mutable, because queries that are const fill the cache. It belongs
+    // to this worksheet's position in the workbook, not to its cells, so a move of the cells leaves
+    // it behind.
     mutable std::optional<std::size_t> columnsBefore;
 
   private:
@@ -73,8 +75,9 @@ class DPXLSX_API WorksheetCells {
 
     std::shared_ptr<TextPool> texts_;
     Columns columns_;
-    Columns::iterator recent_;                        // the last column filed in, if any
-    mutable std::vector<const value_type*> inOrder_;  // outdated while of another size
+    Columns::iterator recent_;  // the column of the last cell filed, if any
+    mutable std::vector<const value_type*>
+        inOrder_;  // outdated while its size is not that of columns_
 };
 
 }  // namespace dp
