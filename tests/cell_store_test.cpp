@@ -1,5 +1,3 @@
-#include <malloc.h>
-
 #include <algorithm>
 #include <bit>
 #include <cstdint>
@@ -19,6 +17,7 @@
 #include "store/blank_rows.h"
 #include "store/row_layout.h"
 #include "store/worksheet_cells.h"
+#include "tests/allocated_bytes.h"
 
 namespace dp {
 namespace {
@@ -215,11 +214,6 @@ TEST(CellStore, DeliversTextsBeforeTheirCellsGo) {
         column.assign(0, textCell(text));
         column.clear();
     }
-}
-
-std::size_t allocatedBytes() {
-    const auto info = mallinfo2();
-    return info.uordblks + info.hblkhd;
 }
 
 TEST(CellStore, CellsThatAreFiledAgainTakeNoMemory) {

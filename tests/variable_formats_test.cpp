@@ -11,6 +11,8 @@
 #include <vector>
 
 #include <gtest/gtest.h>
+#include <unicode/locid.h>
+#include <unicode/timezone.h>
 
 #include "formats/date_time_variable_format.h"
 #include "formats/fraction_variable_format.h"
@@ -19,6 +21,7 @@
 #include "formats/percentage_variable_format.h"
 #include "formats/text_variable_format.h"
 #include "provider/excel_data_provider_base.h"
+#include "tests/allocated_bytes.h"
 
 namespace dp {
 namespace {
@@ -40,15 +43,26 @@ struct GroupingPunctuation : std::numpunct<char> {
     std::string do_grouping() const override { return "\3"; }
 };
 
-// Renders under a global locale with grouping and puts back what the tests change in the process.
+// Renders under a global locale with grouping, in another language and time zone, and puts back what
+// the tests change in the process.
 class VariableFormats : public ::testing::Test {
   protected:
+    VariableFormats() {
+        UErrorCode status = U_ZERO_ERROR;
+        icu::Locale::setDefault(icu::Locale::getGermany(), status);
+        icu::TimeZone::adoptDefault(icu::TimeZone::createTimeZone("Asia/Tokyo"));
+    }
     ~VariableFormats() override {
+        UErrorCode status = U_ZERO_ERROR;
+        icu::Locale::setDefault(language_, status);
+        icu::TimeZone::adoptDefault(zone_.release());
         std::locale::global(previous_);
         ExcelDataProviderBase::_inputDecimal = '.';
     }
 
   private:
+    icu::Locale language_ = icu::Locale::getDefault();
+    std::unique_ptr<icu::TimeZone> zone_{icu::TimeZone::createDefault()};
     std::locale previous_ = std::locale::global({std::locale(), new GroupingPunctuation});
 };
 
@@ -244,6 +258,7 @@ TEST_F(VariableFormats, DateTimes) {
     } cases[] = {{"day", "M/d/yyyy", 40179, "1/1/2010"},
                  {"day and time", "M/d/yy H:mm", 40179.75, "1/1/10 18:00"},
                  {"no pattern", "", 40179, "Jan 1, 2010"},
+                 {"language", "EEEE d MMMM", 40179, "Friday 1 January"},
                  {"epoch", "yyyy-MM-dd HH:mm:ss.SSS z", 25569, "1970-01-01 00:00:00.000 GMT"},
                  {"last day before the gap", "M/d/yyyy", 59, "2/28/1900"},
                  {"late on the day that never was", "M/d/yyyy H", 60.999, "3/1/1900 23"},
@@ -264,10 +279,22 @@ TEST_F(VariableFormats, DateTimes) {
             rendered(DateTimeVariableFormat(pattern), value);
 }
 
+TEST_F(VariableFormats, OneFormatterServesAFormatAndGoesWithIt) {
+    const DateTimeVariableFormat kept("M/d/yyyy");
+    std::size_t before = 0;
+    for (int i = 0; i < 300; ++i) {
+        if (i == 100) before = allocatedBytes();
+        rendered(kept, i);
+        rendered(DateTimeVariableFormat("M/d/yy"), i);
+    }
+    EXPECT_LT(allocatedBytes() - before, 100000U);
+}
+
 TEST_F(VariableFormats, DateTimeParameters) {
     DateTimeVariableFormat source, target;
     for (unsigned i = 0; i < 4; ++i) source.dateTimeParameters[i] = i + 1;
     target.SetDateTimeParameters(&source);
+    target.SetDateTimeParameters(nullptr);
     unsigned p1 = 0, p2 = 0, p4 = 0;
     target.GetDateTimeParameters(&p1, &p2, nullptr, &p4);
     EXPECT_EQ(p1 * 100 + p2 * 10 + p4, 124u);
