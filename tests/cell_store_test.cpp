@@ -262,6 +262,8 @@ TEST(RowLayout, DecidesAtItsLimits) {
     EXPECT_EQ(rowCountUpTo({0, kNotSet}, 0x7FFFFFFF), 0U) << "more than a host can count";
     WorksheetCells cells;
     cells.add(recordOf(0, 0, textCell("name")));
+    cells.add(recordOf(10, 1, textCell("below the limit")));
+    EXPECT_EQ(unpaddedRowCount({1, 5}, cells.find(1)->second), 0U);
     SheetReadOptions options{VNR_INFER, 5};
     inferRows(options, cells);
     EXPECT_EQ(options.variableNameRow, 0U) << "whatever it was";

@@ -59,6 +59,7 @@ TEST(NumberRecognition, DecidesTheOddTexts) {
                                   "( 1)",
                                   "()",
                                   "(",
+                                  "(12",
                                   "1e999",
                                   "-1e999",
                                   "+,5",
