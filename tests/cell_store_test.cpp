@@ -174,7 +174,7 @@ TEST(CellStore, MovesKeepCellsAndClearForgetsThem) {
     EXPECT_EQ(cells[2].size(), 9U);
     EXPECT_EQ(&cells.nth(0), &*cells.begin());
     cells.clear();
-    for (unsigned i = 0; i < 3; ++i) cells.add(recordOf(i, i + 5, textCell("t")));
+    for (unsigned i = 0; i < 3; ++i) cells.add(recordOf(i, 7 - i, textCell("t")));
     EXPECT_EQ(cells.nth(0).first, 5U);
     column.clear();
     EXPECT_EQ(column.begin(), column.end());
