@@ -33,10 +33,10 @@ const char* Attributes::find(const char* name, const char* prefix) & {
 const char* Attributes::valueOf(const xmlAttr* attribute) & {
     const xmlNode* value = attribute->children;
     if (!value) return "";
-    // Without memory libxml2 leaves texts without content.
+    // When memory runs out, libxml2 leaves a text node without content.
     if (value->type == XML_TEXT_NODE && !value->next)
         return value->content ? reinterpret_cast<const char*>(value->content) : "";
-    // The value holds references.
+    // Values with character or entity references may have several nodes.
     xmlChar* text = xmlNodeListGetString(attribute->doc, value, 1);
     expanded_ = text ? reinterpret_cast<const char*>(text) : "";
     xmlFree(text);

@@ -8,9 +8,9 @@ class XmlReader;
 
 namespace dp {
 
-// The attributes of the element on which a reader stands, found by walking its list once each: a
-// look-up through the text reader takes the name apart every time. The cursor does not move; none
-// are found while it stands on an attribute.
+// The attributes of the reader's current element. Each is found by walking libxml2's own list,
+// because a lookup through the text reader splits the name into prefix and local name every time.
+// The cursor does not move; while it is on an attribute, none are found.
 class Attributes {
   public:
     explicit Attributes(XmlReader& reader);

@@ -19,7 +19,7 @@ void mDetermineCol(std::string_view reference, int& column) {
     long value = 0;
     for (auto letter = reference.begin(); letter != digit; ++letter) {
         value = value * 26 + (static_cast<unsigned char>(*letter) - 64);
-        // From here no further letter leads back to a column.
+        // From here on no further letter can make it a valid column again.
         if (value > kWorksheetColumns * 26L || value < -kWorksheetColumns)
             throw CmXmlException(kXmlError);
     }

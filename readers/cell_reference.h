@@ -4,8 +4,8 @@
 
 namespace dp {
 
-// The size of a worksheet. Cells beyond it exist in no workbook, and would make the work on rows
-// and columns as large as their numbers: readers take them for an error.
+// The size of a worksheet. Readers treat cells beyond it as an error: no program writes them, and
+// work that is proportional to row and column numbers would be unbounded.
 inline constexpr int kWorksheetRows = 1'048'576;
 inline constexpr int kWorksheetColumns = 16'384;
 
@@ -14,8 +14,8 @@ inline constexpr int kWorksheetColumns = 16'384;
 // first character, and a column beyond the last one of a worksheet.
 void mDetermineCol(std::string_view reference, int& column);
 
-// Where the next row or cell of a worksheet goes (0-based): to the place that it names, or right
-// behind the one before it.
+// The position (0-based) of the next row or cell of a worksheet: the one that it names, or else the
+// one after the previous row or cell.
 class CellPlace {
   public:
     // `number` is the 1-based row that the element names, null when it names none.

@@ -16,8 +16,8 @@ namespace {
 
 bool isDigit(char c) { return c >= '0' && c <= '9'; }
 
-// Numbers of few digits, which nearly all are: a whole number below 2^53 divided by a power of ten
-// up to 10^22 is rounded once, to the double that any other way of conversion finds.
+// Numbers of few digits, as nearly all are. An integer below 2^53 divided by a power of ten up to
+// 10^22 is rounded only once, so the result is the same double that a full conversion gives.
 bool castShortDecimal(double& value, const char* text) {
     constexpr std::size_t kDigits = 15;  // always below 2^53
     constexpr double kPowers[kDigits + 1] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
@@ -43,8 +43,8 @@ bool castShortDecimal(double& value, const char* text) {
     return true;
 }
 
-// Other plain decimal numbers. The rest (white space, a plus, hexadecimal digits, text behind the
-// number, values out of range) has its own rules in atof.
+// Other plain decimal numbers. The rest (white space, a plus, hexadecimal digits, text after the
+// number, values out of range) is left to atof, whose rules for it differ.
 bool castPlainDecimal(double& value, const char* text) {
     const char first = *text == '-' ? text[1] : *text;
     if (!isDigit(first) && first != '.') return false;
@@ -53,8 +53,9 @@ bool castPlainDecimal(double& value, const char* text) {
     return result.ec == std::errc() && result.ptr == end;
 }
 
-// atof reads numbers as the process's locale writes them. Only the last point is its decimal
-// separator: "1.234.5" under a decimal comma is 1. In some locales that is more than one byte.
+// atof expects the decimal separator of the process's locale, which may have several bytes; the
+// last point is replaced by it. Earlier points end the number: "1.234.5" under a decimal comma is
+// 1.
 double castByLocale(const char* text) {
     const std::string_view point = std::localeconv()->decimal_point;
     if (point == ".") return std::atof(text);

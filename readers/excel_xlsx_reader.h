@@ -11,7 +11,7 @@
 
 namespace dp {
 
-// What a number cell is by its style.
+// The kind of a number cell according to its style.
 struct NumberKind {
     ExternalCellType type = CELL_NUMBER;
     int formatIndex = -1;
@@ -57,7 +57,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     std::string xlDir;
     std::vector<std::string> relationshipIds;
     std::vector<std::string> relationshipTargets;
-    SharedStringTable sharedStrings;  // decoded; empty for blank ones, which no cell delivers
+    SharedStringTable sharedStrings;  // decoded; blank texts, which cells do not deliver, are empty
     std::vector<std::string> cellXfNumFmtIds;
 
     std::string packageDir;

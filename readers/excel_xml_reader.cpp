@@ -129,8 +129,8 @@ double ExcelXmlReader::mFormatExcelDateTime(const std::string& text) {
     const int minute = dateField(text, 14, 2);
     const int second = dateField(text, 17, 2);
     const int millisecond = dateField(text, 20, 3);
-    // A time without a date is written on 1899-12-31; the day handed on is the one from which the
-    // host counts serial days.
+    // Times without a date are written with the date 1899-12-31. The helper gets 1899-12-30
+    // instead, the day from which it counts serial days.
     if (year == 1899 && month == 12 && day == 31) day = 30;
     if (!dateTimeHelper) return missingValue;
     return dateTimeHelper->GenerateTime(year, month, day, hour, minute, second, millisecond);

@@ -30,8 +30,8 @@ class DPXLSX_API ExcelXmlReader {
     ExcelXmlReader& operator=(const ExcelXmlReader&) = delete;
     virtual ~ExcelXmlReader();
 
-    // The first worksheet gets this index (0-based, 0 by default) instead: the provider has so many
-    // worksheets of another workbook already. To be called before reading.
+    // Sets the index (0-based, 0 by default) of the first worksheet: the number of worksheets of
+    // other workbooks that the provider already has. To be called before reading.
     void startAtWorksheet(int index) { worksheetIndex = index; }
 
     // Delivers every worksheet with its cells; to be called once. A cell in a row or column that no
@@ -82,14 +82,14 @@ class DPXLSX_API ExcelXmlReader {
     void mReadExcelWorksheetDataHeader();
     // Delivers the cells of at most `rowCount` rows and `columnCount` columns.
     void mReadExcelWorksheetData(unsigned columnCount, unsigned rowCount);
-    // Delivers the next value of the row, if there is one, moving `column` on; true when it met the
-    // options behind the table.
+    // Delivers the next value of the row, if there is one, and advances `column`; true when it
+    // reached the options that follow the table.
     bool mReadExcelWorksheetCell(unsigned& column, unsigned row, unsigned columnCount);
     // Delivers the value of the current data element as a cell at `column` and `row` (0-based),
     // unless it has none.
     void mReadExcelWorksheetCellData(unsigned column, unsigned row);
-    // Delivers a cell; with `lookUpFormat` it gets the style of its place first, and a number under
-    // a date or date-time format becomes a date-time.
+    // Delivers a cell. With `lookUpFormat` the cell first gets the style of its position, and a
+    // number with a date or date-time format becomes a date-time.
     void mAddExternalDataRecord(ExternalDataRecord& record, bool lookUpFormat);
     // True for the empty text and for one of spaces only.
     static bool IsStringAllBlank(const std::string& text);
@@ -111,7 +111,7 @@ class DPXLSX_API ExcelXmlReader {
     void readStringData(std::string& text);
     // Announces a worksheet to the provider and makes it the current one.
     void beginWorksheet(const std::string& name);
-    // Takes the worksheets that delivered nothing away again and selects the first one.
+    // Removes the worksheets that delivered nothing and selects the first one.
     void removeEmptyWorksheets(const std::vector<unsigned>& emptySheets);
 
     XmlReader xmlReader;

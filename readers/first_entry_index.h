@@ -7,7 +7,8 @@
 namespace dp {
 
 // Finds the first entry of a growing list by one of its members, without walking the list for every
-// search. Entries may be added at any time; any other change needs forget() before the next search.
+// lookup. Entries may be added at any time; after any other change call forget() before the next
+// lookup.
 template <class Entry, class Key>
 class FirstEntryIndex {
   public:
@@ -21,7 +22,7 @@ class FirstEntryIndex {
         return found == first_.end() ? -1 : static_cast<std::ptrdiff_t>(found->second);
     }
 
-    // Begins anew with the next search.
+    // Makes the next lookup index all entries again.
     void forget() {
         first_.clear();
         known_ = 0;

@@ -16,13 +16,13 @@ void MarkupMarks::take(char c) {
     ++length_;
     isAscii_ = isAscii_ && c != '\0';
     if (enclosed_) {
-        // The opening's bytes are none of the closing's.
+        // The opening and the closing share no bytes: "<!-->" does not end a comment.
         const bool isLongEnough = length_ >= enclosed_->opening.size() + enclosed_->closing.size();
         if (isLongEnough && endsWith(enclosed_->closing)) enclosed_ = nullptr;
     } else if (quote_ != '\0') {
         if (c == quote_) quote_ = '\0';
     } else if (c == '<') {
-        // Also in a tag: a document type holds declarations and comments.
+        // Possible within a tag too: a document type contains declarations and comments.
         inTag_ = true;
         length_ = 0;
     } else if (inTag_) {

@@ -10,16 +10,16 @@ namespace dp {
 // each error in it.
 constexpr bool isMarkupMark(char c) { return c == '=' || c == '-'; }
 
-// Counts them in a document that it is shown from its first byte on, except those in CDATA
-// sections, which are text. Follows the markup as far as it is well-formed; a parser goes no
-// further. Only for encodings in which the bytes of ASCII stand for nothing else.
+// Counts them in a document that is passed to it from the first byte on, except those in CDATA
+// sections, which are text. Follows the markup as long as it is well-formed; a parser gets no
+// further. Only for encodings in which ASCII bytes have no other meaning.
 class MarkupMarks {
   public:
-    // Of the document's next bytes.
+    // Counts in the document's next bytes.
     std::size_t countIn(std::string_view bytes);
 
   private:
-    // What begins and ends with certain bytes, whatever is in between.
+    // Markup that ends at its closing, whatever is in between.
     struct Enclosed {
         std::string_view opening;  // behind the "<"
         std::string_view closing;
@@ -32,12 +32,12 @@ class MarkupMarks {
     void takeInTag(char c);
     bool endsWith(std::string_view text) const;
 
-    const Enclosed* enclosed_ = nullptr;  // that the last byte is in
+    const Enclosed* enclosed_ = nullptr;  // that contains the last byte, if any
     bool inTag_ = false;                  // also in a declaration
     char quote_ = '\0';                   // of the attribute's value, in a tag
-    bool isAscii_ = true;                 // a zero byte is one of a wider encoding
+    bool isAscii_ = true;                 // a zero byte tells of a wider encoding
     std::uint64_t last_ = 0;              // the last 8 bytes
-    std::size_t length_ = 0;              // of what begins with the last "<", without that
+    std::size_t length_ = 0;              // bytes since the last "<"
 };
 
 }  // namespace dp

@@ -23,9 +23,9 @@ namespace dp {
 
 namespace {
 
-// Whether the bytes of ASCII stand for nothing else in the document's encoding, as in UTF-8, which
-// need not be declared, and in the usual ones of a byte a character. UTF-16 need not be declared
-// either, but has zero bytes.
+// Whether ASCII bytes have no other meaning in the document's encoding, as in UTF-8, which need not
+// be declared, and in the usual single-byte encodings. UTF-16 need not be declared either, but has
+// zero bytes.
 bool keepsAscii(xmlTextReaderPtr reader) {
     const xmlNode* node = reader ? xmlTextReaderCurrentNode(reader) : nullptr;
     if (!node || !node->doc) return false;
@@ -52,7 +52,7 @@ class PartInput {
     bool isOpen() const { return descriptor_ >= 0; }
     void watch(xmlTextReaderPtr reader) { reader_ = reader; }
 
-    // Up to `size` bytes; 0 at the end, -1 on an error and for what is beyond the limits.
+    // Reads up to `size` bytes; 0 at the end, -1 on an error and beyond the limits.
     int read(char* bytes, int size) {
         const std::size_t waiting = bytesWaiting();
         if (waiting > kMarkupSize || runSize() > kRunSize) return -1;
@@ -66,7 +66,8 @@ class PartInput {
     }
 
   private:
-    // libxml2 asks for few bytes at a time. False on an error, and no bytes at the end.
+    // Buffers the file, because libxml2 asks for few bytes at a time. False on an error; at the end
+    // the buffer is empty.
     bool fill() {
         ssize_t count = -1;
         do count = ::read(descriptor_, buffer_.data(), buffer_.size());
@@ -76,13 +77,14 @@ class PartInput {
         return count >= 0;
     }
 
-    // What libxml2 has got and not used. It uses text as it comes, but keeps markup until that is
-    // complete.
+    // Bytes that libxml2 has received but not consumed. It consumes text as it arrives, but markup
+    // only when complete.
     std::size_t bytesWaiting() const {
         const long used = reader_ ? xmlTextReaderByteConsumed(reader_) : supplied_;
         return used < 0 || used > supplied_ ? 0 : static_cast<std::size_t>(supplied_ - used);
     }
-    // What libxml2 has got in the present move; nothing while a host moves the reader itself.
+    // Bytes that libxml2 has received during the current move; 0 while a host moves the reader
+    // itself.
     std::int64_t runSize() {
         const bool moves = moves_ % 2 == 1;
         if (!moves || moves_ != movesBefore_) runStart_ = supplied_;
@@ -90,8 +92,9 @@ class PartInput {
         return supplied_ - runStart_;
     }
 
-    // False when there are too many in the long markup that these bytes belong to. What is markup
-    // costs more to tell than to count, so that is left until there seem to be too many.
+    // False when there are too many marks in the long markup that these bytes belong to.
+    // Recognising CDATA sections costs more than counting, so it is done only when the plain count
+    // exceeds the limit.
     bool countMarks(std::string_view supply, bool isLong) {
         if (!isLong) {
             marks_ = 0;
@@ -108,7 +111,8 @@ class PartInput {
         }
         return marks_ <= kLongMarkupMarks;
     }
-    // Begins with the document anew. False when that cannot be read a second time.
+    // Reads the document from its beginning again, to count exactly. False when that cannot be
+    // done.
     bool countExactly() {
         exactMarks_.emplace();
         std::array<char, std::size_t{4} << 10> again;
@@ -132,12 +136,12 @@ class PartInput {
     std::uint32_t movesBefore_ = 0;
     std::int64_t runStart_ = 0;
     std::array<char, std::size_t{32} << 10> buffer_;
-    const char* next_ = nullptr;  // behind what libxml2 has got
-    const char* end_ = nullptr;   // of what is in the buffer
+    const char* next_ = nullptr;  // the next byte for libxml2
+    const char* end_ = nullptr;   // the end of the buffered bytes
     xmlTextReaderPtr reader_ = nullptr;
     std::int64_t supplied_ = 0;   // bytes
-    std::int64_t longStart_ = 0;  // from where the waiting markup counts as long, in bytes
-    std::size_t marks_ = 0;       // from there on
+    std::int64_t longStart_ = 0;  // where the unconsumed markup begins to count as long, in bytes
+    std::size_t marks_ = 0;       // counted from there on
     std::optional<MarkupMarks> exactMarks_;
 };
 

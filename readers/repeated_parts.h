@@ -8,8 +8,8 @@
 
 namespace dp {
 
-// The worksheet parts that were read. Any number of sheets may name the same one: a small file
-// could take any time.
+// Limits how often worksheet parts are read again. Any number of sheets may name the same part, so
+// without a limit a small file could take any time.
 class RepeatedParts {
   public:
     // To be called before a part is read. Throws CmXmlException when too much was read again.

@@ -10,7 +10,7 @@
 
 namespace dp {
 
-// Texts by index, one behind the other in memory and four bytes more for each.
+// Texts by index, stored back to back in memory, and four bytes more for each.
 class DPXLSX_API SharedStringTable {
   public:
     void clear();
@@ -25,7 +25,8 @@ class DPXLSX_API SharedStringTable {
         return std::string_view(bytes_).substr(begin, endOf(index) - begin);
     }
 
-    // Ask memory for what the other two read, without waiting for it.
+    // Prefetch what operator[] reads: the first call the position of the text, the second the text
+    // itself, for which the position should have arrived.
     void fetchPlace(std::size_t index) const { __builtin_prefetch(&ends_[index]); }
     void fetchText(std::size_t index) const {
         __builtin_prefetch(bytes_.data() + (index == 0 ? 0 : endOf(index - 1)));

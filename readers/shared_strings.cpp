@@ -23,8 +23,8 @@ std::size_t entriesThatFit(const std::string& path) {
 
 bool hasName(const XmlReader& reader, std::string_view name) { return reader.nodeName() == name; }
 
-// White space counts as text only inside a `t`: elsewhere it is the indentation of the document,
-// which libxml2 reports as significant too.
+// White space is text only inside a `t`. Elsewhere it is indentation, which libxml2 reports as
+// significant too.
 bool isInsideText(const XmlReader& reader) {
     const xmlNode* node = xmlTextReaderCurrentNode(reader.textReader);
     return node && node->parent && node->parent->name &&
@@ -97,7 +97,8 @@ void ExcelXLSXReader::mParseCharString(std::string& text) {
         if (code == "_x005F_") {
             decoded += '_';
         } else if (code >= "_x0001_" && code <= "_x001F_") {
-            // In range, the code has a fifth character; a text that ends there has no sixth.
+            // The check above guarantees a fifth character, but the text may end there: then there
+            // is no sixth.
             const int low = code.size() > 5 ? hexDigit(code[5]) : 0;
             decoded += static_cast<char>((code[4] == '1' ? 16 : 0) + low);
         } else {

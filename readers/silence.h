@@ -12,11 +12,11 @@ using XmlErrorPointer = const xmlError*;
 using XmlErrorPointer = xmlError*;
 #endif
 
-// While it lives, libxml2 reports nothing through the thread's own two channels, which may be the
-// host's; then those are as they were. Errors are told by results. Handlers of single readers do
-// not suffice: files that cannot be opened and bytes that cannot be decoded are reported past them.
-// Only the outermost of a thread does anything: every node is read under one, and libxml2 takes
-// long to find the channels.
+// During its lifetime libxml2 reports nothing to the thread's two error handlers, which may be the
+// host's; they are restored afterwards. Callers learn of errors by results. Handlers of single
+// readers do not suffice: errors in opening files and decoding bytes bypass them. Only a thread's
+// outermost instance does anything: every node is read under one, and finding the handlers takes
+// libxml2 long.
 class SilentLibxml2 {
   public:
     SilentLibxml2() {

@@ -59,7 +59,8 @@ void ExcelXmlReader::mReadExcelStyles() {
         } else {
             break;
         }
-        // Also behind an element without the attribute: nothing is visited twice.
+        // Moves on in every case, even when the element had no such attribute: otherwise it would
+        // be visited again.
         xmlReader.readToElement();
     }
     mReplaceDescWithFormat();
@@ -70,7 +71,7 @@ void ExcelXmlReader::mReadExcelWorksheet(std::vector<unsigned>& emptySheets) {
     const std::string name = xmlReader.attributeText("ss:Name");
     const int element = xml::mReadForElements(xmlReader, {"Table", "WorksheetOptions"});
     if (element == -1) fail();
-    if (element == 1) return;  // no table: the worksheet is passed over
+    if (element == 1) return;  // no table: the worksheet is skipped
 
     unsigned columnCount = 0;
     unsigned rowCount = 0;
@@ -103,8 +104,8 @@ void ExcelXmlReader::mReadExcelWorksheetDataHeader() {
     if (element == -1) fail();
 }
 
-// Ends with the row or the counted columns, whichever comes first; a table may claim to have any
-// number of columns.
+// Ends with the row or the declared columns, whichever comes first: a table may declare any number
+// of columns.
 void ExcelXmlReader::readRow(unsigned row, unsigned columnCount) {
     unsigned column = 0;
     while (column < columnCount) {

@@ -103,7 +103,7 @@ void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
         }
     }
     if (index > column) column = index - 1;
-    // Wider than a worksheet, or negative: it would hide the cells behind it.
+    // A merge wider than a worksheet, or negative, would hide the cells that follow.
     if (mergeAcross >= kWorksheetColumns) mergeAcross = 0;
     if (hasStyle) return;
     currentStyleId.clear();

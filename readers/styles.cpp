@@ -86,7 +86,8 @@ class StyleSheetPass {
         builtInsAdded_ = true;
     }
 
-    // The built-in formats and as many as were declared find room, whichever element holds them.
+    // Keeps as many formats as were declared, beside the built-in ones, whichever elements they are
+    // in.
     void addNumberFormat() {
         xStyle style;
         style.styleId = reader_.attributeText("numFmtId");

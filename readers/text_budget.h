@@ -8,13 +8,13 @@
 
 namespace dp {
 
-// How many bytes of text the cells of a package may hold in all, by the size of its parts. One
-// shared string may stand in every cell: a small file could fill any memory.
+// Limits the total bytes of text in the cells of a package, by the size of its parts. One shared
+// string may stand in every cell, so without a limit a small file could fill any memory.
 class TextBudget {
   public:
-    // Grows by the size of a part that is read; a part that is not there has none.
+    // Adds the size of a part that is read; nothing for a missing part.
     void addPart(const std::string& path);
-    // Throws CmXmlException when the cells hold too much with this text of `size` bytes.
+    // Counts a text of `size` bytes. Throws CmXmlException when the cells then hold too much.
     void spend(std::size_t size);
 
   private:

@@ -26,8 +26,8 @@ CellKind kindOf(std::string_view type) {
     return CellKind::Number;  // Booleans and ISO dates included
 }
 
-// The names that the pass looks for, as the document's own table has them: one pointer comparison
-// tells whether a node has such a name.
+// The names that the pass looks for, as the document's own copies: one pointer comparison tells
+// whether a node has such a name.
 struct Names {
     explicit Names(XmlReader& reader)
         : row(reader.knownName("row")),
@@ -45,7 +45,7 @@ struct Names {
     const char* s;
 };
 
-// Where a shared-string cell points to: the optional sign and digits of `text`, or -1 for a number
+// The index in a shared-string cell: the optional sign and digits of `text`, or -1 for a number
 // beyond any table. Throws CmXmlException for anything else.
 long sharedStringIndex(const char* text) {
     constexpr long kBeyond = 0x7FFFFFFF;
@@ -74,8 +74,7 @@ class WorksheetPass {
         try {
             readCells();
         } catch (...) {
-            // What came before an error is delivered all the same, unless the error comes from
-            // there.
+            // Cells read before an error are still delivered, unless the provider itself failed.
             if (!delivering_) deliverWaiting();
             throw;
         }
@@ -115,7 +114,7 @@ class WorksheetPass {
         Attributes attributes(reader_);
         const char* text = attributes.find("r");
         int number = 0;
-        // A row whose number is none counts as one without.
+        // A row whose number cannot be read counts as a row without a number.
         const bool numbered = text && CmXmlCast::instance().mCast(number, text);
         place_.beginRow(numbered ? &number : nullptr);
     }
@@ -140,8 +139,8 @@ class WorksheetPass {
         if (!placed) place_.beginCell(nullptr);
     }
 
-    // Moves to the text of the current element; null when it has none. Comments are no text.
-    // Throws CmXmlException when the document ends.
+    // Moves to the text of the current element; null when it has none. Comments are skipped. Throws
+    // CmXmlException when the document ends.
     const char* readText() {
         if (xmlTextReaderIsEmptyElement(reader_.textReader) == 1) return nullptr;
         int type = XML_READER_TYPE_COMMENT;
@@ -213,8 +212,9 @@ class WorksheetPass {
         deliverTextAt(place_.row(), place_.column());
     }
 
-    // A shared string is anywhere in memory, which takes its time to answer. It is asked early, and
-    // the cells go on in their order a little later.
+    // A shared string can be anywhere in memory and is likely to be a cache miss. It is prefetched
+    // here, while the cell waits in a queue; the cells are delivered in their order a little later,
+    // when their texts have arrived in the cache.
     void wait(const WaitingCell& cell) {
         if (waitingCount_ == kWaiting) deliverOldest();
         waiting_[(oldest_ + waitingCount_++) % kWaiting] = cell;

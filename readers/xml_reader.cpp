@@ -16,13 +16,13 @@
 
 namespace {
 
-// libxml2 takes a relative path with a scheme for the address of another file, on another machine
-// even: no file opens under such a name, but a copy of it does.
+// libxml2 takes a relative path that contains a scheme for an address, even on another machine, and
+// cannot open a file with such a name; a copy under another name opens.
 bool looksLikeAddress(const std::string& path) {
     return !path.starts_with('/') && path.find("://") != path.npos;
 }
 
-// Null for a path that cannot be opened, or that names something else to libxml2.
+// Null for a path that cannot be opened, or that libxml2 would take for an address.
 xmlTextReaderPtr openFile(const std::string& path, const std::uint32_t& moves) {
     return looksLikeAddress(path) ? nullptr : dp::openDocument(path, moves);
 }
@@ -35,8 +35,8 @@ std::string copyToTemporary(const std::string& path) {
     return copy;
 }
 
-// A name with a prefix is put together when it is asked for, which libxml2 refuses once a document
-// has filled its dictionary with names. To pass over the element would lose what it holds.
+// libxml2 composes a prefixed name when it is asked for, and fails to once the document has filled
+// the dictionary of names. Skipping the element instead would lose its content.
 void requireNoElement(int nodeType) {
     if (nodeType == XML_READER_TYPE_ELEMENT || nodeType == XML_READER_TYPE_END_ELEMENT)
         throw CmXmlException(kXmlError);
@@ -170,7 +170,7 @@ int KnownNames::find(const char* name) const {
     };
     const int same = position([name](const char* known) { return known == name; });
     if (same != -1 || !name) return same;
-    // A document keeps names with a prefix apart.
+    // A name with a prefix is another copy: compare characters.
     return position([name](const char* known) { return std::strcmp(known, name) == 0; });
 }
 

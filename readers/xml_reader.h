@@ -45,8 +45,8 @@ class DPXLSX_API XmlReader {
 
     // Reads an integer attribute of the current element; T is int or unsigned. True when the
     // attribute exists; text that does not start with a number leaves `value` as it was, and a
-    // number too large for T becomes the largest one. Leaves the cursor on the attribute, from
-    // where the next read goes on behind the element. Throws CmXmlException.
+    // number too large for T becomes the largest one. Leaves the cursor on the attribute; the next
+    // read continues behind the element. Throws CmXmlException.
     template <class T>
     bool mReadAttribute(T& value, const char* name);
     bool mReadAttribute_NotSafe(int& value, const char* name);
@@ -55,15 +55,15 @@ class DPXLSX_API XmlReader {
     bool readNode();
     // Moves to the next element; false at the end of the document. Throws CmXmlException.
     bool readToElement();
-    // Moves behind the current element and all that it holds; false at the end of the document.
-    // Throws CmXmlException.
+    // Moves to the node behind the current element and its content; false at the end of the
+    // document. Throws CmXmlException.
     bool skipElement();
     // The text of an attribute of the current element, empty when it has none. Moves the cursor as
     // mReadAttribute does. Throws CmXmlException.
     std::string attributeText(const char* name);
-    // `name` as the document keeps it: the current node has it when nodeName() is the same pointer;
-    // names with a prefix are kept apart. Valid as long as the reader. Throws CmXmlException when
-    // the document can keep no more names.
+    // The document's own copy of `name`: the current node has this name if nodeName() returns the
+    // same pointer. Only names with a prefix have other copies. Valid as long as the reader. Throws
+    // CmXmlException when the document can keep no more names.
     const char* knownName(const char* name);
     // The current node's type and name as libxml2 gives them; the name may be null where the node
     // is no element. Throws CmXmlException for an element without one.
@@ -75,8 +75,9 @@ class DPXLSX_API XmlReader {
     bool tempCopy = false;   // the document is a private copy that goes with the reader
     bool endOfFile = false;  // the last forward read came to the end of the document
   private:
-    // Twice the moves so far, and one more during one. Between the flags and the path it moves no
-    // field that hosts know.
+    // Incremented at the start and at the end of each move: odd while the reader is moving. It is
+    // declared here because it fits into the padding between the flags and the path, so no field
+    // that hosts know is moved.
     std::uint32_t moves_ = 0;
 
   public:
@@ -89,8 +90,8 @@ class DPXLSX_API XmlReader {
 
 namespace dp::xml {
 
-// Names as a reader's document keeps them: comparing pointers finds nearly all. Valid as long as
-// the reader, for names that it gives.
+// Names as the document's own copies, so that comparing pointers nearly always suffices. Valid as
+// long as the reader, and only for names that this reader returns.
 class KnownNames {
   public:
     // None, until names are known.
