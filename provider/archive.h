@@ -7,8 +7,8 @@
 
 namespace dp {
 
-// A ZIP archive that is open for reading. The file behind it is closed in every case: minizip
-// itself forgets it when it runs out of memory while opening.
+// A ZIP archive that is open for reading. Closes the underlying file in every case: minizip leaks
+// it when memory runs out while opening.
 class Archive {
   public:
     explicit Archive(const std::string& path);

@@ -18,7 +18,7 @@ namespace {
 using BasicDataType = IVariable::BasicDataType;
 using FormatType = IVariableFormat::FormatType;
 
-// The formats of an open file, asked of the provider.
+// The formats of an open file, obtained from the provider.
 class ProviderFormats : public CellFormats {
   public:
     explicit ProviderFormats(const ExcelDataProviderBase& provider) : provider_(provider) {}
@@ -32,7 +32,7 @@ class ProviderFormats : public CellFormats {
     const ExcelDataProviderBase& provider_;
 };
 
-// What a column is by its first data cell and, once an option forces it, by the host's wish.
+// The kind of a column: that of its first data cell, unless an option sets another one.
 struct ColumnKind {
     ColumnType type;
     FormatType format;
@@ -79,8 +79,9 @@ struct ColumnAddress {
     const WorksheetCells::value_type* column;  // null for an unknown key
 };
 
-// Counts the columns before each worksheet, so that no key is sought by walking all of them.
-// Whoever changes the number of columns forgets the count of the last worksheet.
+// Caches the number of columns before each worksheet, so that finding a key does not walk all
+// worksheets. Code that changes the number of columns resets the last worksheet's count, which
+// marks the cache as outdated.
 void countColumns(const std::vector<WorksheetCells>& worksheets) {
     if (worksheets.empty() || worksheets.back().columnsBefore) return;
     std::size_t count = 0;
@@ -152,7 +153,7 @@ bool ExcelDataProviderBase::FindColumn(int key, IColumn** column, ColumnType req
     if (formatType) *formatType = kind.format;
     if (excluded || !column) return !excluded;
 
-    // The limit is cut to 16 bits: no limit is one of 65,535 characters.
+    // The limit is cut to 16 bits, so that no limit means 65,535 characters.
     cleanVariableName(name, static_cast<unsigned short>(_maxVariableNameLength & 0xFFFF));
     if (kind.type == ColumnType::Text)
         *column = LoadTextColumn(worksheetKey, cells, columnIndex, position, name, key);

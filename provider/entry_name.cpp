@@ -6,7 +6,7 @@ namespace dp {
 
 namespace {
 
-// Takes the last component off; false when there is none.
+// Removes the last component; false when there is none.
 bool goUp(std::string& directory) {
     if (directory.empty()) return false;
     const std::size_t slash = directory.rfind('/');

@@ -10,10 +10,10 @@ struct EntryName {
     std::string file;       // empty for an entry that is only a directory
 };
 
-// Takes the name of an entry apart. A ".." takes the component before it away, by the name alone: a
-// link in its place is not followed. False for a name that leads out of the directory, be it to
-// come back: an absolute one, or one with a ".." that has no component left. All other characters,
-// colons and backslashes among them, are those of a file's name.
+// Splits the name of an entry into directory and file. A ".." removes the component before it, in
+// the name alone: links are not followed. False for a name that leads out of the directory, even if
+// it leads back: an absolute name, or one with a ".." that has no component to remove. All other
+// characters, including colons and backslashes, are part of file names.
 bool parseEntryName(const std::string& name, EntryName& entry);
 
 }  // namespace dp

@@ -30,7 +30,7 @@ bool IsMicrosoftXLSXFile(const char* fileName) { return hasXlsxExtension(textOrE
 
 const char* GetDataProviderFiletype(const char* fileName) {
     static char fileType[sizeof kTypeName];
-    // One byte for the empty text, all of the name otherwise.
+    // The buffer always holds the name; a zero as its first byte makes it empty.
     std::memcpy(fileType, kTypeName, sizeof kTypeName);
     if (!IsMicrosoftXLSXFile(fileName)) fileType[0] = '\0';
     return fileType;

@@ -2,13 +2,13 @@
 
 #include "model/reference_count.h"
 
-// The provider's life.
+// Construction, reference counting and destruction of the provider.
 namespace dp {
 
 namespace {
 
-// What missing numbers are replaced from and to until the host says otherwise: the initial missing
-// value, whatever SetMissingValue has made of it since.
+// The initial value of both numbers of SetMissingNumeric: the initial missing value, whatever
+// SetMissingValue has set since.
 constexpr double kInitialMissingNumeric = 1.23456e30;
 
 }  // namespace

@@ -21,7 +21,7 @@
 
 namespace dp {
 
-// How a column is wanted; Automatic stands for the kind of its first data cell.
+// The kind in which a column is requested; Automatic is the kind of its first data cell.
 enum class ColumnType : int { Numeric = 0, Text = 1, Automatic = 2 };
 
 // The provider without the file: settings, read options, the worksheets that a reader announced and
@@ -199,15 +199,16 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
                              const IString* dateTimeFormat, bool& converted) const;
 
     // --- Row layout; a key that names no worksheet finds no rows, but options are made for it ---
-    // Makes the worksheet's name row and first data row concrete, unless it is excluded.
+    // Determines the worksheet's name row and first data row, unless it is excluded.
     void CalculateRowOffsets(unsigned key) const;
     // Decides from the first row whether the worksheet has a row of variable names, when its
     // setting is VNR_INFER.
     void InferVariableNameRow(unsigned key) const;
-    // Notes the worksheet's last row, when blank rows are ignored or columns padded; what was noted
-    // before stays.
+    // Determines and keeps the worksheet's last row, when blank rows are ignored or columns padded;
+    // an earlier result is not changed.
     void FindLastRow(unsigned key) const;
-    // Notes the worksheet's blank rows, when they are ignored; what was noted before stays.
+    // Determines and keeps the worksheet's blank rows, when they are ignored; an earlier result is
+    // not changed.
     void FindBlankRows(unsigned key) const;
     // Rows that a column of the worksheet gets when it is loaded.
     unsigned GetLoadColumnRowCount(unsigned key, const CellColumn& column) const;
@@ -216,10 +217,9 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     unsigned HandleBlankRows(INumericColumn* column, unsigned key, unsigned expectedRow,
                              unsigned rowCount, CellColumn::const_iterator cell) const;
 
-    // --- Loading; the columns are new, with a reference count of 0 ---
-    // `columnIndex` and `position` are 0-based places, in the sheet and towards the host. A null
-    // `formatType` stands for Numeric; it tells how the first data cell is shown and stays as it
-    // is.
+    // --- Loading; the columns are new, with a reference count of 0 --- `columnIndex` and
+    // `position` are 0-based: the column's index in the sheet and its position at the host.
+    // `formatType` says how the first data cell is shown and is only read; null stands for Numeric.
     INumericColumn* LoadNumericColumn(unsigned worksheetKey, const CellColumn& cells,
                                       unsigned columnIndex, unsigned position,
                                       const std::string& name, int key,
@@ -268,10 +268,11 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     static std::string _falseValue;
 
   protected:
-    // Puts back everything that ClearWorksheets promises to forget.
+    // Resets everything that ClearWorksheets promises to forget.
     void ResetInternalData();
 
-    // Members marked mutable are results that queries keep.
+    // Mutable members keep results that const queries compute when first asked: hosts query through
+    // const interfaces, and the results must stay the same until the worksheets are cleared.
     std::uint32_t _refCount = 0;
     std::string _fileName;
     bool _previewing = false;

@@ -11,8 +11,8 @@ namespace dp {
 
 namespace {
 
-// Whether libxml2 can read the workbook part as far as its sheet list. The elements on the way need
-// not be there: only an error counts.
+// Whether libxml2 can read the workbook part up to its sheet list. The elements up to there may be
+// missing: only an error counts.
 bool isReadable(const std::string& workbookPart) {
     try {
         const SilentLibxml2 silent;

@@ -17,13 +17,13 @@ enum class PackageStatus : int {
     NotAWorkbook = 13  // no style sheet or workbook part, or the latter is not XML
 };
 
-// The code by which the host learns of it.
+// The result code that the host gets.
 long resultCode(PackageStatus status);
 
 // Unpacks the archive at `archive` into `directory`, an absolute path that exists. Entries are
 // streamed; nothing outside the directory is written, and the archive itself is not overwritten.
-// What was written stays there after a failure. A package that claims more than the limits, or than
-// the file system has, is refused before anything is written.
+// What was written stays there after a failure. A package that claims more bytes or entries than
+// the limits or the free space allow is refused before anything is written.
 PackageStatus unpackArchive(const std::string& archive, const std::string& directory);
 
 // Whether the unpacked package in `directory` is a workbook. Throws the file system's error when

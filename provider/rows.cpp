@@ -2,8 +2,8 @@
 #include "provider/excel_data_provider_base.h"
 #include "store/row_layout.h"
 
-// From read options and stored cells to the rows of a worksheet. The results are kept: later cells
-// and column options do not change them.
+// Derives the rows of a worksheet from read options and stored cells. The results are kept: cells
+// and column options that come later do not change them.
 namespace dp {
 
 void ExcelDataProviderBase::CalculateRowOffsets(unsigned key) const {
@@ -38,6 +38,8 @@ void ExcelDataProviderBase::FindBlankRows(unsigned key) const {
         const auto option = options.find(column + 1);
         return option == options.end() || !option->second.exclude;
     };
+    // [] on purpose, here and in GetLoadColumnRowCount: a worksheet whose last row has not been
+    // determined gets row 0 and keeps it, so that all later answers agree with this one.
     _blankRows[key] = findBlankRows(cellsOf(key), _lastRows[key], counts);
 }
 

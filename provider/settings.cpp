@@ -10,7 +10,8 @@ namespace dp {
 void ExcelDataProviderBase::SetWriteOptionVariableNames(bool write) { _writeVariableNames = write; }
 
 void ExcelDataProviderBase::SetMissingText(const char* from, const char* to) {
-    // The arguments may be what the getters answered.
+    // Copied first: the arguments may point into the strings that are replaced, as the getters
+    // return them.
     std::string newFrom = textOrEmpty(from);
     std::string newTo = textOrEmpty(to);
     _missingTextFrom = std::move(newFrom);
@@ -33,7 +34,7 @@ void ExcelDataProviderBase::SetMaxVariableNameLength(unsigned length) {
 }
 
 void ExcelDataProviderBase::SetDateTimeVariableFormatHelper(IDateTimeVariableFormat* helper) {
-    // Given again, the helper must not be deleted on its way in.
+    // The helper that is already set must not be deleted when the host sets it again.
     if (helper != _dateTimeHelper.get()) _dateTimeHelper.reset(helper);
 }
 

@@ -15,14 +15,16 @@ namespace dp {
 namespace fs = boost::filesystem;
 
 std::string makePrivateDirectory() {
-    // The whole name before the directory: from then on nothing may fail.
+    // The name is complete before the directory is made: nothing may fail afterwards, or the
+    // directory would be left behind.
     std::string directory = unusedTemporaryPath();
     if (!directory.empty() && !makeOwnDirectory(directory)) directory.clear();
     return directory;
 }
 
 bool makeOwnDirectory(const std::string& path) {
-    // Closed to others from its first moment; the second call undoes what the umask took away.
+    // The mode of mkdir keeps others out from the first moment on; chmod adds what the umask
+    // removed.
     if (::mkdir(path.c_str(), S_IRWXU) != 0) return false;
     if (::chmod(path.c_str(), S_IRWXU) == 0) return true;
     ::rmdir(path.c_str());

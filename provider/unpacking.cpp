@@ -29,10 +29,10 @@ constexpr std::size_t kBufferSize = 8192;  // bytes
 constexpr std::size_t kLongestName = 255;  // bytes; longer names are cut
 constexpr int kEntryFailed = UNZ_INTERNALERROR;
 
-// A file being written; closes with it.
+// A file being written; the destructor closes it.
 class OutputFile {
   public:
-    // Never through a link. Readable by its owner whatever the umask.
+    // Does not follow a link. The file is readable by its owner whatever the umask.
     explicit OutputFile(const std::string& path)
         : descriptor_(::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOFOLLOW | O_CLOEXEC,
                              S_IRUSR | S_IWUSR)) {
@@ -57,7 +57,7 @@ class OutputFile {
         return true;
     }
 
-    // False when the file system reports only now that something was not written.
+    // False when the file system reports a failed write only on closing.
     bool close() { return ::close(std::exchange(descriptor_, -1)) == 0; }
 
   private:
@@ -67,10 +67,10 @@ class OutputFile {
 // What an archive claims to hold. Its entries unpack to no more bytes than they claim.
 struct Claims {
     std::uint64_t entries = 0;
-    std::uint64_t bytes = 0;  // the largest number for more
+    std::uint64_t bytes = 0;  // saturates
 };
 
-// Of the entries up to the first damaged one; up to the first one too many.
+// The sum over the entries before the first damaged one; stops when there are too many.
 Claims claimsOf(unzFile archive) {
     Claims claims;
     for (int result = unzGoToFirstFile(archive); result == UNZ_OK;
@@ -98,7 +98,7 @@ class Unpacking {
     PackageStatus run() {
         const std::uint64_t space = freeSpace(directory_);
         spareSpace_ = space / kSpareSpaceDivisor;
-        boost::system::error_code unknown;  // the archive is open, so that it has a size
+        boost::system::error_code unknown;  // for the overload that does not throw
         const std::uint64_t size = fs::file_size(archivePath_, unknown);
         if (unknown || exceedsLimits(claimsOf(archive_), size, space - spareSpace_))
             return PackageStatus::TooLarge;
@@ -130,8 +130,9 @@ class Unpacking {
         return unpackFile((fs::path(directory_) / entry.directory / entry.file).string());
     }
 
-    // True when every directory on the way to `relative` exists now. Nothing is made or found
-    // through a link, which nothing in the private directory is unless somebody else put it there.
+    // Makes the directories that lead to `relative`; true when all of them exist afterwards. Links
+    // are not followed: the library makes none, so somebody else must have put them into the
+    // private directory.
     bool makeDirectories(const std::string& relative) const {
         fs::path path = directory_;
         for (const fs::path& component : fs::path(relative)) {
@@ -167,7 +168,7 @@ class Unpacking {
         return size;
     }
 
-    // Others write to the same file system.
+    // Asked again and again, because other processes write to the same file system.
     bool hasSpaceFor(int size) {
         unchecked_ += static_cast<std::uint64_t>(size);
         if (unchecked_ < kSpaceCheckInterval) return true;
@@ -180,7 +181,7 @@ class Unpacking {
     const std::string& archivePath_;
     const std::string& directory_;
     std::uint64_t spareSpace_ = 0;  // bytes
-    std::uint64_t unchecked_ = 0;   // bytes written since the last look at the free space
+    std::uint64_t unchecked_ = 0;   // bytes written since the last check of the free space
     bool spaceIsShort_ = false;
 };
 

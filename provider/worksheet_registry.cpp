@@ -39,7 +39,7 @@ void ExcelDataProviderBase::AddWorksheet(const char* name) {
     const int count = static_cast<int>(_worksheetNames.size()) + 1;
     const int key = keys.empty() ? count : std::max(count, keys.back() + 1);
 
-    // Room first, so that nothing can fail between the three additions.
+    // Reserves memory first, so that nothing can fail between the three additions.
     makeRoomForOne(_worksheetNames);
     makeRoomForOne(_cells);
     makeRoomForOne(keys);
@@ -53,7 +53,7 @@ void ExcelDataProviderBase::AddWorksheet(const char* name) {
 
 void ExcelDataProviderBase::RemoveWorksheet(int position) {
     if (!isPosition(position, _worksheetNames)) return;
-    // The key may be given out again, to a worksheet with other rows.
+    // The key may be assigned again, to a worksheet with other rows.
     const auto key = static_cast<unsigned>(GetWorksheetPrimeKey(static_cast<unsigned>(position)));
     _lastRows.erase(key);
     _blankRows.erase(key);

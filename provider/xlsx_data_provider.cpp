@@ -35,7 +35,8 @@ PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     if (directory.empty()) return PackageStatus::DirectoryUnusable;
     _tempDirectory = std::move(directory);
     const fs::path copy = fs::path(_tempDirectory) / source.filename();
-    // The disk is not filled first by what will not fit: a file of holes can be of any size.
+    // Checked before copying, because a sparse file may have any size and its copy would fill the
+    // disk.
     boost::system::error_code unknown;
     const bool fits = fs::file_size(source, unknown) <= freeSpace(_tempDirectory) || unknown;
     if (!fits || !copyFile(source.string(), copy.string())) {
@@ -51,7 +52,7 @@ void xlsxDataProvider::removeUnpackedFile() try {
     removeDirectoryAndContents(_tempDirectory);
     _tempDirectory.clear();
 } catch (const std::bad_alloc&) {
-    // Closing cannot fail. The directory goes with the next open or close, or the last Release.
+    // Closing never throws. The next open or close, or the last Release, removes the directory.
 }
 
 long xlsxDataProvider::OpenFile(const char* fileName, FileAccess access) {

@@ -31,7 +31,7 @@ class DPXLSX_API xlsxDataProvider : public ExcelDataProviderBase {
     bool IsDateTimeFormatType(const ExternalDataRecordCell& cell) const override;
 
   private:
-    // Copies and unpacks the file into a new directory, in place of the one before.
+    // Copies and unpacks the file into a new directory, which replaces the one before.
     PackageStatus unzipFile(const char* fileName);
     void removeUnpackedFile();
 
