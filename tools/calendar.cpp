@@ -28,7 +28,7 @@ DayAndTime split(double serial) {
     return {static_cast<long>(day), static_cast<long>(total - day * kMillisecondsPerDay)};
 }
 
-// Days since 1899-12-30 as serial day: up to February 1900 the count is one ahead.
+// Converts days since 1899-12-30 to a serial day, which is one less until the end of February 1900.
 double serialDay(double days) { return days > 0 && days <= kFictitiousDay ? days - 1 : days; }
 
 std::string dateText(long day) {

@@ -3,8 +3,8 @@
 #include <string>
 #include <string_view>
 
-// Serial day numbers of the 1900 system: 1 is 1900-01-01, 60 the day 1900-02-29 that never was, 61
-// is 1900-03-01; 0 stands for no day, its fraction being a time of day.
+// Serial day numbers of the 1900 system: 1 is 1900-01-01, 60 is 1900-02-29, which never existed,
+// and 61 is 1900-03-01. 0 stands for no day: with a fraction it is a time of day alone.
 namespace dp::tool {
 
 constexpr double kLastSerial = 2958465.99999;  // the end of the year 9999
@@ -23,11 +23,11 @@ struct CalendarTime {
 // True from serial 0 to the end of the year 9999.
 bool isValidSerial(double serial);
 
-// Both days before 1900 that spreadsheets write for a mere time (1899-12-30, 1899-12-31) are 0.
-// A month or day that no calendar has gives -1.
+// 1899-12-30 and 1899-12-31, which spreadsheets write for a time without a date, give 0. A month or
+// day that does not exist gives -1.
 double serialOf(const CalendarTime& time);
 
-// Milliseconds since 1970-01-01. The 29 February 1900 comes out as 1 March.
+// Milliseconds since 1970-01-01. 29 February 1900 gives 1 March.
 double unixMilliseconds(double serial);
 double serialOfUnixMilliseconds(double milliseconds);
 
@@ -39,9 +39,9 @@ struct PatternFields {
 };
 PatternFields fieldsOf(std::string_view pattern);
 
-// The serial as "2010-01-01", "18:00:00" or both with `separator` in between: what the pattern
-// shows, and whatever else of the value is not zero. Milliseconds only when there are some.
-// Empty for a serial that is not valid.
+// The serial as "2010-01-01", "18:00:00" or both with `separator` in between. Date or time is
+// included if the pattern shows it or its value is not zero, milliseconds if they are not zero.
+// Empty for an invalid serial.
 std::string isoText(double serial, std::string_view pattern, char separator);
 
 }  // namespace dp::tool

@@ -97,7 +97,7 @@ std::string Column::shown(size_t row) const {
     if (isMissing(row)) return {};
     if (kind_ == Kind::Text) return text(row);
     const IVariableFormat* format = column_->GetFormat();
-    // Without a pattern the format would show the day alone.
+    // Without a pattern the format would show only the day.
     const bool plain = format == nullptr || (kind_ == Kind::DateTime && pattern().empty());
     if (plain) return exact(row, ' ');
     const std::unique_ptr<IString> shown(format->FormatValue(number(row), false));

@@ -12,10 +12,10 @@ enum class Kind { Number, DateTime, Text };
 // The shortest text that reads back as the same number.
 std::string numberText(double value);
 
-// A column of the library, row by row. Rows are 0-based.
+// Access to a loaded column by row. Rows are 0-based.
 class Column {
   public:
-    // A preview has values in its first 101 rows only; it counts no others.
+    // In a preview only the first 101 rows have values; the others are not counted.
     Column(IColumn* column, double missing, bool preview);
 
     const IColumn& host() const { return *column_; }

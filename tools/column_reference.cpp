@@ -59,7 +59,7 @@ std::optional<ColumnReference> parseColumnReference(std::string_view text) {
 }
 
 std::optional<ColumnAssignment> parseColumnAssignment(std::string_view text) {
-    // Names of worksheets may hold "=": the first one that follows a column counts.
+    // Names of worksheets may contain "=": the first one after a valid column is the separator.
     for (size_t at = text.find('='); at != std::string_view::npos; at = text.find('=', at + 1)) {
         if (auto column = parseColumnReference(text.substr(0, at))) {
             return ColumnAssignment{std::move(*column), std::string(text.substr(at + 1))};

@@ -24,8 +24,8 @@ std::optional<unsigned> columnNumber(std::string_view text);
 // The letters of a column, the first being 1.
 std::string columnLetters(unsigned number);
 
-// The column as an option takes it: "Sheet!C", or "1!C" by the worksheet's key where the title has
-// a character that an option or a terminal would take for something else.
+// The column in the form that options accept: "Sheet!C", or "1!C" with the worksheet's key when the
+// title has a character that an option or a terminal would misread.
 std::string columnReference(const std::string& title, int key, unsigned number);
 
 // None when the text is no such reference or assignment.

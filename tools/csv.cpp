@@ -38,7 +38,7 @@ void writeLine(Output& output, const LoadedWorksheet& worksheet, TextOf textOf) 
         if (&column != &worksheet.columns.front()) line += ',';
         line += quoted(validUtf8(textOf(column)));
     }
-    // Readers skip a line without anything: this one has a field.
+    // Programs that read CSV skip empty lines; an empty field must still be a row.
     output.write(line.empty() ? "\"\"\n" : line + "\n");
 }
 
@@ -56,7 +56,8 @@ void writeWorksheet(const LoadedWorksheet& worksheet, const Options& options,
     output.finish();
 }
 
-// The title as a file name that stays in its folder and that no file system refuses.
+// A file name made of the title: it does not lead out of the folder, and every file system accepts
+// it.
 std::string fileName(const std::string& title) {
     constexpr size_t kLongest = 200;  // bytes
     std::string name = validUtf8(title);

@@ -24,20 +24,20 @@ class HostString : public IString {
     std::string text_;
 };
 
-// The host's side of date-times: what the provider asks to check, read and write them. The four
-// parameters have no meaning here; what counts is the pattern of the format last handed over.
+// The host's part in handling date-times: the provider asks it to check, read and write them. The
+// four parameters are not used; the pattern of the format passed last is.
 class DateTimeHelper : public IDateTimeVariableFormat {
   public:
     FormatType GetType() const override { return FormatType::DateTime; }
     bool GetAuto() const override { return true; }
-    // By the pattern last handed over, in ISO form when there is none.
+    // Renders by the pattern passed last, or in ISO form when there is none.
     IString* FormatValue(double value, bool fullPrecision) const override;
     void GetDateTimeParameters(unsigned* p1, unsigned* p2, unsigned* p3,
                                unsigned* p4) const override;
     void SetDateTimeParameters(const IDateTimeVariableFormat* other) override;
     const IString* GetFormatString() const override { return &pattern_; }
-    // Reads the whole text, spaces around it aside, by the pattern, or by usual ones when none is
-    // known. A text without a year is refused unless it is a mere time.
+    // Reads the text, trimmed, by the pattern, or by common patterns when none is known. The whole
+    // text must match. A text without a year is refused unless it is only a time.
     bool ConvertToDatetime(const IString* format, IString* text, double& value) const override;
     double GenerateTime(int year, int month, int day, int hour, int minute, int second,
                         int millisecond) const override;

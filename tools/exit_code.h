@@ -5,7 +5,7 @@
 
 namespace dp::tool {
 
-// What the program ends with. Failures of the library keep the digits of its result code.
+// Exit codes of the program. Failures of the library have the digits of its result code.
 enum ExitCode : int {
     kSuccess = 0,
     kReadFailure = 1,
@@ -31,11 +31,11 @@ class Failure : public std::runtime_error {
     ExitCode code_;
 };
 
-// The failure behind a negative result code of opening or listing `book`.
+// The failure that a negative result code of opening or listing `book` stands for.
 Failure readFailure(const std::string& book, long result);
 
-// The failure behind the exception that is being handled, one of the library's own included. Only
-// to be called from a catch block.
+// The failure that the current exception stands for, including exceptions of the library. To be
+// called only in a catch block.
 Failure currentFailure(const std::string& book);
 
 // Prints a failure or a note as one line on standard error, with the program's name before it.

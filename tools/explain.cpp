@@ -64,7 +64,7 @@ Attempt tryImport(const Library& library, const Options& options) {
     return attempt;
 }
 
-// Failures that say nothing about the book.
+// Whether the failure says nothing about the book.
 bool isOfTheSystem(const Failure& failure) {
     const int code = failure.code();
     return code == kNoSuchFile || code == kTemporaryDirectory || code == kSystemFailure ||
@@ -72,11 +72,11 @@ bool isOfTheSystem(const Failure& failure) {
 }
 
 std::vector<Trait> allTraits(const Library& library, Options options) {
-    options.settings.cleanSheetNames = false;  // the book has the names as they are
+    options.settings.cleanSheetNames = false;  // the book itself has the original names
     const Attempt attempt = tryImport(library, options);
     const std::optional<Failure>& failure = attempt.failure;
     if (failure && isOfTheSystem(*failure)) throw *failure;
-    // A package that the library does not unpack is not read any further either.
+    // A package that the library cannot unpack is not inspected either.
     const bool unpacked = !failure || failure->code() != kReadFailure;
     Findings findings = unpacked ? inspect(options.book, attempt.imported) : Findings();
     findings.lost = attempt.lost;
@@ -89,7 +89,7 @@ std::vector<Trait> allTraits(const Library& library, Options options) {
     return traits;
 }
 
-// Nothing when the look fails: the import's own outcome stands.
+// Nothing when the inspection fails: the result of the import itself stands.
 Findings quickFindings(const std::string& book, const std::string& folder,
                        const std::set<std::string>& leftOut) {
     try {

@@ -20,8 +20,8 @@ bool contains(std::string_view text, std::string_view part) {
     return text.find(part) != std::string_view::npos;
 }
 
-// The entries of a compound file's directory have 128 bytes and stand at multiples of that: the
-// name in UTF-16, its length in bytes with the closing zero, and the type of the entry.
+// The directory entries of a compound file have 128 bytes and lie at multiples of 128: the name in
+// UTF-16, its length in bytes including the final zero, and the entry's type.
 constexpr size_t kDirectoryEntry = 128;
 
 bool namesStream(std::string_view entry, std::string_view name) {
@@ -39,8 +39,8 @@ bool namesStream(std::string_view entry, std::string_view name) {
     return true;
 }
 
-// Looks at every place where the directory may have an entry: no chain of sectors is followed, so
-// none can lead astray.
+// Checks every place where the directory may have an entry instead of following chains of sectors,
+// which a damaged file may have wrong.
 FileKind compoundKind(std::ifstream& file) {
     std::array<char, 512 * kDirectoryEntry> block;
     file.clear();
@@ -67,7 +67,7 @@ FileKind textKind(std::string_view beginning) {
         return FileKind::Spreadsheet2003;
     }
     if (contains(text, "<html") || contains(text, "<table")) return FileKind::WebPage;
-    // UTF-16 has zeros, but begins with its mark.
+    // UTF-16 text has zero bytes, but begins with a byte order mark.
     const bool wide = text.starts_with("\xFF\xFE") || text.starts_with("\xFE\xFF");
     return wide || !contains(text, std::string_view("\0", 1)) ? FileKind::PlainText
                                                               : FileKind::Unknown;
@@ -84,7 +84,7 @@ FileKind archiveKind(const Package& package) {
         {"word/document.xml", FileKind::TextDocument},
         {"ppt/presentation.xml", FileKind::Presentation},
         {"content.xml", FileKind::OpenDocument},
-        {"_rels/.rels", FileKind::Workbook},  // the workbook may have another name
+        {"_rels/.rels", FileKind::Workbook},  // its workbook part may have another name
     };
     for (const Sign& sign : kSigns) {
         if (!package.similarTo(sign.entry).empty()) return sign.kind;

@@ -24,8 +24,8 @@ enum class FileKind {
     Unknown
 };
 
-// What the file is, whatever its name says. `package` is the same file. Throws a Failure when the
-// file cannot be read.
+// The kind of the file by its content, whatever its name. `package` is the same file. Throws a
+// Failure when the file cannot be read.
 FileKind fileKind(const std::string& path, const Package& package);
 
 }  // namespace dp::tool

@@ -13,7 +13,7 @@
 
 namespace dp::tool {
 
-// Cells, ranges or texts with one trait. Only the first place is kept, however many there are.
+// Cells, ranges or texts with one trait: their number and the first place.
 struct Places {
     size_t count = 0;
     std::string first;  // such as "Sheet1!B2"; the worksheet alone when the cell names no place
@@ -23,13 +23,13 @@ struct Places {
     }
 };
 
-// A part that the package has, but not under the name at which the import looks.
+// A part that the package has under another name than the one that the import looks for.
 struct MovedPart {
     std::string wanted;
     std::string found;
 };
 
-// A number format of cells with numbers.
+// The number format of a cell style that cells with numbers use.
 struct UsedFormat {
     std::string code;  // "built-in 30" for one that has none
     bool isDate;       // by the rules of spreadsheet programs
@@ -40,7 +40,7 @@ struct UsedFormat {
 struct StyledColumn {
     size_t worksheet;  // its place in the book
     unsigned column;   // 1-based, 0 when the cells name none
-    int style;         // kBoolean for Booleans, which have no number format to go by
+    int style;         // kBoolean for Booleans, whose number format does not count
 
     static constexpr int kBoolean = -1;
     bool operator<(const StyledColumn& other) const {
@@ -51,12 +51,12 @@ struct StyledColumn {
 
 struct StyledCells {
     Places cells;
-    std::string reference;     // the column as an option takes it; empty when it is not known
-    std::optional<Kind> kind;  // what an import made of the column, when it did
-    bool isChosen = false;     // the kind is an option's
+    std::string reference;     // the column in the form that options accept; empty when not known
+    std::optional<Kind> kind;  // the kind that the import gave the column, if it was imported
+    bool isChosen = false;     // the kind was set by an option
 };
 
-// Names of which the first few are kept.
+// A number of names, of which the first few are kept.
 struct Names {
     size_t count = 0;
     std::vector<std::string> first;
@@ -67,7 +67,7 @@ struct Names {
     }
 };
 
-// What a look into a file found.
+// What the inspection of a file found.
 struct Findings {
     FileKind kind = FileKind::Workbook;
     bool namedXlsx = true;
@@ -81,7 +81,7 @@ struct Findings {
         if (prefixedName.empty()) prefixedName = writtenName;
     }
     bool workbookPrefixed = false;
-    bool relationshipPrefixed = false;  // a worksheet's id is written otherwise than r:id
+    bool relationshipPrefixed = false;  // a worksheet's id has another prefix than r:id
     bool stringsPrefixed = false;
     bool stylesPrefixed = false;
     Names prefixedWorksheets;
@@ -103,19 +103,19 @@ struct Findings {
     Places phoneticTexts;  // cells with shared texts
     Places phoneticCells;  // inline texts
     Places errors;
-    Names hiddenWorksheets;           // those that are imported
-    Places runs;                      // inline texts of several runs
-    Places inlineValues;              // inline texts of cells that have a value too
-    Places pieces;                    // values and inline texts of which a first piece arrives
-    Places booleanWords;              // TRUE in letters
-    Places notNumbers;                // texts where numbers belong
-    std::string notNumber;            // the first of them
-    Places lowerCase;                 // references, of cells with content
-    std::string lowerCaseColumn;      // where the first of them arrives
-    bool lowerCaseFails = false;      // one of them is beyond the last column
-    std::vector<std::string> broken;  // parts that are missing or break off
+    Names hiddenWorksheets;       // those that are imported
+    Places runs;                  // inline texts of several runs
+    Places inlineValues;          // inline texts of cells that have a value too
+    Places pieces;                // values and inline texts of which only the first piece arrives
+    Places booleanWords;          // TRUE in letters
+    Places notNumbers;            // texts where numbers belong
+    std::string notNumber;        // the first of them
+    Places lowerCase;             // cells with content whose reference has lower-case letters
+    std::string lowerCaseColumn;  // the column in which the first of them arrives
+    bool lowerCaseFails = false;  // one of them is beyond the last column
+    std::vector<std::string> broken;  // parts that are missing, malformed or cut off
 
-    // What an import lost, which the package alone does not show.
+    // What the import lost; this cannot be seen in the package alone.
     Lost lost;
     int textLimit = 0;  // bytes
 };

@@ -5,8 +5,8 @@
 #include "tools/style_probe.h"
 #include "tools/trait.h"
 
-// Traits of cells by their number formats: by the rules of spreadsheet programs, by the library's
-// answers about the cell styles, and by the kinds that the import gave to their columns.
+// Traits that result from number formats. They follow from how spreadsheet programs and the library
+// each treat the cell styles, and from the kinds that the import gave the columns.
 namespace dp::tool {
 
 using StyleAnswers = std::map<int, StyleAnswer>;  // by index of the cell style

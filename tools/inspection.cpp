@@ -16,7 +16,7 @@ namespace dp::tool {
 
 namespace {
 
-// Far more than spreadsheet programs write: what comes after only fills the memory.
+// Far more than spreadsheet programs write; a hostile book must not fill the memory.
 constexpr size_t kMostWorksheets = 10000;
 constexpr size_t kMostRelationships = 100000;
 
@@ -35,7 +35,7 @@ std::string lastStep(const std::string& type) { return type.substr(type.rfind('/
 
 std::string folderOf(const std::string& part) { return part.substr(0, part.rfind('/') + 1); }
 
-// The part that a relationship of a part in `folder` leads to.
+// The name of the part that a relationship of a part in `folder` leads to.
 std::string resolved(const std::string& folder, const std::string& target) {
     const bool fromRoot = target.starts_with('/');
     const std::filesystem::path path((fromRoot ? "" : "/" + folder) + target);
@@ -88,7 +88,7 @@ class Inspector {
     }
 
   private:
-    // The workbook leads to all other parts, wherever it is itself.
+    // Finds the workbook part under any name, because it leads to all other parts.
     void findWorkbook() {
         readRelationships("_rels/.rels", "");
         const std::string workbook = located(kWorkbook, "officeDocument");
@@ -105,9 +105,9 @@ class Inspector {
         findings_.hasStyles = !located(kStyles, "styles").empty();
     }
 
-    // The name of the entry with the part: the wanted one, else one of another letter case, else
-    // the one that relationships of this type name; noted when it is not the wanted one. Empty
-    // when there is none.
+    // The name of the entry with the part `wanted`: this name itself, else one that differs in
+    // letter case, else the one that a relationship of this type names. Another name than `wanted`
+    // is noted. Empty when there is no such part.
     std::string located(const std::string& wanted, const std::string& type) {
         if (package_.has(wanted)) return wanted;
         std::string found = package_.similarTo(wanted);
@@ -131,10 +131,11 @@ class Inspector {
         findings_.notePrefix(part, writtenName);
     }
 
-    // False when there is no such part or it breaks off.
+    // False when the part is missing, malformed or cut off.
     bool readRelationships(const std::string& part, const std::string& folder) {
         PartReader reader(package_, part);
-        bool prefixed = folder.empty();  // the import does not read the package's own
+        bool prefixed =
+            folder.empty();  // the import does not read the relationships of the package itself
         while (reader.nextElement()) {
             if (reader.isPrefixed() && reader.element().starts_with("Relationship") && !prefixed) {
                 notePrefix(part, reader.writtenName(), prefixed);
@@ -191,10 +192,11 @@ class Inspector {
             {reader.attribute("name").value_or(""), part, state != "visible", worksheets_.size()});
     }
 
-    // Charts and dialogs have other relationships, and an import leaves them out by intent.
+    // Notes a worksheet without a part. Charts and dialogs are not noted: they have other
+    // relationships, and an import leaves them out on purpose.
     void noteLost(const PartReader& reader, const std::string& id) {
         const bool known = id.empty() || otherSheets_.count(id) != 0 || isFull();
-        if (known || !findings_.broken.empty()) return;  // a broken part explains more
+        if (known || !findings_.broken.empty()) return;  // a damaged part is the better explanation
         findings_.lostWorksheets.add(reader.attribute("name").value_or(""));
     }
 
@@ -216,7 +218,7 @@ class Inspector {
         for (int i = 0; i < 2 && reader.nextElement(); ++i) takeTable(reader, part);
     }
 
-    // A table without entries has nothing to lose.
+    // Whether the table has a count matters only when the table has entries.
     void takeTable(const PartReader& reader, const std::string& part) {
         if (reader.element() == "sst") counted_ = reader.attribute("uniqueCount").has_value();
         if (reader.element() != "si") return;
@@ -224,7 +226,7 @@ class Inspector {
         if (reader.isPrefixed()) notePrefix(part, reader.writtenName(), findings_.stringsPrefixed);
     }
 
-    // Notes which texts have a phonetic one beside them, and which CDATA sections.
+    // Notes which shared texts have phonetic readings, and which have CDATA sections.
     void readStrings() {
         const std::string part = located(kStrings, "sharedStrings");
         if (part.empty()) return;
@@ -246,7 +248,7 @@ class Inspector {
         if (reader.isBroken()) findings_.broken.push_back(part);
     }
 
-    // Whether another trait says that all shared texts are missing.
+    // Whether another trait already says that all shared texts are missing.
     bool tellsOfTexts() const {
         const auto isTable = [](const MovedPart& part) { return part.wanted == kStrings; };
         const auto& moved = findings_.moved;
@@ -254,7 +256,8 @@ class Inspector {
                std::any_of(moved.begin(), moved.end(), isTable);
     }
 
-    // Traits of the book that no cell bears out. Cells of a worksheet with a prefix are not known.
+    // Drops traits of the book that no cell shows. Nothing is dropped when some cells could not be
+    // inspected, as in a worksheet with a prefix.
     void dropTheUnused() {
         if (findings_.prefixedWorksheets.count > 0 || !findings_.broken.empty()) return;
         if (findings_.sharedTexts == 0) findings_.stringsWithoutCount = false;
@@ -273,7 +276,7 @@ class Inspector {
     std::set<std::string> otherSheets_;                  // relationship ids
     std::vector<WorksheetPart> worksheets_;
     NumberFormats formats_;
-    bool counted_ = true;  // the table of shared texts
+    bool counted_ = true;  // whether the table of shared texts has its count
     SharedTexts texts_;
 };
 

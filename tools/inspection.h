@@ -8,15 +8,15 @@
 
 namespace dp::tool {
 
-// Looks into the file by itself, without the import library. Everything is read as a stream.
-// `imported` is what an import made of it, empty when there was none. Throws a Failure when the
-// file cannot be read, and Interrupted.
+// Inspects the file without the import library, reading its parts as streams. `imported` is what an
+// import made of it; empty without an import. Throws a Failure when the file cannot be read, and
+// Interrupted after an interrupt.
 Findings inspect(const std::string& book, const Imported& imported);
 
-// Looks only for what damages an import most: prefixes, a table of texts without its count, ISO
-// dates, the date system of 1904, and files that are no workbook. Worksheets are read in `folder`,
-// where the library has unpacked the open package, which spares unpacking them again; without a
-// folder they are not looked at, nor are those that are left out.
+// Looks only for the traits that do most harm to an import: prefixes, a table of texts without its
+// count, ISO dates, the 1904 date system, and files that are not workbooks. Worksheets are read
+// from `folder`, into which the library has unpacked the open package, to save unpacking them
+// again. Without a folder no worksheet is inspected; those in `leftOut` never are.
 Findings inspectQuickly(const std::string& book, const std::string& folder,
                         const std::set<std::string>& leftOut);
 

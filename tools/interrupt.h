@@ -2,13 +2,14 @@
 
 namespace dp::tool {
 
-// The user asked the program to stop.
+// Thrown when the user has asked the program to stop.
 struct Interrupted {
     int signal;
 };
 
-// From here on an interrupt only takes note of itself, so that the temporary directory can be
-// removed first; a second one ends the program at once. Writing to a closed pipe is no signal.
+// From now on an interrupt is only recorded, so that the temporary directory can be removed before
+// the program ends; a second interrupt ends it at once. Writing to a closed pipe fails instead of
+// raising a signal.
 void noteInterrupts();
 
 // Throws Interrupted after an interrupt.

@@ -19,7 +19,7 @@ using Json = nlohmann::ordered_json;
 
 std::string dumped(const Json& json) { return json.dump(); }
 
-// The text of the object without its closing brace: more members follow.
+// The text of the object without its closing brace, for more members to follow.
 std::string opened(const Json& object) {
     std::string text = dumped(object);
     text.pop_back();

@@ -7,13 +7,13 @@
 
 namespace dp::tool {
 
-// The import library. Once loaded it stays until the program ends: what it threw may still be
-// alive, and the libraries beneath it keep tables that unloading would lose.
+// The import library. It stays loaded until the program ends: exceptions that it threw may still be
+// alive, and unloading would lose the tables that the libraries below it keep.
 class Library {
   public:
-    // Loads the library at `path`. With an empty path: the one that the environment variable
-    // DPXLSX_LIBRARY names, else the one in the folder lib next to the program's own, else the one
-    // that the loader finds. Throws a Failure when none can be loaded.
+    // Loads the library at `path`. If that is empty: the one that the environment variable
+    // DPXLSX_LIBRARY names, else the one in the folder lib beside the program's folder, else the
+    // one that the loader finds. Throws a Failure when none can be loaded.
     explicit Library(const std::string& path);
 
     // The library's own name for the type of the file, empty when it is not one of its files.

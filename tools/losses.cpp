@@ -15,7 +15,8 @@ namespace {
 
 constexpr size_t kColumnsInNotes = 3;  // --explain names all
 
-// Rows that are missing although the column of texts has content there other than the mark.
+// The number of rows that are missing although the same column loaded as texts has content there
+// other than the mark.
 size_t lostRows(const Column& column, const Column& texts, const std::string& mark) {
     size_t count = 0;
     for (size_t row = 0; row < column.rows(); ++row) {
@@ -24,7 +25,8 @@ size_t lostRows(const Column& column, const Column& texts, const std::string& ma
     return count;
 }
 
-// With a text that marks missing numbers: the library counts its cells, whatever they become.
+// Lost cells when a text marks missing numbers: the library's count includes the cells with that
+// text.
 size_t lostBesideWord(IDataProvider& provider, const Column& column, const Options& options) {
     IColumn* found = nullptr;
     auto type = IVariableFormat::FormatType::Numeric;
@@ -32,15 +34,17 @@ size_t lostBesideWord(IDataProvider& provider, const Column& column, const Optio
                                              IVariable::StorageType::Text, &type, true);
     if (found == nullptr) return 0;
     const Column texts(found, kDefaultMissing, options.settings.preview);
-    // An option of the column may force its kind: then the library's count has to do.
+    // When an option forces the kind of the column, only the library's count is available.
     return texts.kind() == Kind::Text ? lostRows(column, texts, options.settings.missingWord->first)
                                       : static_cast<size_t>(column.convertedMissing());
 }
 
-// With numbers that the user wants to be missing: the library counts their cells too.
+// Lost cells when a number marks missing ones: the library's count includes the cells with that
+// number.
 size_t lostBesideNumbers(IDataProvider& provider, const Column& column, const Options& options) {
     const ReadSettings& settings = options.settings;
-    if (settings.missingNumber && !settings.missingNumber->first) return 0;  // none is missing then
+    if (settings.missingNumber && !settings.missingNumber->first)
+        return 0;  // no number is declared missing then
     ReadSettings plain;
     plain.missing = settings.missing;
     if (settings.missingNumber) plain.missingNumber.emplace(std::nullopt, std::nullopt);
@@ -54,7 +58,7 @@ size_t lostBesideNumbers(IDataProvider& provider, const Column& column, const Op
     return static_cast<size_t>(unmarked.convertedMissing());
 }
 
-// The number that a displayed text means; none for a date or another text.
+// The number that a displayed text shows; none for dates and other texts.
 std::optional<double> readBack(std::string text, char decimal) {
     std::replace(text.begin(), text.end(), decimal, '.');
     const bool negative = text.size() > 2 && text.front() == '(' && text.back() == ')';
@@ -80,7 +84,7 @@ std::string trimmed(const std::string& text) {
                                       : text.substr(first, text.find_last_not_of(' ') - first + 1);
 }
 
-// With the limit of texts put off while it is loaded.
+// The column loaded again with another limit of text length.
 std::optional<Column> uncut(IDataProvider& provider, const Column& column, const Options& options,
                             int limit) {
     provider.SetMaximumTextLength(kNoLimit);
@@ -91,7 +95,7 @@ std::optional<Column> uncut(IDataProvider& provider, const Column& column, const
     return Column(found, kDefaultMissing, options.settings.preview);
 }
 
-// The library cuts before it trims a name, which can take a space off its end.
+// The library trims a name after cutting it, so a cut name can be one byte shorter than the limit.
 bool mayBeCut(const Column& column, size_t limit) {
     return column.longestText() >= limit || column.name().size() + 1 >= limit;
 }
@@ -139,7 +143,7 @@ void Losses::noteShown(IDataProvider& provider, const std::string& place, const 
                                              IVariable::StorageType::Numeric, &type, true);
     if (found == nullptr) return;
     const Column numbers(found, kDefaultMissing, options_.settings.preview);
-    if (numbers.kind() == Kind::Text) return;  // the user wants texts
+    if (numbers.kind() == Kind::Text) return;  // an option makes it a column of texts
     const char decimal = options_.settings.decimal.value_or('.');
     const double missing = options_.settings.missing.value_or(kDefaultMissing);
     size_t count = 0;

@@ -15,19 +15,19 @@ class Losses {
   public:
     explicit Losses(const Options& options) : options_(options) {}
 
-    // Counts in a loaded column. Where the library's own counts leave a doubt (the user's marks of
-    // missing values, texts of just the longest length) the column is loaded once more; otherwise
-    // that would only take time.
-    // `place` is the worksheet and the column's letters, such as "Data!B".
+    // Counts the losses of a loaded column. Loads the column once more only where the library's own
+    // counts are not sufficient (with marks of missing values that the user declared, and with
+    // texts of exactly the maximum length), because that takes time. `place` is the worksheet and
+    // the column's letters, such as "Data!B".
     void note(IDataProvider& provider, const std::string& place, const Column& column);
 
-    // Counts numbers and dates that a loaded column of texts has as displayed, where that leaves
-    // some of them out. The column is loaded once more.
+    // Counts the numbers and dates in a loaded column of texts whose displayed form does not show
+    // the whole value. Loads the column once more.
     void noteShown(IDataProvider& provider, const std::string& place, const Column& column);
 
     const Lost& lost() const { return lost_; }
-    // One line about the cells: how many, where, and which options keep them; empty when there are
-    // none. Another one about the texts.
+    // One line about lost cells, another about cut texts: how many, where, and which options keep
+    // them; empty when there are none.
     std::string cellsNote() const;
     std::string textsNote() const;
 

@@ -43,7 +43,7 @@ void show(Workbook& workbook, const Options& options) {
     output.finish();
 }
 
-// What the user would not notice in the output.
+// Prints what the user would not notice in the output.
 void printNotes(const Workbook& workbook, const Options& options) {
     const std::string note = importNote(options.book, workbook.folder(), workbook.leftOut());
     if (!note.empty()) printLine(note);
@@ -67,7 +67,7 @@ void explainBook(const Library& library, const Options& options) {
     output.finish();
 }
 
-// What the library throws becomes a failure that says what to do.
+// Turns exceptions of the library into failures that say what to do.
 void carryOut(const Options& options) {
     refuseToOverwrite(options);
     const Library library(options.library);

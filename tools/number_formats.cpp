@@ -9,7 +9,7 @@ namespace dp::tool {
 
 namespace {
 
-// What spreadsheet programs write at most; more only fills the memory.
+// The most that spreadsheet programs write; a hostile book must not fill the memory.
 constexpr size_t kMostStyles = 65536;
 constexpr size_t kLongestCode = 255;
 
@@ -17,15 +17,16 @@ char lower(char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + '
 
 bool isOneOf(char c, std::string_view letters) { return letters.find(c) != letters.npos; }
 
-// "[h]", "[mm]" and the like count hours, minutes or seconds; all else in brackets is a colour, a
-// condition or a locale.
+// Whether it is "[h]", "[mm]" or the like, an elapsed time. Everything else in brackets is a
+// colour, a condition or a locale.
 bool countsTime(std::string_view inBrackets) {
     const auto sameLetter = [&](char c) { return lower(c) == lower(inBrackets.front()); };
     return !inBrackets.empty() && isOneOf(lower(inBrackets.front()), "hms") &&
            std::all_of(inBrackets.begin(), inBrackets.end(), sameLetter);
 }
 
-// Dates have built-in codes, which a package does not write. Those of East Asia have no single one.
+// The built-in date formats, whose codes are not written in packages. The East Asian ones have a
+// different code in each language.
 constexpr std::pair<int, const char*> kBuiltInDates[] = {
     {14, "m/d/yyyy"},      {15, "d-mmm-yy"},      {16, "d-mmm"},     {17, "mmm-yy"},
     {18, "h:mm AM/PM"},    {19, "h:mm:ss AM/PM"}, {20, "h:mm"},      {21, "h:mm:ss"},

@@ -18,13 +18,13 @@ class NumberFormats {
 
     // How many cell styles there are.
     size_t size() const { return formatIds_.size(); }
-    // The format of a cell style, 0-based and below size().
+    // The format of the cell style with this 0-based index, which is below size().
     UsedFormat of(int style) const;
 
   private:
     struct Code {
         std::string text;
-        bool isUncounted = true;  // beyond the declared number of codes
+        bool isUncounted = true;  // after as many codes as the style sheet declares
     };
 
     void takeCode(const PartReader& reader);

@@ -15,7 +15,7 @@ constexpr unsigned kMost = 2147483647;
     wrongUsage(given.option + ": \"" + given.value + "\" is not " + expected);
 }
 
-// The number that is the whole text.
+// The number, if the whole text is one.
 template <class T>
 std::optional<T> parsed(std::string_view text) {
     T number = 0;

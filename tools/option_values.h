@@ -5,7 +5,7 @@
 
 #include "tools/options.h"
 
-// Values of options as the user writes them. A wrong one throws a Failure that names the option.
+// Values of options as the user writes them. A wrong value throws a Failure that names the option.
 namespace dp::tool {
 
 // An option of the command line with the value that it was given, empty for none.
@@ -17,7 +17,7 @@ struct Given {
 constexpr const char* kOneView =
     "choose one of --list, --csv, --json and --explain, or --explain with --json";
 
-// Throws the Failure of a command line that is wrong.
+// Throws a Failure for wrong usage.
 [[noreturn]] void wrongUsage(const std::string& text);
 
 std::string textValue(const Given& given);
@@ -37,7 +37,7 @@ std::pair<NumberOrMissing, NumberOrMissing> numberForNumber(const Given& given);
 std::pair<std::string, NumberOrMissing> numberForText(const Given& given);
 std::pair<std::string, std::string> textForText(const Given& given);
 
-// A column, alone or with what it gets.
+// A column, alone or with a value for it.
 ColumnReference columnValue(const Given& given);
 ColumnAssignment columnText(const Given& given);
 std::pair<ColumnReference, IVariable::BasicDataType> columnType(const Given& given);

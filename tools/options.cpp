@@ -84,7 +84,8 @@ void check(const Options& options) {
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\n')); }
 
-// The parser's words begin with the option, and tell of a number when there are too many values.
+// Rewords a message of the parser. It begins with the option, and says "received" when there are
+// too many values.
 std::string mismatchText(const std::string& words) {
     const bool flag = words.find("override") != std::string::npos;
     if (flag) return "--" + words.substr(0, words.find(' ')) + ": it takes no value";

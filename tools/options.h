@@ -12,13 +12,14 @@ namespace dp::tool {
 
 enum class View { Tables, Names, Csv, Json };
 
-// A number as the user writes it; none is the word "missing".
+// A number as the user writes it; no value stands for the word "missing".
 using NumberOrMissing = std::optional<double>;
 
-// Instead of a longest text.
+// In place of a limit of text length.
 constexpr int kNoLimit = -1;
 
-// What the host hands over to the provider. Whatever is not set stays at the library's default.
+// Settings that the host passes to the provider. Those that are not set keep the library's
+// defaults.
 struct ReadSettings {
     std::optional<EVariableNameRowSetting> names;
     unsigned nameRow = 0;   // 1-based, 0 for not given

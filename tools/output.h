@@ -5,7 +5,8 @@
 
 namespace dp::tool {
 
-// The reader of our standard output has gone away, as `head` does: nobody waits for the rest.
+// Thrown when the program that reads standard output has ended, as `head` does: the rest of the
+// output is not needed.
 struct ClosedPipe {};
 
 // A file that is written, or standard output. Every write is checked: a failing one throws a
@@ -19,7 +20,8 @@ class Output {
     Output& operator=(const Output&) = delete;
 
     void write(std::string_view text);
-    // Writes what is still buffered. Without it the end of the output is lost, unreported.
+    // Writes what is still buffered. To be called at the end: otherwise the rest of the output is
+    // lost without an error.
     void finish();
 
   private:

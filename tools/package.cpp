@@ -4,8 +4,8 @@ namespace dp::tool {
 
 namespace {
 
-// A workbook has some dozens of entries. Beyond this an archive is none, and listing it would only
-// fill the memory.
+// A workbook has some dozens of entries. Larger archives are not listed, which would only fill the
+// memory.
 constexpr size_t kMostEntries = 100000;
 
 std::string folded(const std::string& name) {

@@ -7,8 +7,8 @@
 
 namespace dp::tool {
 
-// The entries of a ZIP archive, read one at a time; nothing is unpacked to disk. Names are as the
-// archive has them, cut to 255 bytes; of several entries with one name the last counts.
+// The entries of a ZIP archive, read one at a time; nothing is unpacked to disk. Names are cut to
+// 255 bytes; of several entries with one name the last counts.
 class Package {
   public:
     explicit Package(const std::string& path);
@@ -19,7 +19,7 @@ class Package {
     // Whether the file is a ZIP archive at all. A package that is not open has no entries.
     bool isOpen() const { return archive_ != nullptr; }
     bool has(const std::string& name) const { return entries_.count(name) != 0; }
-    // The entry that is called so when letter case and the direction of slashes do not count;
+    // The name of an entry that equals `name` but for letter case and the direction of slashes;
     // empty when there is none.
     std::string similarTo(const std::string& name) const;
 

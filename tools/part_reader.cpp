@@ -26,7 +26,7 @@ std::string_view view(const xmlChar* text) {
     return text == nullptr ? std::string_view() : reinterpret_cast<const char*>(text);
 }
 
-// Takes the text over.
+// Takes ownership of the text.
 std::optional<std::string> taken(xmlChar* text) {
     if (text == nullptr) return std::nullopt;
     const std::unique_ptr<xmlChar, decltype(xmlFree)> owned(text, xmlFree);
@@ -56,9 +56,9 @@ int PartReader::supply(void* self, char* buffer, int size) {
     return reader.holdsTooMuch() ? -1 : count;
 }
 
-// libxml2 uses texts as they come, but keeps markup until it is complete. Lists of cell ranges make
-// long tags; only hostile ones have thousands of attributes, which libxml2 compares with each
-// other, or of hyphens in a comment.
+// libxml2 processes text as it arrives, but keeps markup until it is complete. Tags may be long
+// because of lists of cell ranges; but only hostile markup has thousands of attributes, which
+// libxml2 compares with each other, or of hyphens in a comment.
 bool PartReader::holdsTooMuch() {
     constexpr long kLongMarkup = 16 << 10;      // bytes
     constexpr long kLongestMarkup = 256 << 10;  // bytes

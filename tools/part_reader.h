@@ -10,18 +10,18 @@
 
 namespace dp::tool {
 
-// Walks the elements of an XML part of a spreadsheet package, forward and in little memory: a part
-// with a document type or with markup that only a hostile one has counts as broken there.
-// Elements go by their local names within the namespaces of spreadsheets, whatever their prefix,
-// and by their names alone when they have no prefix.
+// Walks the elements of an XML part of a spreadsheet package, forward and in little memory. A
+// document type, or markup that only hostile parts have, counts as damage. Elements are identified
+// by their local names: those with a prefix only if they belong to the namespaces of spreadsheets,
+// those without a prefix in any namespace.
 class PartReader {
   public:
     PartReader(Package& package, const std::string& name);
 
-    // Moves to the next node that is the beginning of an element, or a text. False at the end of
-    // the part and where it breaks off. Throws Interrupted after an interrupt.
+    // Moves to the next start of an element or text node. False at the end of the part and at
+    // damage. Throws Interrupted after an interrupt.
     bool next();
-    // Skips texts.
+    // Like next(), but skips texts.
     bool nextElement();
 
     // White space between elements is a text too.
@@ -33,8 +33,8 @@ class PartReader {
 
     // The element's local name; empty for an element of a foreign namespace.
     std::string_view element() const;
-    // Whether the element's name has a prefix: an import that goes by the names as they are written
-    // does not know it.
+    // Whether the element's name has a prefix: the import library compares whole names and does not
+    // recognise such an element.
     bool isPrefixed() const;
     // As written, prefix included.
     std::string writtenName() const;
@@ -59,9 +59,9 @@ class PartReader {
     bool holdsTooMuch();
     bool hasDeclarations() const;
 
-    Entry entry_;        // outlives the reader, which draws from it
+    Entry entry_;        // read by the XML reader, so it must outlive that
     long supplied_ = 0;  // bytes
-    long marks_ = 0;     // equal signs and hyphens in long markup that waits to be complete
+    long marks_ = 0;     // equal signs and hyphens in long markup that is not complete yet
     std::unique_ptr<xmlTextReader, Free> reader_;
     bool broken_ = false;
 };

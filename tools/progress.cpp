@@ -39,7 +39,7 @@ void Progress::erase() {
 
 void Progress::show(const std::string& text) {
     if (!terminal_) return;
-    // A line that wraps could not be erased.
+    // A line that wraps cannot be erased.
     const int width = terminalWidth(STDERR_FILENO).value_or(80) - 1;
     std::fprintf(stderr, "\r\033[K%s", cutToWidth(printable(text), width).c_str());
     shown_ = true;

@@ -5,8 +5,8 @@
 
 namespace dp::tool {
 
-// One line on standard error that says how far long work is. It shows only on a terminal and is
-// erased when the work is done.
+// A progress line on standard error. It appears only on a terminal and is erased when the work is
+// done.
 class Progress {
   public:
     Progress();
@@ -15,7 +15,7 @@ class Progress {
     Progress& operator=(const Progress&) = delete;
 
     void opening(const std::string& book);
-    // `number` is 1-based. At most ten times a second anything is printed.
+    // `number` is 1-based. Prints at most ten times a second.
     void column(const std::string& worksheet, size_t number, size_t count);
     void erase();
 

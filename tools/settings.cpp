@@ -67,7 +67,7 @@ std::set<int> keysOf(const std::vector<SheetEntry>& sheets, const std::vector<st
     return keys;
 }
 
-// Whether a host would find a variable name in any column of the worksheet.
+// Whether any column of the worksheet has a variable name.
 bool hasNames(IDataProvider& provider, int sheet) {
     IVariableFinder& finder = *provider.GetVariableFinder();
     const IReadOnlyCollection<int>& keys = *finder.GetColumnPrimeKeys(sheet);
@@ -80,7 +80,8 @@ bool hasNames(IDataProvider& provider, int sheet) {
     return false;
 }
 
-// The row that the library takes the names from. What it inferred it does not tell: the names do.
+// The row from which the library takes the names. The library does not say what it inferred, but
+// columns have names only if it found a row of them.
 unsigned nameRowOf(IDataProvider& provider, const ReadSettings& settings, int sheet) {
     switch (settings.names.value_or(VNR_GIVEN)) {
         case VNR_NONE:
@@ -103,7 +104,8 @@ void applyRows(IDataProvider& provider, const ReadSettings& settings, int sheet)
     if (settings.rows) provider.SetReadOptionDataRowCount(key, *settings.rows);
 }
 
-// The columns of a worksheet, by key, as long as no option gives them another position.
+// The numbers of a worksheet's columns, by key. To be called before any option gives columns other
+// positions.
 std::map<int, unsigned> columnsOf(IDataProvider& provider, int sheet) {
     std::map<int, unsigned> numbers;
     const IVariableFinder& finder = *provider.GetVariableFinder();
@@ -166,8 +168,8 @@ class ColumnOptions {
         provider_.SetPreviewing(settings_.preview);
     }
 
-    // Calls `act` for each worksheet that the reference means and that has the column. A worksheet
-    // that is left out has none.
+    // Calls `act` for each worksheet that the reference names and that has the column. Worksheets
+    // that are left out do not count.
     template <class Act>
     void forEach(const char* option, const ColumnReference& column, Act act) {
         const bool every = column.worksheet.empty();
@@ -197,7 +199,7 @@ class ColumnOptions {
     std::map<int, std::set<unsigned>> numbers_;  // of the columns, by worksheet key
 };
 
-// The titles of those that are excluded.
+// Excludes worksheets by the options, and returns their titles.
 std::set<std::string> excludeSheets(IDataProvider& provider, const Options& options,
                                     const std::vector<SheetEntry>& sheets) {
     std::set<std::string> titles;
@@ -267,7 +269,7 @@ ReadPlan applyReadOptions(IDataProvider& provider, const Options& options) {
         plan.nameRows[sheet.key] = nameRowOf(provider, options.settings, sheet.key);
     }
     ColumnOptions(provider, sheets, options.settings, plan).apply();
-    // Blank rows are found once, among the columns that are not excluded by then.
+    // Last, because blank rows are determined once, from the columns that are not excluded by then.
     provider.SetReadOptionPadColumnsWithMissingValues(options.settings.pad);
     provider.SetReadOptionIgnoreBlankRows(options.settings.skipBlankRows);
     return plan;

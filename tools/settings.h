@@ -11,12 +11,12 @@
 
 namespace dp::tool {
 
-// The library's own mark of a missing number, until a host sets another one.
+// The library's default for the number that marks a missing value.
 constexpr double kDefaultMissing = 1.23456e30;
-// The library's own limit of numbers on both sides.
+// The library's default range of numbers is from minus this to plus this.
 constexpr double kDefaultRange = 1.001e18;
 
-// The library's own limit of texts and names, in bytes.
+// The library's default limit of texts and names, in bytes.
 constexpr int kDefaultLongestText = 80;
 
 struct SheetEntry {
@@ -24,7 +24,7 @@ struct SheetEntry {
     std::string title;
 };
 
-// A worksheet that the user named is none of those with cells. The text says which there are.
+// Thrown when the user named a worksheet that is not among those with values. The text lists these.
 class UnknownWorksheet : public Failure {
   public:
     UnknownWorksheet(std::string name, const std::string& text)
@@ -42,24 +42,24 @@ std::string worksheetsText(const std::vector<SheetEntry>& sheets);
 // The worksheets that are not excluded, in workbook order.
 std::vector<SheetEntry> listSheets(IDataProvider& provider);
 
-// Settings that must stand when the workbook is opened.
+// Makes the settings that must be in place when the workbook is opened.
 void applySettings(IDataProvider& provider, const ReadSettings& settings);
 
-// Those of them that turn numbers into missing ones: the range and the number that marks one. What
-// is not set stays as it is.
+// Makes only those settings that turn numbers into missing ones: the range and the number that
+// marks a missing one. Settings that the user did not give are not changed.
 void applyNumbers(IDataProvider& provider, const ReadSettings& settings);
 
-// What the options of worksheets and columns turned out to mean in the open workbook.
+// What the options of worksheets and columns mean in the open workbook.
 struct ReadPlan {
     std::map<int, unsigned> nameRows;  // by worksheet key: 1-based, 0 for none
-    // By column key, where options of columns are given: the 1-based number in the worksheet. An
-    // option may give the column another position at the host.
+    // The 1-based number of a column in its worksheet, by column key; filled only when there are
+    // options of columns. The position at the host may differ, by an option.
     std::map<int, unsigned> columnNumbers;
     std::set<std::string> leftOut;   // titles of worksheets
-    std::vector<std::string> notes;  // options that do nothing
+    std::vector<std::string> notes;  // messages about options without effect
 };
 
-// Hands over the options that name worksheets and columns of the open workbook. Throws
+// Passes the options that name worksheets and columns of the open workbook to the provider. Throws
 // UnknownWorksheet when there is no such worksheet, a Failure when it has no such column.
 ReadPlan applyReadOptions(IDataProvider& provider, const Options& options);
 

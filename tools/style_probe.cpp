@@ -46,7 +46,7 @@ class TemporaryFolder {
     TemporaryFolder(const TemporaryFolder&) = delete;
     TemporaryFolder& operator=(const TemporaryFolder&) = delete;
 
-    // Empty when it could not be made.
+    // Empty when the directory could not be made.
     const std::string& path() const { return path_; }
 
   private:
@@ -148,7 +148,7 @@ std::vector<StyleAnswer> importProbe(const Library& library, const std::string& 
             answers = readAnswers(*provider);
         }
     } catch (...) {
-        answers.clear();  // a style sheet that cannot be read fails the import of the book as well
+        answers.clear();  // the import of the book itself fails on such a style sheet too
     }
     provider->CloseFile();
     return answers;

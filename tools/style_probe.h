@@ -8,16 +8,16 @@
 
 namespace dp::tool {
 
-// What the library makes of numbers of a cell style.
+// How the library treats the numbers of a cell style.
 struct StyleAnswer {
     bool isDate;
-    bool hasPattern;  // a date that keeps the look of its code
+    bool hasPattern;  // a date that is displayed as its format code says
 };
 
-// Asks the library itself what it makes of each cell style in `formats`: a package with the style
-// sheet of `book` and one cell of each style is made in the temporary directory and imported. That
-// holds for whatever the library decides, and for style sheets that it reads otherwise than meant;
-// a copy of its rules would only hold until they change. Empty when there is no such answer.
+// Determines how the library treats each cell style in `formats` by importing a package that is
+// made in the temporary directory, with the style sheet of `book` and one cell of each style.
+// Unlike a copy of the library's rules, this cannot become outdated, and it covers style sheets
+// that the library misreads. Empty when the probe cannot be imported.
 std::map<int, StyleAnswer> askForStyles(const Library& library, const std::string& book,
                                         const std::map<int, UsedFormat>& formats);
 

@@ -8,7 +8,7 @@ namespace dp::tool {
 
 namespace {
 
-constexpr int kWidestText = 40;  // cells; the whole of it is in CSV and JSON
+constexpr int kWidestText = 40;  // cells; CSV and JSON have the whole text
 constexpr const char* kGap = "  ";
 
 std::string withoutTrailingSpaces(const std::string& text) {

@@ -18,7 +18,8 @@ class Table {
 
     explicit Table(std::vector<Heading> headings);
 
-    // As many texts as there are headings; long ones are cut, all are made printable.
+    // Adds a row of as many texts as there are headings. Control characters are replaced, and long
+    // texts are cut.
     void addRow(const std::vector<std::string>& texts);
     // Lines longer than `width` cells are cut.
     void print(Output& output, std::optional<int> width) const;

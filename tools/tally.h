@@ -15,14 +15,14 @@ class Tally {
         size_t count;
     };
 
-    // One column after the other.
+    // Adds the cells of one column.
     void add(Entry entry);
     bool empty() const { return entries_.empty(); }
     size_t total() const { return total_; }
     size_t columns() const { return entries_.size(); }
 
-    // "11 in Data!J (City), 1 in Data!L (Count) and 3 in 2 more columns", of which `most` are
-    // named.
+    // Such as "11 in Data!J (City), 1 in Data!L (Count) and 3 in 2 more columns"; names at most
+    // `most` columns.
     std::string text(size_t most) const;
     // "--type Data!J=text --type Data!L=text" for the same columns.
     std::string textTypes(size_t most) const;
@@ -34,10 +34,10 @@ class Tally {
 
 // What an import lost of the columns that it loaded.
 struct Lost {
-    Tally cells;         // had content that did not fit the kind of their column: missing values
-    Tally cutTexts;      // texts and names of columns beyond the limit of --max-text
+    Tally cells;     // cells that became missing because they did not fit the kind of their column
+    Tally cutTexts;  // texts and names of columns beyond the limit of --max-text
     size_t longest = 0;  // of those, in bytes
-    Tally shown;         // numbers and dates in columns of texts, of which the display shows less
+    Tally shown;  // numbers and dates in columns of texts, whose displayed form shows only a part
 };
 
 }  // namespace dp::tool

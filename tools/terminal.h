@@ -4,8 +4,8 @@
 
 namespace dp::tool {
 
-// Cells in a line: what the environment variable COLUMNS says, else what the terminal at
-// `descriptor` has, else none (a file or a pipe takes lines of any length).
+// The width of a line in cells: that of the environment variable COLUMNS, else that of the terminal
+// at `descriptor`, else none, because a file or a pipe takes lines of any length.
 std::optional<int> terminalWidth(int descriptor);
 
 }  // namespace dp::tool

@@ -19,7 +19,7 @@ bool turnsDirection(UChar32 c) {
 }
 
 UChar32 visible(UChar32 c) {
-    if (c < 0x20) return 0x2400 + c;  // the sign that pictures the control character
+    if (c < 0x20) return 0x2400 + c;  // the symbol for the control character
     if (c == 0x7F) return 0x2421;
     const int8_t category = u_charType(c);
     const bool breaks = category == U_CONTROL_CHAR || category == U_LINE_SEPARATOR ||
@@ -53,7 +53,7 @@ int displayWidth(const icu::UnicodeString& text) {
     return width;
 }
 
-// The longest beginning that takes at most `width` cells, combining marks at its end included.
+// The longest prefix that takes at most `width` cells, with the combining marks that follow it.
 icu::UnicodeString beginning(const icu::UnicodeString& text, int width) {
     int used = 0;
     int32_t at = 0;

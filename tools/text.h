@@ -6,11 +6,11 @@
 // Texts as a terminal shows them.
 namespace dp::tool {
 
-// The text as valid UTF-8: bytes that are none become U+FFFD.
+// The text as valid UTF-8: invalid bytes become U+FFFD.
 std::string validUtf8(std::string_view text);
 
-// The text on one line, safe for a terminal: control characters become visible signs, and marks
-// that turn the direction of what follows become U+FFFD.
+// The text on one line, safe for a terminal: control characters become visible symbols, and
+// characters that change the writing direction become U+FFFD.
 std::string printable(std::string_view text);
 
 // Terminal cells that a printable text takes: 2 for wide characters, 0 for combining ones.

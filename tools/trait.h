@@ -8,14 +8,14 @@
 
 namespace dp::tool {
 
-// A trait of a file that an import reads otherwise than a spreadsheet program shows it.
+// A property of a file because of which an import differs from what a spreadsheet program shows.
 struct Trait {
     std::string key;        // for programs, such as "iso-dates"
     std::string found;      // what was found, and where
     std::string effect;     // what the import does with it
     std::string advice;     // what the user can do
     bool fatal = false;     // the import fails
-    std::string note = {};  // one of the worst: the effect in words that stand alone
+    std::string note = {};  // the effect as a phrase of its own; only for the worst traits
 };
 
 using Found = std::optional<Trait>;

@@ -10,7 +10,7 @@ namespace dp::tool {
 // The traits behind the findings, the most frequent in real workbooks first.
 std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers);
 
-// Those that a quick look finds.
+// The traits that inspectQuickly() finds.
 std::vector<Trait> quickTraitsOf(const Findings& findings);
 
 // The trait of a file whose import fails with this exit code for a reason that nothing else

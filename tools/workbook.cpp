@@ -12,7 +12,7 @@ namespace dp::tool {
 
 namespace {
 
-// The library says more about a file of another type when it is asked to open it.
+// For files of another type an .xlsx provider is made too: its OpenFile says what is wrong.
 std::string providerType(const Library& library, const std::string& book) {
     const std::string type = library.fileType(book);
     return type.empty() ? "xlsx" : type;
@@ -56,7 +56,8 @@ void Workbook::open() {
     progress_.erase();
 }
 
-// A worksheet without values is in the workbook, but no host gets to see it.
+// A worksheet without values is in the workbook, but is not imported: the message distinguishes the
+// two cases.
 void Workbook::refuse(const UnknownWorksheet& unknown) {
     provider_->CloseFile();
     const std::vector<std::string> names = worksheetNames();
@@ -106,14 +107,14 @@ void Workbook::loadColumns(LoadedWorksheet& worksheet) {
 }
 
 // The column's 1-based number in the worksheet, whatever position an option gave it at the host.
-// Without an option no column is left out, and the host's position is the number.
+// Without options of columns the position is this number.
 unsigned Workbook::numberOf(int key, const IColumn* column) const {
     const auto found = plan_.columnNumbers.find(key);
     if (found != plan_.columnNumbers.end()) return found->second;
     return column == nullptr ? 0 : static_cast<unsigned>(column->GetPosition());
 }
 
-// The library takes positions as they come.
+// Notes columns at one position; the library accepts that.
 void Workbook::notePositions(const LoadedWorksheet& worksheet) {
     std::map<unsigned, std::string> taken;  // columns, by position
     for (size_t i = 0; i < worksheet.columns.size(); ++i) {

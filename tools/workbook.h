@@ -58,8 +58,8 @@ class Workbook {
     const Losses& losses() const { return losses_; }
     // The titles of the worksheets that options leave out.
     const std::set<std::string>& leftOut() const { return plan_.leftOut; }
-    // What the user would not notice in the output, one line each: options that do nothing, and
-    // what was lost.
+    // What the user would not notice in the output, one line each: messages about options without
+    // effect, and what was lost.
     std::vector<std::string> notes() const;
     // Where the library has unpacked the open workbook.
     std::string folder() const { return provider_->GetTempDirectoryPath(); }

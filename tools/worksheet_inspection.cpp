@@ -19,8 +19,8 @@ namespace {
 
 bool isSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
 
-// Whether an import takes all of the text for a number. One that is none or infinite does not
-// arrive as another one.
+// Whether the whole text is a number to an import. NaN and infinity count as numbers here, because
+// they do not arrive as another number.
 bool isNumber(const std::string& text) {
     char* end = nullptr;
     const double value = std::strtod(text.c_str(), &end);
@@ -49,7 +49,8 @@ class Pass {
           findings_(findings) {}
 
     void run() {
-        while (!prefixed_ && reader_.next()) takeNode();  // an import finds no cells there
+        while (!prefixed_ && reader_.next())
+            takeNode();  // an import finds no cells in a worksheet with a prefix
         endCell();
         if (tables_.imported != nullptr && worksheet_.hidden) {
             findings_.hiddenWorksheets.add(worksheet_.name);
@@ -77,7 +78,7 @@ class Pass {
         }
     }
 
-    // Comments and CDATA sections divide a text, and an import takes the first piece of it.
+    // Comments and CDATA sections divide a text into pieces, of which an import takes the first.
     void takeText() {
         if (reader_.depth() != contentDepth_ + 1) return;
         if (++pieces_ == 1) return inValue_ ? countValue() : noteReference();
@@ -88,7 +89,7 @@ class Pass {
         inPhonetic_ = inPhonetic_ && reader_.depth() > phoneticDepth_;
         inValue_ = name == "v";
         const bool inText = name == "t" && type_ == "inlineStr" && isInline();
-        if (inText) textInPieces_ = false;  // of several texts the last one arrives
+        if (inText) textInPieces_ = false;  // of several texts an import takes the last one
         contentDepth_ = inValue_ || inText ? reader_.depth() : kNoContent;
         pieces_ = 0;
         if (name == "c") beginCell();
@@ -105,7 +106,7 @@ class Pass {
         notePrefix();
     }
 
-    // Texts of a cell are within its element.
+    // Whether the reader is within the inline text of the cell.
     bool isInline() const { return inlineDepth_ > 0 && reader_.depth() > inlineDepth_; }
 
     void noteMerged() {
@@ -131,7 +132,7 @@ class Pass {
         inlineDepth_ = 0;
     }
 
-    // A cell without a place follows the one before.
+    // A cell without a reference follows the one before it.
     void takeReference(const std::optional<std::string>& reference) {
         ++column_;
         isLowerCase_ = false;
@@ -148,15 +149,15 @@ class Pass {
 
     static bool isLower(char c) { return c >= 'a' && c <= 'z'; }
 
-    // An import takes all letters for upper-case ones, which lower-case ones are 32 characters
-    // behind.
+    // The column in which an import puts the cell: it takes all letters for upper-case ones, and
+    // lower-case letters have codes that are higher by 32.
     static unsigned columnOfImport(const std::string& letters) {
         unsigned column = 0;
         for (const char letter : letters) column = column * 26 + static_cast<unsigned>(letter - 64);
         return column;
     }
 
-    // Of a cell with content.
+    // Called for cells with content only.
     void noteReference() {
         if (!isLowerCase_ || !isRead()) return;
         const ImportedSheet* const sheet = tables_.imported;
@@ -212,7 +213,7 @@ class Pass {
         if (isNumber || type_ == "b") countStyle();
     }
 
-    // Types that an import does not know count as numbers, like Booleans.
+    // An import treats Booleans and types that it does not know as numbers.
     bool isTakenForNumber() const {
         constexpr std::string_view kOthers[] = {"s", "str", "inlineStr", "e", "d"};
         return std::find(std::begin(kOthers), std::end(kOthers), type_) == std::end(kOthers);
@@ -227,7 +228,8 @@ class Pass {
         findings_.notNumbers.add(place_);
     }
 
-    // Whether the cell is not above the data or in a column that is left out.
+    // Whether the import reads the cell: it is not above the data, nor in a column that is left
+    // out.
     bool isRead() const {
         const ImportedSheet* sheet = tables_.imported;
         if (sheet == nullptr) return true;
@@ -283,7 +285,7 @@ class Pass {
         if (cells != nullptr) cells->cells.add(place_);
     }
 
-    // Null when there are far too many kinds of them to tell apart.
+    // Null when there are already too many combinations of column and style.
     StyledCells* cellsOf(const StyledColumn& key) {
         constexpr size_t kMost = 200000;
         auto& all = findings_.styledCells;
@@ -319,7 +321,7 @@ class Pass {
     }
 
     static constexpr size_t kLongest = 32;  // bytes of what is quoted from a cell
-    static constexpr int kNoContent = -2;   // no depth, nor is the one below it
+    static constexpr int kNoContent = -2;   // neither this nor the value plus one is a depth
     static constexpr unsigned kWorksheetColumns = 16384;
 
     PartReader reader_;
@@ -353,11 +355,10 @@ class Pass {
 
 bool isQuote(char c) { return c == '"' || c == '\''; }
 
-// Whether the letter stands in quotes anywhere in the file, in an encoding of one or two bytes:
-// only then can a cell be of this type. This is over before a reader of XML has made its first
-// steps.
+// Whether the letter is in quotes anywhere in the file, in an encoding of one or two bytes a
+// character: only then can a cell have this type. This is far faster than reading the XML.
 bool mayHaveType(const std::string& path, char type) {
-    constexpr size_t kMargin = 4;  // characters that stand around the end of a block
+    constexpr size_t kMargin = 4;  // characters that may be split by the end of a block
     std::ifstream file(path, std::ios::binary);
     std::vector<char> block((1 << 18) + 2 * kMargin);
     size_t kept = 0;
