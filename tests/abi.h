@@ -23,8 +23,8 @@
 
 #include "tests/case_table.h"
 
-// What a host compiled elsewhere knows of an object: the order of its virtual operations and of its
-// fields, and the rules of the Itanium C++ ABI. Nothing here uses the library's own declarations.
+// An object as a separately compiled host knows it: by the order of its virtual operations and fields, and by the rules
+// of the Itanium C++ ABI. Nothing here uses the library's own declarations.
 namespace raw {
 
 inline std::vector<std::string> words(const std::string& text) {
@@ -32,7 +32,7 @@ inline std::vector<std::string> words(const std::string& text) {
     return {std::istream_iterator<std::string>(stream), {}};
 }
 
-// The slots and the fields of a class, from the table of the contract.
+// The slots and fields of a class, read from the table of the contract.
 struct Contract {
     std::vector<std::string> slots;
     std::vector<std::string> fields;  // "name:type"
@@ -58,7 +58,7 @@ Result call(const void* object, std::size_t slot, Arguments... arguments) {
     return reinterpret_cast<Function>(table[slot])(object, arguments...);
 }
 
-// The mangled names of the program's symbols by their place in it.
+// The mangled names of the program's symbols, by address.
 inline std::multimap<std::uintptr_t, std::string> programSymbols() {
     std::ifstream file("/proc/self/exe", std::ios::binary);
     const auto read = [&file](auto items, std::uint64_t offset) {
@@ -90,7 +90,7 @@ inline std::string operationName(const std::string& mangled) {
     return scope == text.npos ? text : text.substr(scope + 2);
 }
 
-// The operation that stands in a slot, by all its names: optimised, those of one body are one.
+// All names of the operation in a slot: the optimiser merges functions with equal bodies into one.
 inline std::vector<std::string> operationsIn(const void* object, std::size_t slot) {
     static const auto symbols = programSymbols();
     void* const operation = (*static_cast<void* const* const*>(object))[slot];
@@ -120,7 +120,8 @@ inline Type typeOf(const std::string& letter) {
     return {std::stoul(letter), 8};
 }
 
-// Where a field lies behind `start` bytes of table pointers, and its type; no type for no field.
+// The offset of a field, behind `start` bytes of table pointers, and its type, which is empty when there is no such
+// field.
 struct Field {
     std::string type;
     std::size_t offset = 0;
@@ -150,7 +151,7 @@ void poke(void* object, std::size_t offset, T value) {
     std::memcpy(static_cast<char*>(object) + offset, &value, sizeof value);
 }
 
-// Whatever is written into the field comes back from the operation.
+// Checks that the operation returns whatever is written into the field.
 template <class T>
 void expectEcho(void* object, std::size_t offset, const void* facet, std::size_t slot, T other) {
     const T before = peek<T>(object, offset);
@@ -159,7 +160,7 @@ void expectEcho(void* object, std::size_t offset, const void* facet, std::size_t
     poke(object, offset, before);
 }
 
-// The field that an operation answers, by their names; empty for an operation that computes.
+// The name of the field that an operation returns; empty for an operation that computes its result.
 inline std::string fieldBehind(const std::string& operation) {
     static const std::map<std::string, std::string> others = {
         {"IsFormatDirty", "formatDirty"},
@@ -174,7 +175,7 @@ inline std::string fieldBehind(const std::string& operation) {
         {"UseDefaultVariableBody", "useDefaultVariableBody"},
         {"GetOSVersion", "osVersion"},
         {"GetConstFormulaManager", "formulaManager"},
-        // These have arguments, or answer the characters of a string.
+        // These have arguments, or return the characters of a string.
         {"GetDecimalPlaces", ""},
         {"GetDateTimeParameters", ""},
         {"GetRows", ""},
@@ -189,8 +190,8 @@ inline std::string fieldBehind(const std::string& operation) {
     return field;
 }
 
-// Checks that every operation of the table at `facet` (the object itself or its second base) that
-// answers a field answers that one, or points to it when it is an object. Returns how many.
+// Checks every operation in the table at `facet` (the object itself or its second base) that is a getter: it must
+// return its field, or a pointer to it when the field is an object. Returns the number of getters.
 inline int expectGetters(void* object, const void* facet, const Contract& table, const Contract& layout,
                          std::size_t start = 8) {
     int checked = 0;

@@ -19,7 +19,7 @@ using namespace raw;
 
 constexpr std::size_t kTwoTables = 16;
 
-// A column answers through its own table and through that of IVariable.
+// Checks a column through its own table and through that of IVariable.
 void expectColumn(void* column, const Contract& contract, int getters) {
     void* variable = static_cast<char*>(column) + 8;
     const Contract asVariable = contractOf("IVariable");
@@ -34,7 +34,7 @@ void expectColumn(void* column, const Contract& contract, int getters) {
     call<void>(column, slotOf(contract, "Release"));  // deletes it
 }
 
-// What a fresh object holds, field by field: numbers, flags and texts, 0 for a null pointer.
+// The fields of a new object: numbers, flags and texts, 0 for a null pointer.
 std::string freshState(const void* object, const std::string& name, std::size_t start = 8) {
     const Contract contract = contractOf(name);
     std::ostringstream state;
@@ -75,7 +75,7 @@ TEST(HostContract, FreshObjects) {
     EXPECT_EQ(freshState(&column, "ColumnView"), "1 0 0 0 ");
 }
 
-// An object deletes itself with its last reference, and owns no reference at first.
+// Checks that an object starts without references and deletes itself with its last one.
 template <class Object>
 void expectCounted() {
     static int gone = 0;
@@ -98,7 +98,7 @@ TEST(HostContract, ReferencesAreCounted) {
     expectCounted<dp::Worksheet>();
 }
 
-// A format that says how it was asked.
+// A format that records how it was called.
 template <class Format>
 struct Told : Format {
     dp::IString* FormatValue(double, bool full) const override { return new dp::String(full ? "full 1.5" : "1.5"); }
@@ -209,7 +209,7 @@ TEST(HostContract, FormulaManager) {
     EXPECT_TRUE(gone) << "the manager owns its nodes";
 }
 
-// A node answers through its own table and through that of its kind, which lacks three operations.
+// Checks a node through its own table and through that of its kind, which lacks three operations.
 Contract expectNode(void* node, int type, const char* name, int getters) {
     const Contract own = contractOf(name);
     Contract kind = own;

@@ -9,7 +9,7 @@
 #include "tests/abi.h"
 #include "tests/provider_fixture.h"
 
-// The provider seen by a host compiled elsewhere: its table of operations, called raw.
+// The provider as a separately compiled host sees it: its operations are called by their slots.
 namespace {
 
 using namespace raw;
@@ -17,7 +17,7 @@ using Settings = dp::ExcelDataProviderBase;  // for the exported settings of the
 
 const Contract kProvider = contractOf("Provider");
 
-// A cell record as its users lay it out in memory.
+// The memory layout of a cell record as hosts and readers know it.
 struct RawCell {
     std::uint32_t type = 0;
     std::int32_t intValue = 0;
@@ -56,7 +56,7 @@ class ProviderContract : public testing::Test {
         const RawRecord record{0, 0, row, column, std::move(cell)};
         op<void>("AddExternalDataRecord", &record);
     }
-    // A worksheet of a numeric and a text column under names, with a blank third row.
+    // Files a worksheet with a numeric and a text column, names in the first row, and a blank third row.
     void fileWorksheet(const char* name) {
         op<void>("AddWorksheet", name);
         op<void>("SetWorksheetIndex", 0);
@@ -66,7 +66,7 @@ class ProviderContract : public testing::Test {
         file(3, 0, {4, 0, 0, 2.5, "", -1});
         file(1, 1, {5, 0, 0, 0.0, "a  b", -1});
     }
-    // The settings of the process, as it answers them.
+    // The settings of the process, as the provider's getters return them.
     static std::string processSettings() {
         std::ostringstream out;
         out << Settings::GetMissingValue() << ' ' << Settings::GetMissingValueTextRepresentation() << ' '
@@ -79,7 +79,7 @@ class ProviderContract : public testing::Test {
     }
     unsigned long count(const void* collection) { return call<unsigned long>(collection, 2); }
     int item(const void* collection, unsigned long index) { return call<int>(collection, 3, index); }
-    // What a column says of itself through its slots: name, rows.
+    // A column's name and rows, read through its slots.
     std::string describe(void* column) {
         const char* name = call<const char*>(call<void*>(column, 6), 2);
         std::string text = std::string(name) + "/" + std::to_string(call<int>(column, 10));
@@ -179,7 +179,7 @@ TEST_F(ProviderContract, EverySlotHoldsItsOperation) {
          "dp::IVariableFormat::FormatType*, bool) const"},
         {"FindColumnOfType",
          "FindColumn(int, dp::IColumn**, dp::ColumnType, dp::IVariableFormat::FormatType*, bool) const"}};
-    // The finders are bases of their own, whose slots repeat a run of the provider's.
+    // The finders are bases with tables of their own, which repeat a range of the provider's slots.
     struct Table {
         std::size_t offset;
         std::string first, last;

@@ -47,7 +47,7 @@ ExternalDataRecord recordOf(unsigned row, unsigned column, const ExternalDataRec
     return record;
 }
 
-// Mostly cells that hold what their type names, and some of every other combination of fields.
+// Mostly cells that have only the field their type names, and some with any other combination of fields.
 class RandomCells {
   public:
     unsigned below(unsigned bound) { return static_cast<unsigned>(random_() % bound); }
@@ -90,7 +90,7 @@ void expectSameColumn(const CellColumn& column, const std::map<unsigned, Externa
     ASSERT_EQ(back, column.rend());
 }
 
-// Where searches for `row` end: the row found, or 2^32 for the end.
+// The results of all lookups of `row`: the row found, or 2^32 for end().
 template <typename Column>
 auto lookups(const Column& column, unsigned row) {
     const auto found = [&](auto it) { return it == column.end() ? 1ULL << 32 : it->first; };
@@ -199,7 +199,7 @@ TEST(CellStore, KeepsEqualTextsOnce) {
     EXPECT_EQ(pool->size(), 1U);
 }
 
-// New cells take the memory of those that went while the pool still looked for their texts.
+// New cells reuse the memory of cells that were destroyed while the pool still looked up their texts.
 TEST(CellStore, DeliversTextsBeforeTheirCellsGo) {
     const auto pool = std::make_shared<TextPool>();
     const ExternalDataRecordCell number = cellOf(CELL_NUMBER, 0, 0, 5.0, "", -1);

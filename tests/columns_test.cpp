@@ -90,8 +90,8 @@ TEST_F(ColumnsOnDemand, LiesInRowsAsTheHostSays) {
     }
 }
 
-// An excluded column may hold cells in rows that count as blank: slots of its gaps then lie before
-// texts that are already in place, and take their places.
+// An excluded column may have cells in rows that count as blank. Its gaps then have slots that texts already occupy,
+// and fill over them.
 TEST_F(ColumnsOnDemand, FillsTheGapsOfExcludedColumnsFromTheRowsThatCount) {
     fileSheet("'p||'q|||'r", [](HandFilledProvider& p) {
         file(p, 1, "|1||3|4|5|6|7");
@@ -286,7 +286,7 @@ TEST_F(ColumnsOnDemand, KeepsTheRegistryThroughRemovals) {
     EXPECT_EQ(provider.GetWorksheetPrimeKey(2), 4) << "never a key in use";
 }
 
-// A provider that was used in every way and cleared shows a workbook as a new one does.
+// A provider that was used in every way and then cleared must show a workbook as a new provider does.
 TEST_F(ColumnsOnDemand, ForgetsEverythingWithItsWorksheets) {
     const auto shown = [](HandFilledProvider& p) {
         std::ostringstream out;
@@ -437,7 +437,7 @@ TEST_F(ColumnsOnDemand, BearsRowsBeyondEverySheet) {
     provider.SetReadOptionDataRowPositions(1, VNR_NONE, 0, 0xFFFFFFFE);
     EXPECT_EQ(brief(1), ": * 2");
 
-    // The first data row lies so far below the cells that the difference of both turns positive.
+    // The first data row is so far below the cells that their difference, as a signed number, wraps to a positive one.
     fileSheet("|1", [](auto& p) { p.SetReadOptionDataRowPositions(1, VNR_NONE, 0, 0x90000000); });
     EXPECT_EQ(brief(1), ": ");
     EXPECT_EQ(factsOf(provider, 1, ColumnType::Text).rows(), "");

@@ -1,5 +1,5 @@
-// Opens every file of tests/data as a host would and compares what comes out with what stands
-// beside it: expectations worked out from what other programs read in the files.
+// Opens every file of tests/data as a host would and compares the result with the expectations beside it, which were
+// derived from what other programs read in the same files.
 #include <algorithm>
 #include <chrono>
 #include <filesystem>
@@ -25,7 +25,7 @@ namespace {
 
 using nlohmann::json;
 
-// References to an object that is counted, not owned by any one.
+// Owns one reference to a counted object.
 template <class T>
 std::shared_ptr<T> held(T* object) {
     object->AddRef();
@@ -47,7 +47,7 @@ class Calendar : public dp::DateTimeVariableFormat {
     }
 };
 
-// Holds an XML Spreadsheet 2003 document and shows its columns by the document's styles.
+// A provider for an XML Spreadsheet 2003 document, with the formats of the document's styles.
 class DocumentProvider : public dp::xlsxDataProvider {
   public:
     void read(const std::string& path) {
@@ -142,7 +142,7 @@ TEST_P(DataTest, GivesWhatOtherReadersFindInIt) {
     const std::filesystem::path path = std::filesystem::path(DPXLSX_TEST_DATA) / GetParam();
     std::ifstream stored(std::filesystem::path(path).replace_extension(".expected.json"));
     const json expected = json::parse(stored);
-    // A text may be cut inside a character; what is left of that one compares as U+FFFD.
+    // A text may be cut within a character; the rest of that character becomes U+FFFD here.
     const std::string text = imported(path.string()).dump(-1, ' ', false, json::error_handler_t::replace);
     EXPECT_EQ(json::diff(expected, json::parse(text)), json::array()) << expected.dump(1);
 }

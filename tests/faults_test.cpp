@@ -17,20 +17,20 @@
 
 #include "fuzz/zip_writer.h"
 
-// Faults of the machine, made on purpose: this program stands between the library and the C library.
-// Whatever fails, the disk is clean once the provider is closed, and the same provider opens a good
-// workbook. What lacks memory or descriptors and what has damaged bytes is tested in fuzz/.
+// Simulated faults of the machine: this program replaces functions of the C library that the library calls. Whatever
+// fails, nothing is left on the disk once the provider is closed, and the same provider can open a good workbook. Lack
+// of memory or descriptors and damaged bytes are tested in fuzz/.
 namespace {
 
-// What the next looks at the file systems find free, the last one from then on; none for the truth.
+// The free bytes that the next checks of the file system report, the last number from then on; empty for the real ones.
 std::deque<std::uint64_t> freeBytes;
-std::function<bool()> copies = [] { return true; };  // asked once; false for an error
-bool slow = false;                                   // reads and writes are interrupted, and of one byte
-bool closes = true;                                  // asked once; false for an error
+std::function<bool()> copies = [] { return true; };  // called once; false makes the call fail
+bool slow = false;                                   // reads and writes are interrupted and transfer one byte at a time
+bool closes = true;                                  // called once; false makes the call fail
 
 constexpr std::uint64_t kNoBlocks = 0;  // free bytes of a file system that does not count them
 
-// Every other call, while they are slow.
+// True for every other call while `slow` is set.
 bool interrupted() {
     static bool turn = false;
     turn = slow && !turn;
@@ -56,7 +56,7 @@ extern "C" int statvfs(const char* path, struct statvfs* status) noexcept {
     return result;
 }
 
-// Called by the library alone: the C++ library does not see these.
+// Replaces the function for the library only; the C++ library does not see it.
 extern "C" ssize_t read(int file, void* bytes, std::size_t size) {
     static const auto real = realOne(&read, "read");
     return interrupted() ? -1 : real(file, bytes, slow ? std::min<std::size_t>(size, 1) : size);
@@ -98,7 +98,7 @@ class Faults : public TemporaryFiles {
     }
     std::string good() const { return file("good.xlsx"); }
 
-    // The result code, 2 for the file system's exception.
+    // The result code; 2 for the file system's exception.
     long open(const std::string& path) {
         try {
             return provider.OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read);
@@ -115,7 +115,7 @@ class Faults : public TemporaryFiles {
         provider.CloseFile();
         provider.ClearWorksheets();
     }
-    // Opens with so much free space; what does not fit leaves nothing.
+    // Opens with this free space, and checks that nothing is left when it does not suffice.
     void expectOutcome(const char* name, const std::deque<std::uint64_t>& space, long result) {
         SCOPED_TRACE(name + std::to_string(space.back()));
         freeBytes = space;
@@ -158,8 +158,7 @@ TEST_F(Faults, OfFullDisks) {
     rlimit limit{};
     ::getrlimit(RLIMIT_FSIZE, &limit);
     PackageBuilder::of({std::string(100'000, ' ')}).write(file("large.xlsx"));
-    // The write that fails, and what the file system says that it has: room for nothing, for the copy
-    // and not for what is in it, for all.
+    // The size from which writes fail: there is room for nothing, for the copy but not for its content, for everything.
     for (const auto& [bytes, result] : {std::pair{100U, -18}, {50'000U, -1}, {200'000U, 0}}) {
         const rlimit less{bytes, limit.rlim_max};
         ::setrlimit(RLIMIT_FSIZE, &less);
@@ -168,7 +167,7 @@ TEST_F(Faults, OfFullDisks) {
         expectRecovery();
         expectOutcome("large.xlsx", {bytes}, result);
     }
-    // A part is left to others; they, too, fill the disk while an entry is written.
+    // A share of the space is left to other processes, which may also fill the disk while an entry is written.
     constexpr std::uint64_t kLarge = 1 << 30;
     PackageBuilder::of({""}).add("a", std::string(2 * dp::kSpaceCheckInterval + 100'000, ' ')).write(file("huge.xlsx"));
     expectOutcome("large.xlsx", {105'000}, -1);

@@ -20,7 +20,7 @@
 namespace dp {
 namespace {
 
-// "D"ecimal, "P"ercentage, "S"cientific and "C"urrency: which recognisers accept the code.
+// Which recognisers accept the code: "D"ecimal, "P"ercentage, "S"cientific, "C"urrency.
 std::string kindsOf(const std::string& code) {
     return std::string(parseDecimalFormat(code) ? "D" : "") + (parsePercentageFormat(code) ? "P" : "") +
            (parseScientficFormat(code) ? "S" : "") + (parseCurrencyFormat(code) ? "C" : "");
@@ -54,7 +54,7 @@ TEST(FormatCodes, DateTimeCodes) {
     ExcelDataProviderBase::_inputDecimal = ',';
     const struct {
         const char* type;
-        std::vector<std::string> codes;  // none of which is changed
+        std::vector<std::string> codes;  // which must not change
     } groups[] = {{"0 ", {"", "General", "DD/MM/YYYY", "qq QQ Q", "WW wk W", "0.00"}},
                   {"7 ", {"m", "mmm", "[$-409 d", "Qq", "qQ0", "Wk", "Ww", "[Red]0.0"}},
                   {"8 ", {"mm:ss", "h:mm", "hm:m0s", "mm:ss.0", "ss.00["}},
@@ -104,7 +104,7 @@ TEST(FormatCodes, RandomCodes) {
     }
 }
 
-// The pattern by the meaning of the letters: "m" is a month save behind hours or before seconds.
+// The pattern, derived from the meaning of the letters: "m" is a month except after hours or before seconds.
 std::string expectedPattern(std::string code) {
     const char* const hours = code.find("AM/PM") != std::string::npos ? "h:mm" : "H:mm";
     const char* const steps[][2] = {{"AM/PM", "a"},   {"m", "M"},          {"h:MM", hours},

@@ -5,8 +5,8 @@
 
 #include "tests/naive_columns.h"
 
-// Random worksheets under random calls of the host, answered by the provider and by the naive
-// model. A failing round prints its seed.
+// Random worksheets and random calls of a host, made to the provider and to the naive model, whose results must agree.
+// A failing round prints its seed.
 namespace dp {
 namespace {
 

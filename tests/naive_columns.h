@@ -15,10 +15,9 @@
 
 #include "tests/provider_fixture.h"
 
-// The layout, the conversion and the loading of columns in the plainest form: full grids, every
-// question answered by walking them. Of the library it uses the formats alone, which have judges of
-// their own. It has the host's operations by their names, so that one call serves both it and the
-// provider that it judges.
+// A second implementation of row layout, conversion and column loading, as simple as possible: full grids, and every
+// query walks them. The only part of the library that it uses is the formats, which have tests of their own. Its
+// operations have the names of the provider's, so that one call can be made to both and the results compared.
 namespace dp::naive {
 
 using Cell = ExternalDataRecordCell;
@@ -39,7 +38,7 @@ inline std::string cleaned(const std::string& text) {
     return kept;
 }
 
-// The number that a text holds: a regular expression and strtod.
+// The number in a text, by a regular expression and strtod.
 inline std::optional<double> numberIn(std::string text, char decimal) {
     static const regex_t form = [] {
         regex_t made;
@@ -58,7 +57,7 @@ inline std::optional<double> numberIn(std::string text, char decimal) {
     return std::isfinite(value) ? std::optional(value == 0 ? 0.0 : value) : std::nullopt;
 }
 
-// The first characters of a text whose only marks are those from U+0300 to U+033F; 0 for all.
+// The first `count` characters of a text, all for 0. The text's only combining marks are U+0300 to U+033F.
 inline std::string firstCharacters(const std::string& text, unsigned count) {
     const auto joins = [&](std::size_t at) {
         const auto byte = static_cast<unsigned char>(text[at]);
@@ -95,7 +94,7 @@ inline const Cell* firstAtOrAfter(const Column& column, unsigned row) {
 
 struct Sheet {
     unsigned key;
-    std::vector<Column> columns;  // by column; one without rows is not stored
+    std::vector<Column> columns;  // by column; one without rows counts as not stored
 };
 
 class Provider {
@@ -248,7 +247,7 @@ class Provider {
             return std::unique_ptr<IString>(format->FormatValue(cell.numValue, false))->database_str();
         return HandHelper::shown(dates->GetFormatString()->database_str(), cell.numValue);
     }
-    // No number for content that is none; the missing value for a cell without content.
+    // No value for content that is not a number; the missing value for a cell without content.
     std::optional<double> numberOf(const Cell& cell, bool asDateTime, const std::string& pattern) const {
         const bool isDate = cell.type == CELL_DATETIME;
         if (cell.type == CELL_INTEGER) return cell.intValue;
@@ -279,8 +278,8 @@ class Provider {
         const unsigned count = std::min(n, limit);
         return n ? count - blanks(key, first, first + count) : count;
     }
-    // Hands each cell that gets a slot below `rows` to `store`, and the slots of the rows without
-    // cell in between to `fill`. Answers whether there was any cell.
+    // Passes each cell whose slot is below `rows` to `store`, and the slots of rows without a cell between them to
+    // `fill`. Returns whether there was any cell.
     template <typename Fill, typename Store>
     bool walk(unsigned key, const Column& column, unsigned rows, const Fill& fill, const Store& store) {
         const unsigned first = options[key].firstDataRow;

@@ -15,7 +15,7 @@ namespace {
 
 using naive::numberIn;
 
-// A number by its bits, or none.
+// The bits of a number, or none.
 std::optional<std::uint64_t> bits(std::optional<double> value) {
     return value ? std::optional(std::bit_cast<std::uint64_t>(*value)) : std::nullopt;
 }
@@ -55,20 +55,8 @@ TEST(NumberRecognition, DecidesTheOddTexts) {
         {"  (1,5) ", -1.5}, {"-0", 0.0},        {"2D4", 2e4},  {"2d-1", 0.2}, {"1e-999", 0.0},
         {"-1e-9999", 0.0},  {"5e-324", 5e-324}, {"-,5", -0.5}, {"12,", 12},   {"\t12\r\n", 12}};
     for (const auto& [text, value] : numbers) EXPECT_EQ(recognised(text, ','), bits(value)) << text;
-    const std::string others[] = {"(-5)",
-                                  "( 1)",
-                                  "()",
-                                  "(",
-                                  "(12",
-                                  "1e999",
-                                  "-1e999",
-                                  "+,5",
-                                  "1.000",
-                                  "0x1A",
-                                  "inf",
-                                  "nan",
-                                  "12\u00A0",
-                                  std::string("12\0", 3)};
+    const std::string others[] = {"(-5)", "( 1)",  "()",   "(",   "(12", "1e999",    "-1e999",
+                                  "+,5",  "1.000", "0x1A", "inf", "nan", "12\u00A0", std::string("12\0", 3)};
     for (const std::string& text : others) EXPECT_EQ(recognised(text, ','), std::nullopt) << text;
     for (const std::size_t zeros : {308U, 309U})
         EXPECT_EQ(recognised("1" + std::string(zeros, '0'), '.').has_value(), zeros == 308);

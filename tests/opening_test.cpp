@@ -217,8 +217,8 @@ TEST_F(Opening, CopiesForItsOwnerAndOverNothing) {
     EXPECT_EQ(fs::file_size(file("there")), 17U);
 }
 
-// All that a host does with absolute paths, where the directory it stands in is gone, and where the
-// temporary directory has a name like an address.
+// All that a host does with absolute paths, when the working directory has been removed, and when the temporary
+// directory has a name that looks like an address.
 TEST_F(Opening, NeedsNoWorkingDirectory) {
     sound().write(file("book.xlsx"));
     fs::create_directories(file("c:"));
@@ -291,7 +291,7 @@ TEST_F(Opening, StaysUsableAfterFailures) {
     provider.ClearWorksheets();
     EXPECT_EQ(openPackage(sound()), 0);
     EXPECT_EQ(provider.taken(), "+S1 @0 0,0=1 @0");
-    // Without clearing, the next workbook's worksheets follow, its empty ones removed.
+    // Without clearing, the next workbook's worksheets are appended, except its empty ones.
     EXPECT_EQ(openPackage(PackageBuilder::of({"", kRow, kRow})), 0);
     EXPECT_EQ(provider.taken(), "+S1 @1 +S2 @2 0,0=1 +S3 @3 0,0=1 -1 @0");
     EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 3UL);

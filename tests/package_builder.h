@@ -7,11 +7,11 @@
 
 #include <minizip/zip.h>
 
-// Builds .xlsx packages of literal parts. What a case does not give is a sound part.
+// Builds .xlsx packages from literal parts. Parts that a case does not give are valid.
 struct PackageBuilder {
     using Part = std::pair<std::string, std::string>;
 
-    // Of worksheets named S1, S2 ... with these contents of their sheetData elements.
+    // A package with worksheets S1, S2 ..., whose sheetData elements have these contents.
     static PackageBuilder of(const std::vector<std::string>& sheets) {
         PackageBuilder package;
         std::string list;
@@ -41,13 +41,13 @@ struct PackageBuilder {
         return "<Relationship Id='" + id + "' Type='http://x/relationships/" + type + "' Target='" + target + "'/>";
     }
 
-    // Adds a part or replaces the one of that name; an empty content takes it away.
+    // Adds a part or replaces the one of that name; empty content removes it.
     PackageBuilder& set(const std::string& name, const std::string& content) {
         std::erase_if(parts, [&](const Part& part) { return part.first == name; });
         if (!content.empty()) parts.emplace_back(name, content);
         return *this;
     }
-    // Adds an entry whatever there is already.
+    // Adds an entry, even if there is one of that name.
     PackageBuilder& add(const std::string& name, const std::string& content) {
         parts.emplace_back(name, content);
         return *this;

@@ -7,15 +7,15 @@
 #include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
 
-// Packages of literal parts, read into a provider that notes what reaches it.
+// Packages of literal parts, read into a provider that records the calls it receives.
 namespace {
 
 using Access = dp::IDataProvider::FileAccess;
 
 class Packages : public TemporaryFiles {
   protected:
-    // The calls that reach the provider, and behind them "!13" when the reader fails or the result
-    // code when it is not 0.
+    // The calls that the provider receives, followed by "!13" when the reader fails or by the result code when it is
+    // not 0.
     std::string read(const PackageBuilder& package) {
         package.write(file("book.xlsx"));
         RecordingProvider provider;
@@ -30,7 +30,7 @@ class Packages : public TemporaryFiles {
         const std::string calls = provider.taken();
         return calls + (calls.empty() || outcome.empty() ? "" : " ") + outcome;
     }
-    // The records of one worksheet, without the frame around them.
+    // The records of one worksheet, without the calls that add and select it.
     std::string readCells(const PackageBuilder& package) {
         std::string calls = read(package);
         for (const std::string frame : {"+S1 @0 ", "+S1 @0", " @0", "-0"})
@@ -98,7 +98,7 @@ TEST_F(Packages, SharedStringTables) {
         EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", c[1])), c[2]) << c[0];
 }
 
-// A provider whose memory runs out gets no more of what was on its way to it.
+// A provider that runs out of memory does not receive the cells that were still waiting.
 TEST_F(Packages, NothingFollowsAnErrorOfTheReceiver) {
     struct Full : dp::xlsxDataProvider {
         void AddExternalDataRecord(const dp::ExternalDataRecord&) override {
@@ -123,7 +123,7 @@ TEST_F(Packages, CdataSectionsHoldAnyText) {
     EXPECT_TRUE(readCells(package) == "0,0='" + text + "' 0,1='kept'");
 }
 
-// One long string in many cells: as many as are in proportion to the package, and then no more.
+// One long string in many cells: accepted in proportion to the size of the package, refused beyond.
 TEST_F(Packages, RepeatedTextsHaveALimit) {
     const auto outcomeOf = [this](unsigned cells) {
         std::string row = "<row>";
@@ -139,7 +139,7 @@ TEST_F(Packages, RepeatedTextsHaveALimit) {
     EXPECT_THROW(outcomeOf(200), CmXmlException);
 }
 
-// Many sheets that name one part, and one name that is longer than any path.
+// Many sheets that name one part, and a target that is longer than any path.
 TEST_F(Packages, SheetsOfOnePartHaveALimit) {
     const auto outcomeOf = [this](unsigned sheets, const std::string& target) {
         std::string list;

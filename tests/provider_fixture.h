@@ -17,8 +17,8 @@
 
 namespace dp {
 
-// The styles of hand-filled cells. Two are at odds with themselves: shown as date-time but not
-// counted as one, and the other way round.
+// The styles of hand-filled cells. Two are contradictory: one has a date-time format but does not count as date-time,
+// the other the other way round.
 enum HandStyle { kNumberAsDate = -2, kNoStyle, kFixed2, kPercent, kDate, kTime, kDateAsNumber };
 
 inline bool isDateStyle(int style) { return style == kDate || style == kTime || style == kDateAsNumber; }
@@ -34,8 +34,8 @@ inline std::unique_ptr<IVariableFormat> formatOfStyle(int style) {
     return format;
 }
 
-// The host's side of date-times: texts "d<number>" are read, a known pattern adds a thousandth a
-// byte, and values below 0 and from 100000 on cannot be shown.
+// A host's date-time helper: it reads texts "d<number>", adds a thousandth for each byte of a known pattern, and
+// rejects values below 0 and from 100000 on.
 class HandHelper : public DateTimeVariableFormat {
   public:
     static std::optional<double> dateIn(const std::string& pattern, const std::string& text) {
@@ -86,8 +86,8 @@ class HandFilledProvider : public ExcelDataProviderBase {
     mutable int formatsMade = 0;
 };
 
-// "'text", "i12" integer, "?1" Boolean, "@3" date-time of the date style, else a number; a last
-// letter names another style: "2f" fixed, "2%", "@3t" time, "@3n" at odds.
+// A cell by its code: "'text", "i12" integer, "?1" Boolean, "@3" date-time with the date style, otherwise a number. A
+// last letter names another style: "2f" fixed, "2%", "@3t" time, "@3n" contradictory.
 inline ExternalDataRecordCell cellOf(const std::string& code) {
     ExternalDataRecordCell cell;
     const std::string kinds = "'i?@";
@@ -109,7 +109,7 @@ inline ExternalDataRecordCell cellOf(const std::string& code) {
     return cell;
 }
 
-// What a format shows of itself.
+// A format in words.
 inline std::string describe(const IVariableFormat& format) {
     const std::string automatic = format.GetAuto() ? "auto " : "";
     if (const auto* text = dynamic_cast<const ITextVariableFormat*>(&format))
@@ -191,7 +191,7 @@ inline auto processSettings() {
                     Settings::_falseValue);
 }
 
-// Puts the settings of the process back at its end.
+// Restores the settings of the process when it is destroyed.
 struct KeptSettings {
     ~KeptSettings() { processSettings() = before; }
 

@@ -5,8 +5,8 @@
 
 #include "provider/xlsx_data_provider.h"
 
-// A provider that notes what a reader delivers, one word a call: "+Name" a worksheet, "@0" the
-// selected one, "-1" a removed one, and a record as its row, column and content.
+// A provider that records the calls of a reader, one word each: "+Name" adds a worksheet, "@0" selects one, "-1"
+// removes one, and a record is its row, column and content.
 class RecordingProvider : public dp::xlsxDataProvider {
   public:
     using dp::xlsxDataProvider::AddWorksheet;
@@ -36,7 +36,7 @@ class RecordingProvider : public dp::xlsxDataProvider {
         dp::xlsxDataProvider::AddExternalDataRecord(record);
     }
 
-    // What was noted since the last call.
+    // What was recorded since the last call of this.
     std::string taken() { return std::exchange(calls_, {}); }
 
   private:

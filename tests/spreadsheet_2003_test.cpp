@@ -8,10 +8,10 @@
 #include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
 
-// XML Spreadsheet 2003 documents of literal parts, read into a provider that notes what reaches it.
+// XML Spreadsheet 2003 documents of literal parts, read into a provider that records the calls it receives.
 namespace {
 
-// The host's side of date-times: answers the fields as one number.
+// A host's date-time helper that returns the fields as one number.
 class FieldsHelper : public dp::DateTimeVariableFormat {
   public:
     double GenerateTime(int year, int month, int day, int hour, int minute, int second,
@@ -37,7 +37,7 @@ class Spreadsheet2003 : public TemporaryFiles {
         return "<Cell " + attributes + "><Data ss:Type='Number'>" + value + "</Data></Cell>";
     }
 
-    // The calls that reach the provider, "!13" behind them when the reader fails.
+    // The calls that the provider receives, followed by "!13" when the reader fails.
     std::string read(const std::string& content) {
         std::string outcome;
         try {

@@ -8,8 +8,8 @@
 #include <boost/filesystem.hpp>
 #include <gtest/gtest.h>
 
-// Tests that touch the disk do so in a directory of their own, which is also the process's
-// temporary directory meanwhile: whatever is left there was left by the library.
+// Gives a test that touches the disk a directory of its own, which is also the process's temporary directory during the
+// test: whatever is left there was left by the library.
 class TemporaryFiles : public testing::Test {
   protected:
     void SetUp() override {

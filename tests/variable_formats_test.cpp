@@ -43,8 +43,8 @@ struct GroupingPunctuation : std::numpunct<char> {
     std::string do_grouping() const override { return "\3"; }
 };
 
-// Renders under a global locale with grouping, in another language and time zone, and puts back what
-// the tests change in the process.
+// Renders under a global locale with grouping, in another language and time zone, and restores what the tests change in
+// the process.
 class VariableFormats : public ::testing::Test {
   protected:
     VariableFormats() {
@@ -148,12 +148,12 @@ TEST_F(VariableFormats, NumbersRenderAsTheClassicStreamRendersThem) {
     };
     for (std::size_t i = 0; i < values.size() && !HasFatalFailure(); ++i) {
         compare(values[i], 22);
-        // Special values meet every other variant, the rest one each.
+        // Special values are rendered in all variants, the others in one each.
         for (std::size_t variant = 0; variant < 22; ++variant)
             if (i < specials || i % 22 == variant) compare(values[i], variant);
     }
     format.numericSubtype = kFixed;
-    format.decimalPlaces = 1500;  // a code may have as many zeros
+    format.decimalPlaces = 1500;  // a code may have this many zeros
     for (const double value : {-1e308, 5e-324}) EXPECT_EQ(rendered(format, value), streamed(value, 1500, std::fixed));
 }
 

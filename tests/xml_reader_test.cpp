@@ -106,7 +106,7 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
     const auto sized = [&framed](std::size_t size, const std::string& frame) {
         return framed(frame, std::string(size, 'x'));
     };
-    // Nearly as much as markup may be; all of it looks like attributes, and like ends of comments.
+    // Nearly as long as markup may be; all of it looks like attributes and like ends of comments.
     const auto marked = [&repeated](const std::string& frame) { return repeated(14'000, "<b c=\"--", frame); };
     const std::string japanese = "<?xml version='1.0' encoding='ISO-2022-JP'?>";
     const std::string western = "<?xml version='1.0' encoding='windows-1252'?>";
@@ -166,7 +166,7 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
     EXPECT_EQ(text, "") << "external entities are not fetched";
 }
 
-// Each name with a prefix goes into a dictionary when it is asked for, which takes 50 MB at most.
+// Each name with a prefix is added to libxml2's dictionary when it is asked for; the dictionary takes 50 MB at most.
 TEST_F(XmlReading, FailsWhereNoNameCanBeMade) {
     const std::string filler(5000, 'n');
     std::string document = "<a";
@@ -177,7 +177,7 @@ TEST_F(XmlReading, FailsWhereNoNameCanBeMade) {
     EXPECT_EQ(codeOfReading(document + "</a>"), 0) << "nobody asks for names";
     XmlReader reader;
     open(reader, document + "</a>");
-    // Without its name an element would be passed over, with all that it holds.
+    // Without its name an element would be skipped, with all its content.
     EXPECT_THROW(while (reader.readToElement()) if (!reader.nodeName()) break, CmXmlException);
 }
 
@@ -190,7 +190,7 @@ TEST_F(XmlReading, LeavesAHostThatMovesOnItsOwnAlone) {
     while (result == 1) result = xmlTextReaderRead(reader.textReader);
     EXPECT_EQ(result, 0) << "the end, not a limit";
 
-    // The host's handlers of errors are there again.
+    // The host's error handlers have been restored.
     int context = 0;
     xmlSetGenericErrorFunc(&context, nullptr);
     xmlSetStructuredErrorFunc(&context, [](auto...) {});
@@ -205,7 +205,7 @@ TEST_F(XmlReading, ReadsAPrivateCopyWhereLibxml2CannotOpenThePath) {
     write("a:/part.xml", "<a><b/></a>");
     direct.mInitialize(files().string() + "/a://part.xml");
     EXPECT_FALSE(direct.tempCopy) << "an absolute path is no address";
-    // To the file system a relative path, to libxml2 the address of another file.
+    // A relative path to the file system, but an address of another file to libxml2.
     const std::string path = "file:///nowhere/part.xml";
     write(path, "<a><b/></a>");
     boost::filesystem::current_path(files());
@@ -223,7 +223,7 @@ TEST_F(XmlReading, ReadsAPrivateCopyWhereLibxml2CannotOpenThePath) {
     boost::filesystem::current_path(workingDirectory());
 }
 
-// What the conversion is defined to yield under the process's locale.
+// The result that the conversion is defined to have under the process's locale.
 double castLiterally(const std::string& text) {
     std::string copy = text;
     const char point = *std::localeconv()->decimal_point;
