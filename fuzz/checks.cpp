@@ -24,7 +24,7 @@ namespace {
 
 namespace fs = boost::filesystem;
 
-// Before the fuzzer closes it.
+// Duplicated before the fuzzer closes it.
 const int messages = ::dup(STDERR_FILENO);
 
 extern "C" void onXmlMessage(void*, const char*, ...) {
@@ -72,7 +72,7 @@ Surroundings& surroundings() {
 
 std::uintptr_t numberOf(auto pointer) { return reinterpret_cast<std::uintptr_t>(pointer); }
 
-// What a host would notice.
+// State of the process whose change a host would notice.
 struct ProcessState {
     std::array<char, 4096> workingDirectory{};
     mode_t mask;
@@ -128,7 +128,7 @@ bool isNull(int descriptor) {
            status.st_rdev == makedev(1, 3);
 }
 
-// What is printed, into memory; -1 when the streams are in use.
+// Redirects what is printed to memory; -1 when the streams are in use.
 int takeOutput() {
     if (!isNull(STDOUT_FILENO) || !isNull(STDERR_FILENO)) return -1;
     const int taken = ::memfd_create("printed", MFD_CLOEXEC);

@@ -5,14 +5,14 @@
 
 namespace fuzz {
 
-// Ends the process with what is wrong; the fuzzer then keeps the input.
+// Reports what is wrong and aborts; the fuzzer then keeps the input.
 [[noreturn]] void fail(const std::string& what);
 inline void require(bool holds, const char* what) {
     if (!holds) fail(what);
 }
 
-// A directory for the files of a target, in memory where there is such a file system. The temporary
-// and the working directory of the process lie elsewhere. It goes with the process.
+// A directory for the files of a target, on a file system in memory if there is one. The temporary
+// and the working directory of the process are other ones. Removed when the process ends.
 const std::string& ownFiles();
 
 // Writes a file of the target, replacing it.
@@ -20,8 +20,8 @@ void writeFile(const std::string& path, const std::string& content);
 
 // Runs `work` and checks that it leaves the process as it was: working directory, umask, locale,
 // signal handlers, libxml2's state and handlers, and the lowest free descriptor; that the temporary
-// and the working directory are empty; and that nothing was printed. The last needs the fuzzer's
-// -close_fd_mask=3, by which its own messages take another road.
+// and the working directory are empty; and that nothing was printed. The last check needs the
+// fuzzer's option -close_fd_mask=3, with which its own messages do not go to the standard streams.
 void leavingNothing(const std::function<void()>& work);
 
 }  // namespace fuzz

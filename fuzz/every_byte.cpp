@@ -1,6 +1,7 @@
-// every_byte [STRIDE]: a small workbook, cut before every byte, and with every byte set to 0x00 and
-// 0xFF and with its top bit flipped; of every STRIDE bytes one. Each is opened as a host does it
-// and must leave nothing behind. In between, the sound workbook opens as before.
+// every_byte [STRIDE]: opens a small workbook cut before every byte, with every byte set to 0x00
+// and to 0xFF, and with every byte's top bit flipped; with STRIDE only one of STRIDE bytes. Each is
+// opened as a host does and must leave nothing behind. In between, the undamaged workbook must open
+// as before.
 
 #include <malloc.h>
 
@@ -35,25 +36,26 @@ std::string packageOf(const Parts& parts) {
     return archive.finished();
 }
 
-// Calls `use` with every spoilt form of `bytes`.
+// Calls `use` with every damaged form of `bytes`.
 template <class Use>
-void spoil(const std::string& bytes, std::size_t stride, Use use) {
+void damage(const std::string& bytes, std::size_t stride, Use use) {
     const std::string sound = packageOf(fuzz::soundParts());
     for (std::size_t at = 0; at < bytes.size(); at += stride) {
         use(bytes.substr(0, at));
         for (const char other : {'\0', '\xFF', static_cast<char>(bytes[at] ^ 0x80)}) {
-            std::string spoilt = bytes;
-            spoilt[at] = other;
-            use(spoilt);
+            std::string damaged = bytes;
+            damaged[at] = other;
+            use(damaged);
         }
         if (at % 64 == 0) fuzz::require(open(sound) == 0, "the sound workbook does not open");
     }
 }
 
-// Opens the sound workbook again and again; memory must stay as it was.
+// Opens the undamaged workbook again and again; memory must not grow.
 void openOften() {
     constexpr int kTimes = 300;
-    constexpr std::size_t kBytes = 4096;  // in which nothing adds up
+    constexpr std::size_t kBytes =
+        4096;  // of growth that are tolerated: a leak of each open would exceed this
     const std::string sound = packageOf(fuzz::soundParts());
     open(sound);
     const std::size_t before = ::mallinfo2().uordblks;
@@ -66,11 +68,11 @@ void openOften() {
 int main(int argc, char** argv) {
     const int given = argc > 1 ? std::atoi(argv[1]) : 1;
     const auto stride = static_cast<std::size_t>(given > 0 ? given : 1);
-    spoil(packageOf(fuzz::soundParts()), stride, open);
+    damage(packageOf(fuzz::soundParts()), stride, open);
     for (const auto& [name, content] : fuzz::soundParts())
-        spoil(content, stride, [&name = name](const std::string& spoilt) {
+        damage(content, stride, [&name = name](const std::string& damaged) {
             Parts parts = fuzz::soundParts();
-            parts[name] = spoilt;
+            parts[name] = damaged;
             open(packageOf(parts));
         });
     openOften();

@@ -1,7 +1,8 @@
-// every_shortage: opens a small workbook and loads its columns with one allocation failing, then
-// with all from one on, for every allocation on the way, those of the libraries below included; and
-// with every number of descriptors from none to enough. It must end in a result or an exception
-// that hosts know and leave nothing behind, and the same provider must then open the workbook.
+// every_shortage: opens a small workbook and loads its columns while one allocation fails, then
+// while that one and all later ones fail, for every allocation in turn, including those of the
+// libraries below; and with every number of descriptors from none to enough. Each time it must end
+// with a result or an exception that hosts know and leave nothing behind, and the same provider
+// must then open the workbook.
 
 #include <cstdio>
 #include <cstdlib>
@@ -25,8 +26,8 @@
 
 namespace {
 
-long allocationsLeft = -1;  // until one fails; -1: none does
-bool lasting = false;       // all behind it fail too
+long allocationsLeft = -1;  // until one fails; -1 when none is to fail
+bool lasting = false;       // all later ones fail too
 
 bool failsNow() {
     if (allocationsLeft < 0) return false;
@@ -84,7 +85,7 @@ std::string makeBook() {
     return fuzz::ownFiles() + "/book.xlsx";
 }
 
-// The result code, or that of the exception.
+// The result code, or the exception's code.
 long open(dp::IDataProvider& provider, const std::string& path) {
     try {
         return provider.OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read);
@@ -173,7 +174,7 @@ int main() {
     print("one allocation", failAllocations(path));
     lasting = true;
     print("all allocations from one on", failAllocations(path));
-#ifndef __SANITIZE_ADDRESS__  // the sanitizers look at memory through descriptors of their own
+#ifndef __SANITIZE_ADDRESS__  // the sanitizers need descriptors of their own
     print("descriptors", lackDescriptors(path));
 #endif
     return 0;

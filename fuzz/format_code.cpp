@@ -1,4 +1,4 @@
-// Number-format codes through every recogniser, and values through every format.
+// Passes number-format codes to every recogniser, and values to every format.
 
 #include <cstdint>
 #include <memory>
@@ -55,7 +55,7 @@ void recognise(const std::string& code, double value) {
     dp::getRightSubString(code, static_cast<unsigned>(code.size() / 2));
 }
 
-// As the readers do it.
+// Processes a style table as the readers do.
 void styleTable(const std::string& code, double value) {
     std::vector<dp::xStyle> styles = {{"14", code, dp::EXCEL_FORMAT_NONE},
                                       {"164", code, dp::EXCEL_FORMAT_NUMBER}};
@@ -68,7 +68,7 @@ void styleTable(const std::string& code, double value) {
             showAndDelete(dp::createStyleFormat(styles, index, dates), value);
 }
 
-// Any setting that a host may find in a format.
+// Renders with any values of a format's fields.
 void freeFormats(fuzz::Input& input, double value) {
     const auto signedByte = [&input] { return static_cast<int>(input.byte()) - 4; };
     dp::FractionVariableFormat fraction;

@@ -17,16 +17,16 @@ namespace {
 constexpr unsigned long kRows = 20'000;  // of all columns of one input
 constexpr unsigned long kShown = 3;      // values of a column
 
-// Every byte of the text must be there.
+// Reads every byte of the text.
 unsigned long read(const dp::IString* text) { return text ? std::strlen(text->database_str()) : 0; }
 
-// Owned by us.
+// Reads and deletes a string that the caller owns.
 void show(dp::IString* text) { read(std::unique_ptr<dp::IString>(text).get()); }
 
 void readNumbers(const dp::INumericColumn& column, unsigned long rows) {
     const volatile double* values = column.GetValues();
     require(column.GetConvertedMissingCount() >= 0, "a negative count");
-    // Every value must be there.
+    // Reads every value.
     for (unsigned long row = 0; row < rows; ++row) static_cast<void>(values[row]);
     for (unsigned long row = 0; row < std::min(rows, kShown); ++row) {
         show(column.GetFormat()->FormatValue(values[row], row % 2 == 1));
@@ -40,7 +40,7 @@ void readTexts(const dp::ITextColumn& column, unsigned long rows) {
     for (unsigned long row = 0; row < rows; ++row) read(&texts.Item(row));
 }
 
-// Takes columns until there were kRows rows.
+// Loads columns until kRows rows have been read.
 class Taking {
   public:
     explicit Taking(dp::IDataProvider& provider) : finder_(*provider.GetVariableFinder()) {}

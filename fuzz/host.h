@@ -26,7 +26,7 @@ Reference<T> referenceTo(T* object) {
     return Reference<T>(object);
 }
 
-// A host's answers about date-times: it reads texts that begin with a number.
+// A host's date-time helper, which reads texts that begin with a number.
 class Helper : public dp::DateTimeVariableFormat {
   public:
     bool ConvertToDatetime(const dp::IString* format, dp::IString* text,
@@ -40,14 +40,14 @@ class Helper : public dp::DateTimeVariableFormat {
 // Reads the whole column and shows some of its values. Returns the number of its rows.
 unsigned long read(dp::IColumn& column);
 
-// Asks for every worksheet and for every column in every kind, reads all of them and gives them
-// back; stops after some ten thousand rows.
+// Loads every worksheet, and every column in every kind, reads them and releases them; stops after
+// some ten thousand rows.
 void takeEverything(dp::IDataProvider& provider);
 
 // A provider that reads by a given reader, without a package around the parts.
 class ReadingProvider : public dp::ExcelDataProviderBase {
   public:
-    // Borrowed by the reader, which therefore goes first.
+    // Takes the reader, which borrows this provider and is therefore destroyed first.
     void read(std::unique_ptr<dp::ExcelXmlReader> reader);
 
     long GetWorksheets(const char* fileName, std::vector<std::string>& names) override;

@@ -11,7 +11,7 @@
 
 namespace fuzz {
 
-// Takes an input apart from its front. One that is used up answers zeros and empty texts.
+// Takes values from the front of an input. An input that is used up gives zeros and empty texts.
 class Input {
   public:
     Input(const std::uint8_t* data, std::size_t size)
@@ -37,11 +37,11 @@ class Input {
         rest_.remove_prefix(text.size());
         return text;
     }
-    // A byte that says how long it is, then the text.
+    // A byte with the length of the text, then the text.
     std::string text() { return take(byte()); }
     std::string rest() { return take(rest_.size()); }
 
-    // One of the numbers at the edges, or any eight bytes.
+    // One of the boundary numbers, or any eight bytes.
     double number() {
         using Limits = std::numeric_limits<double>;
         constexpr double kEdges[] = {0,
@@ -71,7 +71,7 @@ class Input {
         return value;
     }
 
-    // One of the numbers at the edges of rows, columns and keys, or a small one.
+    // One of the boundary numbers of rows, columns and keys, or a small one.
     unsigned index() {
         constexpr unsigned kEdges[] = {0,          1,          16383,     16384,      65535,
                                        65536,      1048575,    1048576,   0x7FFFFFFE, 0x7FFFFFFF,

@@ -15,7 +15,7 @@ namespace fuzz {
 namespace {
 
 bool isResultOfOpening(long result) {
-    constexpr long kResults[] = {0, -1, -22, -25};  // what the file's bytes can lead to
+    constexpr long kResults[] = {0, -1, -22, -25};  // the results that a file's content can cause
     return std::find(std::begin(kResults), std::end(kResults), result) != std::end(kResults);
 }
 

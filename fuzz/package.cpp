@@ -1,6 +1,6 @@
-// Packages, opened through the entry points as a host does it. An input whose first byte is odd is
-// the file itself. Any other describes entries of a package: the sound parts of a small workbook
-// stay where no entry replaces them, so that what is read does not end at the ZIP archive.
+// Packages, opened through the entry points as a host does. If the first byte is odd, the input is
+// the file itself. Otherwise it describes entries of a package, which replace parts of a small
+// valid workbook, so that reading gets beyond the ZIP archive.
 
 #include <algorithm>
 #include <cstdint>
@@ -55,8 +55,8 @@ std::string repeated(const std::string& text, unsigned times) {
     return all;
 }
 
-// The entries that the input describes, in their order; up to 1,023 more of an entry of which
-// there are many, under names of their own.
+// Adds the entries that the input describes, in their order; with kMany up to 1,023 more copies of
+// an entry, each with a name of its own.
 void addEntries(Input& input, fuzz::ZipWriter& archive, std::vector<std::string>& names) {
     for (unsigned left = 1 + input.byte() % 16; left > 0 && !input.empty(); --left) {
         fuzz::ZipWriter::Entry entry;

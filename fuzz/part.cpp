@@ -1,5 +1,5 @@
-// One part of an otherwise sound package, in the directory that a package is unpacked into. The
-// first byte chooses the part, the others are its content.
+// One part of an otherwise valid package, in the directory of an unpacked package. The first byte
+// selects the part, the others are its content.
 
 #include <cstdint>
 #include <iterator>
@@ -24,7 +24,7 @@ constexpr const char* kParts[] = {"xl/workbook.xml", "xl/_rels/workbook.xml.rels
                                   "xl/sharedStrings.xml", "xl/styles.xml",
                                   "xl/worksheets/sheet1.xml"};
 
-// The directory of the package; the part that differed last is made sound again.
+// The directory of the package. Before a part is replaced, the one replaced before is restored.
 class Package {
   public:
     Package() : directory_(fuzz::ownFiles()) {

@@ -5,7 +5,7 @@
 
 namespace fuzz {
 
-// The parts of a small sound workbook by their names: two worksheets, shared strings, styles.
+// The parts of a small valid workbook by their names: two worksheets, shared strings, styles.
 const std::map<std::string, std::string>& soundParts();
 
 }  // namespace fuzz

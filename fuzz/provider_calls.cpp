@@ -36,7 +36,7 @@ const std::string& bookPath() {
     return path;
 }
 
-// The settings of the process, put back at its end.
+// Restores the settings of the process when it is destroyed.
 struct KeptSettings {
     ~KeptSettings() {
         Provider::_missingValue = missing;
@@ -61,7 +61,7 @@ class Host {
     explicit Host(Input input) : input_(input) {
         dp::IDataProvider* created = nullptr;
         require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
-        // The whole of the provider's operations, those for readers included.
+        // The provider with all its operations, including those for readers.
         provider_ = fuzz::referenceTo(dynamic_cast<dp::IExcelDataProvider*>(created));
     }
 
@@ -123,7 +123,7 @@ class Host {
         require(provider_->GetWorksheets(bookPath().c_str(), names) == 0 && names.size() == 2,
                 "not listed");
     }
-    // Seldom far below: long columns take the time of many short ones.
+    // Rarely a large number, because long columns take as long as many short ones.
     unsigned row() {
         const unsigned small = input_.byte();
         if (small < 254) return small;
@@ -270,7 +270,7 @@ class Host {
                 return callUnsupported();
         }
     }
-    // Long columns are given back at once.
+    // Long columns are released at once.
     void findColumn() {
         const dp::IVariableFinder& finder = *provider_->GetVariableFinder();
         dp::IColumn* column = nullptr;
@@ -329,7 +329,7 @@ class Host {
 
     Input input_;
     fuzz::Reference<dp::IExcelDataProvider> provider_;
-    std::vector<fuzz::Reference<dp::IColumn>> columns_;  // go before the provider
+    std::vector<fuzz::Reference<dp::IColumn>> columns_;  // released before the provider
     std::vector<fuzz::Reference<dp::IWorksheet>> worksheets_;
 };
 

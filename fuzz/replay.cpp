@@ -1,6 +1,6 @@
-// replay PATH...: runs a fuzz target once over every file named, or below every directory named,
-// without a fuzzer. What is wrong ends the process; the name of the file is printed first. As under
-// the fuzzer, the process's own streams lead nowhere meanwhile, so that what is printed is noticed.
+// replay PATH...: runs a fuzz target once for every file named, or below every directory named,
+// without a fuzzer. An error ends the process; the name of the file is printed first. As under the
+// fuzzer, the standard streams are redirected during each run, so that output is noticed.
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -22,7 +22,7 @@ namespace fs = boost::filesystem;
 
 const int names = ::dup(STDOUT_FILENO);
 
-// Of the sanitizers, where there are any.
+// Defined by the sanitizers, if any are used.
 extern "C" [[gnu::weak]] void __sanitizer_set_report_fd(void* descriptor);
 
 void closeStreams() {

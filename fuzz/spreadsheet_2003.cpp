@@ -23,7 +23,7 @@ void readDocument(const std::string& path) {
             provider->GetDateTimeVariableFormatHelper()));
     } catch (const CmXmlException& e) {
         fuzz::require(e.code() == kXmlError, "another code");
-    } catch (const std::out_of_range&) {  // these two for texts that are no date-times
+    } catch (const std::out_of_range&) {  // both for texts that are not date-times
     } catch (const boost::bad_lexical_cast&) {
     }
     fuzz::takeEverything(*provider);

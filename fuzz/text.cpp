@@ -1,5 +1,5 @@
-// Texts of cells, names of entries and references of cells, through everything that judges or
-// changes them.
+// Passes texts of cells, names of entries and references of cells to all functions that check or
+// change them.
 
 #include <algorithm>
 #include <cstddef>

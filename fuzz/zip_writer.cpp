@@ -41,7 +41,7 @@ void ZipWriter::add(const Entry& entry) {
     put(common, 20, 2);  // version needed
     put(common, 0, 2);   // flags
     put(common, entry.deflated ? Z_DEFLATED : 0, 2);
-    put(common, 0x21 << 16, 4);  // the first day there is
+    put(common, 0x21 << 16, 4);  // 1980-01-01, the first date of the format
     put(common, entry.wrongSum ? ~sum : sum, 4);
     put(common, packed.size(), 4);
     put(common, size, 4);
@@ -65,7 +65,7 @@ std::string ZipWriter::finished() const {
     std::string archive = local_ + directory_;
     put(archive, 0x06054b50, 4);
     put(archive, 0, 4);
-    const unsigned entries = std::min(entries_, 0xFFFFU);  // for that and more
+    const unsigned entries = std::min(entries_, 0xFFFFU);  // saturates
     put(archive, entries, 2);
     put(archive, entries, 2);
     put(archive, directory_.size(), 4);

@@ -5,7 +5,7 @@
 
 namespace fuzz {
 
-// Builds a ZIP archive in memory, sound unless told otherwise.
+// Builds a ZIP archive in memory, valid unless told otherwise.
 class ZipWriter {
   public:
     struct Entry {
