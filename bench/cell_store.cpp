@@ -1,7 +1,7 @@
-// Compares the cell store with plain maps of maps: time and resident memory, each measurement in a
+// Compares the cell store with plain maps of maps: time and resident memory, each measured in a
 // process of its own, the best of several runs. Cells are filed as a reader files them, through one
-// record that is filled again and again. Ends with 1 when a goal is missed, and with 2 when a
-// measurement cannot be made or does not see every cell.
+// record that is reused. The exit code is 1 when a goal is missed, and 2 when a measurement fails
+// or does not see every cell.
 
 #include <unistd.h>
 
@@ -43,7 +43,7 @@ struct Figures {
     double walk = 1e9;
     double destroy = 1e9;
     double sum = 0.0;
-    unsigned long cells = 0;  // that the walk saw
+    unsigned long cells = 0;  // counted by the walk
 
     void keepBest(const Figures& other) {
         file = std::min(file, other.file);
@@ -98,7 +98,8 @@ void walk(const Cells& cells, Figures& figures) {
         }
 }
 
-// Files `count` records as `fill` makes them; the first read belongs to the filing.
+// Files `count` records made by `fill`. The time of filing includes the first read, which merges
+// cells filed out of order.
 template <typename Cells, typename Fill>
 Figures measure(unsigned count, const Fill& fill) {
     Figures figures;
@@ -142,7 +143,7 @@ void printHead() {
     std::printf("%-44s %10s %10s %7s %7s\n", "", "ours", "std::map", "ratio", "goal");
 }
 
-// A goal of 0 is none.
+// A goal of 0 means that there is none.
 void printRow(const std::string& what, double ours, double plain, double goal) {
     const double ratio = ours / plain;
     const bool reached = goal == 0.0 || ratio <= goal;
@@ -200,7 +201,8 @@ void numbers() {
     }
 }
 
-// Rows in the order of a full-period generator modulo a power of two, those in range only.
+// The rows in pseudo-random order: a full-period generator modulo a power of two, without the
+// numbers out of range.
 std::vector<unsigned> shuffledRows(unsigned count) {
     std::vector<unsigned> rows;
     for (unsigned i = 0, state = 1; i < 1U << 19; ++i) {
@@ -225,7 +227,7 @@ void outOfOrder() {
     printPair("random rows", random, kRows, {1.0, 0, 0, 0});
 }
 
-// The texts of `distinct` customers, made on the spot as out of a parser's buffer.
+// Sets one of `distinct` texts, composed in a local buffer, as a parser would deliver it.
 void setText(ExternalDataRecord& record, unsigned i, std::uint64_t step, unsigned distinct) {
     char text[] = "customer number 0000000000";
     auto number = static_cast<unsigned>(i * step % distinct);
@@ -237,8 +239,8 @@ void setText(ExternalDataRecord& record, unsigned i, std::uint64_t step, unsigne
     record.cell.textValue.assign(text, sizeof text - 1);
 }
 
-// Every text twice: the second time in the order of the first time, or in another one, which is
-// the worst case for every kind of cache.
+// Every text twice: the second time in the order of the first time, or scattered, which is the
+// worst case for all caches.
 void texts() {
     constexpr unsigned kCells = 1'000'000;
     constexpr unsigned kDistinct = kCells / 2;

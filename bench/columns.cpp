@@ -1,6 +1,6 @@
-// What columns on demand cost, each figure beside a floor measured in the same run. Cells are filed
-// by hand, columns are asked for as a host does. Prints a table; answers 1 when a goal is missed,
-// and 2 when a column does not have as many values as were filed.
+// The cost of loading columns on demand, each figure beside a floor measured in the same run. Cells
+// are filed directly; columns are requested as a host does. Prints a table; the exit code is 1 when
+// a goal is missed, and 2 when a column does not have all values that were filed.
 
 #include <algorithm>
 #include <chrono>
@@ -32,7 +32,7 @@ constexpr int kDateStyle = 1;
 double sink = 0;  // keeps the results alive
 bool allReached = true;
 
-// The least time of a call over some rounds, in nanoseconds a unit.
+// The least time of a call in several rounds, in nanoseconds per unit.
 double nanoseconds(unsigned units, const std::function<void()>& call, int rounds = 7) {
     double least = std::numeric_limits<double>::max();
     for (int round = 0; round < rounds; ++round) {
@@ -45,7 +45,7 @@ double nanoseconds(unsigned units, const std::function<void()>& call, int rounds
     return least;
 }
 
-// A goal of 0 is none; the one is a ratio, the other nanoseconds.
+// Goals as a ratio and in nanoseconds; 0 means that there is none.
 struct Goal {
     double ratio;
     double nanoseconds;
@@ -101,7 +101,7 @@ class Provider : public dp::ExcelDataProviderBase {
         unsigned rows;
         unsigned values;  // those that are not missing
     };
-    // Loads a column and lets it go. What stands in the first row is its name.
+    // Loads a column and releases it. The first row holds the name.
     Loaded load(int key, dp::ColumnType type = dp::ColumnType::Automatic) const {
         dp::IColumn* column = nullptr;
         dp::IVariableFormat::FormatType formatType{};
@@ -112,7 +112,7 @@ class Provider : public dp::ExcelDataProviderBase {
         column->Release();
         return loaded;
     }
-    // Nanoseconds a row of the first column, which has so many values.
+    // Nanoseconds per row of the first column, which must have this many values.
     double loadTime(unsigned values = kRows, dp::ColumnType type = dp::ColumnType::Automatic,
                     int rounds = 7) {
         GetWorksheetPrimeKeys();
@@ -172,7 +172,7 @@ void numbers() {
     report("numbers, 1 % blank rows skipped / none", gaps.loadTime(kRows - kRows / 100), time,
            {2, 0});
 
-    // Every other row blank in this column, kept by another one.
+    // Every other row is empty in this column, but has a cell in another one.
     Provider sparse;
     for (unsigned row = 0; row <= kRows; ++row) sparse.number(row, row % 2, row * 0.5);
     sparse.SetReadOptionIgnoreBlankRows(true);
@@ -261,8 +261,9 @@ void texts() {
            floor, {3, 0});
 }
 
-// Filing one column and loading it. Reading a cell from a file costs some hundred nanoseconds more;
-// it is that sum, not this part of it, that the order of rows may raise by no more than a half.
+// Files one column and loads it. Reading a cell from a file takes some hundred nanoseconds more;
+// the goal of at most one and a half times for rows out of order is set for the sum, not for this
+// part.
 double orderTime(const std::vector<unsigned>& rows) {
     const auto count = static_cast<unsigned>(rows.size());
     return nanoseconds(
@@ -289,7 +290,7 @@ void orders() {
     }
 }
 
-// All columns of a workbook of tiny ones, by their keys; nanoseconds a column.
+// Finds all columns of a workbook of many tiny columns by their keys; nanoseconds per column.
 double findTime(unsigned worksheets, unsigned columns) {
     Provider provider(worksheets);
     for (unsigned sheet = 0; sheet < worksheets; ++sheet) {

@@ -1,5 +1,5 @@
-// What the number formats cost, each figure beside the floor it is held against. Prints a table;
-// answers 1 when a goal is missed, and 2 when a call did not do its work.
+// The cost of number formats, each figure beside its floor. Prints a table; the exit code is 1 when
+// a goal is missed, and 2 when a call did not do its work.
 
 #include <algorithm>
 #include <chrono>
@@ -29,8 +29,8 @@ using Type = dp::IVariableFormat::FormatType;
 
 constexpr char kPattern[] = "M/d/yyyy H:mm";
 
-// The least time of one call over several rounds, in nanoseconds. Every call answers whether it did
-// its work, which also keeps that from being left out.
+// The least time of one call over several rounds, in nanoseconds. Every call returns whether it did
+// its work; using the result also keeps the compiler from removing the call.
 template <typename Call>
 double nanoseconds(int calls, Call call) {
     double least = std::numeric_limits<double>::max();
@@ -51,7 +51,7 @@ struct Figure {
     double ours;   // nanoseconds
     double floor;  // nanoseconds
     double mostRatio;
-    double mostNanoseconds = 0;  // reaching this instead is enough
+    double mostNanoseconds = 0;  // alternatively, this time suffices
 };
 
 bool report(const Figure& figure) {
@@ -142,7 +142,7 @@ bool reportDateTimeRendering() {
     return report({"date-time rendering / ICU alone", ours, floor, 1.3});
 }
 
-// What a cell pays for the format of its style, lookup and parsing included.
+// The cost of the format of a cell's style, including lookup and parsing.
 bool reportStyleFormats() {
     std::vector<dp::xStyle> styles = {{"164", "#,##0.00", dp::EXCEL_FORMAT_NONE},
                                       {"165", "m/d/yy h:mm AM/PM", dp::EXCEL_FORMAT_DATETIME}};

@@ -1,11 +1,12 @@
-// Workbooks whose numbers drive work: far corners, thousands of worksheets, relationships and
-// styles, long format codes. Each is opened and its columns are loaded at full size and at half of
-// it: a ratio far above 2 tells of a quadratic road. Each must take less than a second. Then many
-// opens one after the other, which must leave memory, descriptors and the temporary directory as
-// they were. Ends with 1 when a goal is missed, and with 2 when not all values were loaded.
+// Workbooks that could cause disproportionate work: cells in far corners, thousands of worksheets,
+// relationships and styles, long format codes. Each is opened and its columns are loaded at full
+// and at half size: a ratio far above 2 indicates quadratic time. Each must take less than a
+// second. Then a workbook is opened many times in a row, which must leave memory, descriptors and
+// the temporary directory as they were. Ends with 1 when a goal is missed, and with 2 when not all
+// values were loaded.
 //
-// hostile [OPENS]: OPENS of the last, 10,000 by default. The files are made in memory where there
-// is such a file system: a disk takes longer for 10,000 files than all the rest.
+// hostile [OPENS]: the number of opens in a row, 10,000 by default. The files are made on a file
+// system in memory if there is one: on a disk, 10,000 files take longer than everything else.
 
 #include <malloc.h>
 #include <unistd.h>
@@ -38,7 +39,7 @@ constexpr double kMostRatio = 3.0;
 
 struct Measurement {
     double seconds = 0;
-    double megabytes = 0;  // the peak of the process, less what it began with
+    double megabytes = 0;  // the peak of the process beyond its initial memory
     unsigned long values = 0;
 };
 
@@ -48,8 +49,8 @@ double peakMegabytes() {
     return static_cast<double>(usage.ru_maxrss) / 1024;
 }
 
-// Opens the workbook as a host that wants blank rows skipped and columns padded, and loads all;
-// answers the number of values.
+// Opens the workbook as a host that skips blank rows and pads columns, and loads all columns;
+// returns the number of values.
 unsigned long openAndLoad(const std::string& path) {
     dp::xlsxDataProvider provider;
     provider.SetReadOptionIgnoreBlankRows(true);
@@ -66,7 +67,7 @@ unsigned long openAndLoad(const std::string& path) {
     return values;
 }
 
-// In a process of its own, so that no run finds the memory of another.
+// Measures in a process of its own, so that runs do not affect each other's memory.
 Measurement measure(const std::string& path) {
     int ends[2];
     if (pipe(ends) != 0) std::abort();
@@ -122,7 +123,8 @@ PackageBuilder farCorners(unsigned columns) {
     return PackageBuilder::of({"<row r='1048576'>" + cells + "</row>"});
 }
 
-// As above, each column's cell in a row of its own, so that few rows are blank in all columns.
+// Like the one above, but each column's cell is in a row of its own, so that few rows are blank in
+// all columns.
 PackageBuilder diagonal(unsigned columns) {
     std::string rows;
     for (unsigned column = 0; column < columns; ++column) {
@@ -156,7 +158,7 @@ PackageBuilder manyRelationships(unsigned count) {
                  PackageBuilder::relation("r1", "worksheet", "worksheets/sheet1.xml")));
 }
 
-// Each style has a number format of its own, and a cell that uses it.
+// Many styles, each with its own number format and a cell that uses it.
 PackageBuilder manyStyles(unsigned count) {
     const auto code = [](const std::string& i) {
         return "<numFmt numFmtId='" + i + "' formatCode='yyyy\\-mm&quot;" + i + "&quot;'/>";
@@ -171,7 +173,7 @@ PackageBuilder manyStyles(unsigned count) {
                                   repeat(count, style) + "</cellXfs></styleSheet>");
 }
 
-// A text column, for which each number is shown in its format of as many decimals as may be.
+// A text column of numbers, whose format has as many decimals as a code can have.
 PackageBuilder longFormat(unsigned rows) {
     const auto cell = [](const std::string& i) {
         return "<row><c s='0'><v>" + i + ".5</v></c></row>";
@@ -219,7 +221,7 @@ struct Case {
     const char* name;
     PackageBuilder (*build)(unsigned size);
     unsigned size;
-    double scale;  // by how much the work grows with twice the size
+    double scale;  // the factor by which the work grows when the size doubles
     unsigned long (*values)(unsigned long size);
 };
 

@@ -1,10 +1,11 @@
 // Opening, closing and clearing of workbooks beside a floor: copy and unpack the package, pull
 // every node of its parts with libxml2's reader, and append the values to one vector per column.
-// Each run is a process of its own; ours and the floor's alternate, and the medians are compared.
+// Each run is a process of its own; runs of the library and of the floor alternate, and their
+// medians are compared.
 //
-// open [RUNS] [WORKLOAD]: RUNS of each (5 by default), of all workloads but the largest, or of
-// those whose names hold WORKLOAD; "large" names the largest. Ends with 1 when a goal is missed,
-// and with 2 when a run did not do all of its work.
+// open [RUNS] [WORKLOAD]: RUNS runs (5 by default) of all workloads but the largest, or of those
+// whose names contain WORKLOAD; "large" selects the largest. Ends with 1 when a goal is missed, and
+// with 2 when a run did not do all of its work.
 
 #include <unistd.h>
 
@@ -51,12 +52,14 @@ const Goal kGoals[] = {
     {{"wide 1,000 x 2,000", Content::Numbers, 1, 1000, 2000}, 0.92, 30},
     {{"100 sheets of 1,000 x 10", Content::Mixed, 100, 1000, 10}, 0.95, 40},
     {{"small 20 x 5", Content::Mixed, 1, 20, 5}, 0, 0, 2.0},
-    {{"large 1,000,000 x 10", Content::Numbers, 1, 1000000, 10}, 0.95, 40},  // by hand
+    {{"large 1,000,000 x 10", Content::Numbers, 1, 1000000, 10},
+     0.95,
+     40},  // only when named on the command line
 };
 
 struct Measurement {
     double seconds;
-    double closing;  // seconds of them, from the closing of the file on
+    double closing;  // seconds from closing the file to the end
     double bytes;    // the process's peak
 };
 
@@ -64,8 +67,8 @@ double secondsSince(std::chrono::steady_clock::time_point start) {
     return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
 }
 
-// Runs `work`, which answers how long its closing took, in a process of its own, so that no run
-// finds the memory of another.
+// Runs `work`, which returns how long closing took, in a process of its own, so that runs do not
+// affect each other's memory.
 Measurement inProcess(const std::function<double()>& work) {
     int ends[2];
     if (pipe(ends) != 0) std::abort();
@@ -100,7 +103,7 @@ class Provider : public dp::xlsxDataProvider {
     }
 };
 
-// Opens, closes and clears; `look` sees what is in between.
+// Opens, closes and clears; `look` is called while the workbook is open.
 template <class Look>
 double openOurs(const std::string& path, unsigned long cells, const Look& look) {
     std::optional<Provider> provider(std::in_place);
@@ -120,7 +123,7 @@ double openOurs(const std::string& path, unsigned long cells) {
     return openOurs(path, cells, [](const auto&) {});
 }
 
-// Cells that came out of order are put in their places by the first column that is asked for.
+// Loads columns too, because cells filed out of order are merged when columns are first loaded.
 double openAndLoadOurs(const std::string& path, unsigned long cells) {
     return openOurs(path, cells, [cells](Provider& provider) {
         unsigned long values = 0;
@@ -294,7 +297,7 @@ Medians measure(int runs, const Work& ours, const Work& floor) {
 
 bool missed = false;  // any goal
 
-// A value beside its goal, which is none when it is 0.
+// Prints a value beside its goal; 0 means that there is none.
 void printFigure(int width, int digits, double value, double goal) {
     missed = missed || (goal > 0 && value > goal);
     std::printf(" %*.*f", width, digits, value);
@@ -312,7 +315,7 @@ void endRow() {
     std::fflush(stdout);
 }
 
-// The runs, the workloads and the files of one call of the program.
+// The runs, workloads and files of one invocation of the program.
 class Program {
   public:
     Program(int runs, std::string only, const fs::path& directory)
@@ -373,7 +376,7 @@ class Program {
         endRow();
     }
 
-    // Rows out of order beside the same rows in order.
+    // Compares rows out of order with the same rows in order.
     void orders() {
         const Workload inOrder[] = {{"100,000 x 10", Content::Numbers, 1, 100000, 10},
                                     {"1,000,000 x 2", Content::Numbers, 1, 1000000, 2}};

@@ -10,11 +10,11 @@
 #include "model/host/i_data_provider.h"
 #include "model/host/i_finders.h"
 
-// A benchmark says what it measured only if the work was done: every figure is of values that were
+// A benchmark reports a figure only if the work was done: the values behind every figure are
 // counted.
 namespace bench {
 
-// Throws when the work was not done, or not on as many values as it should.
+// Throw when the work was not done, or not on the expected number of values.
 inline void require(bool holds, const std::string& what) {
     if (!holds) throw std::runtime_error(what);
 }
@@ -24,8 +24,8 @@ inline void requireCount(unsigned long found, unsigned long expected, const std:
             what + ": " + std::to_string(found) + " instead of " + std::to_string(expected));
 }
 
-// The result of a whole program: its own, or 2 with a line on the standard error stream when
-// something was not done. A missed goal is 1.
+// Runs a program's main function and returns its exit code (1 for a missed goal); when it throws,
+// prints a line on standard error and returns 2.
 inline int resultOf(const std::function<int()>& program) {
     try {
         return program();
@@ -35,8 +35,8 @@ inline int resultOf(const std::function<int()>& program) {
     }
 }
 
-// Calls `use` with every column of every worksheet, as a host gets them; each goes afterwards
-// unless `use` takes a reference.
+// Calls `use` with every column of every worksheet, as a host gets them. Columns are released
+// afterwards unless `use` takes a reference.
 template <class Use>
 void forEachColumn(dp::IDataProvider& provider, const Use& use) {
     const auto& worksheets = *provider.GetWorksheetFinder()->GetWorksheetPrimeKeys();
@@ -53,7 +53,7 @@ void forEachColumn(dp::IDataProvider& provider, const Use& use) {
     }
 }
 
-// How many values a column has, without the missing ones.
+// The number of a column's values that are not missing.
 inline unsigned long valuesOf(const dp::IColumn& column) {
     return static_cast<unsigned long>(column.GetRowCount() - column.GetMissingCount());
 }

@@ -122,7 +122,7 @@ std::string contentType(const std::string& part, const char* type) {
            "+xml\"/>";
 }
 
-// The parts that hold the others together.
+// Adds the parts that link the others: content types, relationships, the workbook part.
 void addWorkbook(Package& package, unsigned sheets, bool sharedStrings) {
     std::string workbook(kHead);
     std::string relations = std::string(kHead).append(kRelations);
@@ -165,7 +165,7 @@ void addSharedStrings(Package& package, unsigned count) {
     package.end();
 }
 
-// A cell behind its opening `<c r="..."`.
+// The rest of a cell after `<c r="..."`.
 std::string cellRest(Content content, unsigned column, std::uint32_t random, unsigned strings) {
     const auto shared = [&] {
         return " t=\"s\"><v>" + std::to_string(random % strings) + "</v></c>";
@@ -186,7 +186,7 @@ std::string cellRest(Content content, unsigned column, std::uint32_t random, uns
     }
 }
 
-// The row numbers (1-based) as they stand in the part.
+// The row numbers (1-based) in the order in which the part has them.
 std::vector<unsigned> rowsOf(const Workload& workload) {
     std::vector<unsigned> rows(workload.rows);
     std::iota(rows.begin(), rows.end(), 1U);

@@ -2,7 +2,7 @@
 
 #include <string>
 
-// Workbooks to measure with, made on the spot and the same in every run.
+// Workbooks for measurements, generated and the same in every run.
 namespace bench {
 
 enum class Content { Numbers, Texts, Mixed };
