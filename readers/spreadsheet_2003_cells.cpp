@@ -121,7 +121,7 @@ void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) 
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
     record_.initialize();
     record_.cell.type = dataType();
-    xmlReader.readNode();
+    xml::readContent(xmlReader);
     const bool inPreview = !provider->IsPreviewing() ||
                            (row < static_cast<unsigned>(provider->GetPreviewNumberOfRows()) &&
                             column < static_cast<unsigned>(provider->GetPreviewNumberOfColumns()));

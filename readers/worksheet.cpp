@@ -139,15 +139,11 @@ class WorksheetPass {
         if (!placed) place_.beginCell(nullptr);
     }
 
-    // Moves to the text of the current element; null when it has none. Comments are skipped. Throws
-    // CmXmlException when the document ends.
+    // Moves to the text of the current element; null when it has none. Throws CmXmlException when
+    // the document ends.
     const char* readText() {
         if (xmlTextReaderIsEmptyElement(reader_.textReader) == 1) return nullptr;
-        int type = XML_READER_TYPE_COMMENT;
-        while (type == XML_READER_TYPE_COMMENT || type == XML_READER_TYPE_PROCESSING_INSTRUCTION) {
-            if (!reader_.readNode()) throw CmXmlException(kXmlError);
-            type = reader_.nodeType();
-        }
+        if (!xml::readContent(reader_)) throw CmXmlException(kXmlError);
         const char* text = reader_.nodeValue();
         return text && *text != '\0' ? text : nullptr;
     }

@@ -181,6 +181,15 @@ int readToOneOf(XmlReader& reader, const KnownNames& names) {
     return -1;
 }
 
+bool readContent(XmlReader& reader) {
+    while (reader.readNode()) {
+        const int type = reader.nodeType();
+        if (type != XML_READER_TYPE_COMMENT && type != XML_READER_TYPE_PROCESSING_INSTRUCTION)
+            return true;
+    }
+    return false;
+}
+
 int mReadForElements(XmlReader& reader, const std::vector<std::string>& names) {
     return names.empty() ? -1 : readToOneOf(reader, KnownNames(reader, names));
 }

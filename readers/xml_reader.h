@@ -113,4 +113,8 @@ DPXLSX_API int mReadForElements(XmlReader& reader, const std::vector<std::string
 // The same for names that are known already; without any it reads to the end of the document.
 int readToOneOf(XmlReader& reader, const KnownNames& names);
 
+// Moves to the next node that is content: comments and processing instructions are none. False at
+// the end of the document. Throws CmXmlException.
+bool readContent(XmlReader& reader);
+
 }  // namespace dp::xml
