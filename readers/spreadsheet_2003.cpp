@@ -51,8 +51,8 @@ void ExcelXmlReader::mReadExcelStyles() {
             if (std::string id = xmlReader.attributeText("ss:ID"); !id.empty())
                 styleId = std::move(id);
         } else if (element == kNumberFormat) {
-            if (std::string code = xmlReader.attributeText("ss:Format"); !code.empty()) {
-                if (code.size() > kFormatCodeSize) fail();
+            if (std::string code = xmlReader.attributeText("ss:Format");
+                !code.empty() && code.size() <= kFormatCodeSize) {
                 styles.push_back({std::exchange(styleId, {}), std::move(code), EXCEL_FORMAT_NONE});
                 mSetFmtType(styles.back());
             }

@@ -92,9 +92,9 @@ class StyleSheetPass {
         xStyle style;
         style.styleId = reader_.attributeText("numFmtId");
         style.formatCode = reader_.attributeText("formatCode");
-        if (style.formatCode.size() > kFormatCodeSize) throw CmXmlException(kXmlError);
         const auto size = static_cast<std::int64_t>(styles_.size());
-        if (style.formatCode.empty() || size >= std::int64_t{declared_} + kBuiltInCount) return;
+        if (size >= std::int64_t{declared_} + kBuiltInCount) return;
+        if (style.formatCode.empty() || style.formatCode.size() > kFormatCodeSize) return;
         owner_.mSetFmtType(style);
         styles_.push_back(std::move(style));
     }

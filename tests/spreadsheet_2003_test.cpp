@@ -68,7 +68,9 @@ TEST_F(Spreadsheet2003, CellsByPlaceKindAndStyle) {
         "</Style><Style ss:ID='time'><NumberFormat ss:Format='h:mm'/></Style>"
         "<Style ss:ID='fix'><NumberFormat ss:Format='Fixed'/></Style>"
         "<Style ss:ID='bare'><NumberFormat/></Style>"
-        "<Style ss:ID='both'><NumberFormat ss:Format='d/m/yy h:mm'/><NumberFormat ss:Format='0.000'/></Style>";
+        "<Style ss:ID='both'><NumberFormat ss:Format='d/m/yy h:mm'/><NumberFormat ss:Format='0.000'/></Style>"
+        "<Style ss:ID='long'><NumberFormat ss:Format='" +
+        std::string(1025, 'y') + "'/></Style>";
     for (const auto& c : caseTable("spreadsheet_2003_cells.txt")) {
         const std::string rows = std::regex_replace(c[1], std::regex("@([^ @]+) ?([^@]*)@"), number("$1", "$2"));
         EXPECT_EQ(readRows(rows, styles), c[2]) << c[0];

@@ -176,6 +176,7 @@ TRAITS = [
      r"1 date \(My Data!B2\).*\(the count of numFmts\).*'My Data!B=datetime'", 0),
     ("number-format-count", changed(STYLES, "<numFmt ", '<numFmt numFmtId="170" formatCode="0.0"/>'
      "<numFmt "), '"m/d/yyyy": day numbers arrive', 0),
+    ("not-taken-for-dates", with_format("d" * 1025), "day numbers arrive", 0),
     ("default-date-style", with_format("dd\\.mm\\.yyyy"), '"dd.mm.yyyy".*default date style', 0),
     ("default-date-style", with_format("[HH]:mm"), "values are right", 0),
     ("taken-for-dates", with_format('0.0_h"dmy"\\s*y[>5]'), "0.0_h", 0),

@@ -12,6 +12,8 @@ namespace {
 // The most that spreadsheet programs write; a hostile book must not fill the memory.
 constexpr size_t kMostStyles = 65536;
 constexpr size_t kLongestCode = 255;
+// An import leaves out longer codes, in bytes.
+constexpr size_t kLongestImported = 1024;
 
 char lower(char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; }
 
@@ -76,9 +78,9 @@ void NumberFormats::takeCode(const PartReader& reader) {
     const std::string text = reader.attribute("formatCode").value_or("");
     Code& code = codes_[number(reader.attribute("numFmtId"))];
     code.text = text.substr(0, kLongestCode);
-    if (text.empty()) return;
-    if (taken_ < declared_) code.isUncounted = false;
-    ++taken_;
+    const bool isLeftOut = text.empty() || text.size() > kLongestImported;
+    if (isLeftOut || taken_ < declared_) code.isUncounted = false;
+    if (!isLeftOut) ++taken_;
 }
 
 UsedFormat NumberFormats::of(int style) const {
