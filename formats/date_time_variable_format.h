@@ -48,9 +48,9 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
 
     bool autoFormat = true;
     unsigned dateTimeParameters[4] = {};  // the host's
-    String pattern;                       // set once, by the constructor
-    // Owned; created when the first value is rendered, hence mutable. Creating one takes as long as
-    // rendering some twenty values, and most formats never render any.
+    const String pattern;
+    // Made of the pattern. Owned; null until the first value is rendered. Making one takes as long
+    // as rendering some twenty values, and most formats never render.
     mutable icu::DateFormat* formatter = nullptr;
 };
 

@@ -8,6 +8,7 @@
 #include <random>
 #include <sstream>
 #include <string>
+#include <type_traits>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -274,6 +275,8 @@ TEST_F(VariableFormats, DateTimes) {
         EXPECT_EQ(rendered(format, c.value, true), c.expected);
         EXPECT_STREQ(format.GetFormatString()->database_str(), c.pattern.c_str());
     }
+    // The first value is rendered by the pattern of the constructor, whenever that is.
+    static_assert(!std::is_assignable_v<decltype((std::declval<DateTimeVariableFormat&>().pattern)), String>);
     for (const char* pattern : {"", "M/d/yyyy", "'", "\xFF", "jjjj"})
         for (const double value : {kNaN, kInfinity, -kInfinity, kLargest, -kLargest, 5e-324})
             rendered(DateTimeVariableFormat(pattern), value);
