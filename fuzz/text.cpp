@@ -78,8 +78,8 @@ void findPlaces(const std::string& text) {
     } catch (const CmXmlException& e) {
         require(e.code() == kXmlError, "another code");
     }
-    require(place.row() < dp::kWorksheetRows && place.column() < dp::kWorksheetColumns,
-            "a cell outside");
+    require(place.row() <= dp::kWorksheetRows && place.column() <= dp::kWorksheetColumns,
+            "a cell far outside");
 }
 
 }  // namespace

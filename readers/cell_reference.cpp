@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "readers/xml_reader.h"
+#include "readers/cm_xml_cast.h"
 
 namespace dp {
 
@@ -12,37 +12,42 @@ bool isDigit(char c) { return c >= '0' && c <= '9'; }
 
 }  // namespace
 
-void mDetermineCol(std::string_view reference, int& column) {
-    if (reference.size() < 2) throw CmXmlException(kXmlError);
-    const auto digit = std::find_if(reference.begin() + 1, reference.end(), isDigit);
-    if (digit == reference.end()) throw CmXmlException(kXmlError);
-    long value = 0;
-    for (auto letter = reference.begin(); letter != digit; ++letter) {
-        value = value * 26 + (static_cast<unsigned char>(*letter) - 64);
-        // From here on no further letter can make it a valid column again.
-        if (value > kWorksheetColumns * 26L || value < -kWorksheetColumns)
-            throw CmXmlException(kXmlError);
-    }
-    if (value < 1 || value > kWorksheetColumns) throw CmXmlException(kXmlError);
-    column = static_cast<int>(value);
+const char* mDetermineCol(const char* reference, int& column) {
+    int value = 0;
+    const char* letter = reference;
+    do {
+        if (*letter == '\0') throw CmXmlException(kXmlError);
+        // From beyond these bounds no further letter leads back to a column.
+        if (value >= -kWorksheetColumns && value <= kWorksheetColumns * 26)
+            value = value * 26 + (static_cast<unsigned char>(*letter) - 64);
+        ++letter;
+    } while (!isDigit(*letter));
+    const bool exists = value >= 1 && value <= kWorksheetColumns;
+    column = exists ? value : kWorksheetColumns + 1;
+    return letter;
 }
 
 void CellPlace::beginRow(const int* number) {
-    const int row = number ? *number : nextRow_;
-    if (row < 1 || row > kWorksheetRows) throw CmXmlException(kXmlError);
-    row_ = static_cast<unsigned>(row - 1);
-    nextRow_ = row + 1;
+    rowIsNumbered_ = number != nullptr;
+    goToRow(number ? *number : nextRow_);
     nextColumn_ = 1;
+}
+
+void CellPlace::goToRow(int number) {
+    const bool exists = number >= 1 && number <= kWorksheetRows;
+    row_ = static_cast<unsigned>(exists ? number - 1 : kWorksheetRows);
+    nextRow_ = static_cast<int>(row_) + 2;
 }
 
 void CellPlace::beginCell(const char* reference) {
     int column = nextColumn_;
-    if (reference)
-        mDetermineCol(reference, column);
-    else if (column > kWorksheetColumns)
-        throw CmXmlException(kXmlError);
+    if (reference) {
+        const char* const digits = mDetermineCol(reference, column);
+        int row = 0;
+        if (!rowIsNumbered_ && CmXmlCast::instance().mCast(row, digits)) goToRow(row);
+    }
     column_ = static_cast<unsigned>(column - 1);
-    nextColumn_ = column + 1;
+    nextColumn_ = std::min(column, kWorksheetColumns) + 1;
 }
 
 }  // namespace dp

@@ -1,27 +1,28 @@
 #pragma once
 
-#include <string_view>
+#include "readers/xml_reader.h"
 
 namespace dp {
 
-// The size of a worksheet. Readers treat cells beyond it as an error: no program writes them, and
-// work that is proportional to row and column numbers would be unbounded.
+// The size of a worksheet. Values beyond it exist in no workbook, and would make the work on rows
+// and columns as large as their numbers: readers take them for an error.
 inline constexpr int kWorksheetRows = 1'048'576;
 inline constexpr int kWorksheetColumns = 16'384;
 
-// Sets `column` to the 1-based column of a cell reference: 2 for "B7". The row digits are not read.
-// Throws CmXmlException for a reference of less than 2 characters, one without a digit behind the
-// first character, and a column beyond the last one of a worksheet.
-void mDetermineCol(std::string_view reference, int& column);
+// Sets `column` to the 1-based column of a cell reference, 2 for "B7", or to one beyond the last
+// when no worksheet has such a column. Returns where the row digits begin. Throws CmXmlException
+// for a reference of less than 2 characters and one without a digit behind the first character.
+const char* mDetermineCol(const char* reference, int& column);
 
-// The position (0-based) of the next row or cell of a worksheet: the one that it names, or else the
-// one after the previous row or cell.
+// Where the next row or cell of a worksheet goes (0-based): to the place that it names, or right
+// behind the one before it. A row without a number is where its cells say. Rows and cells may be
+// beyond the worksheet, and those right behind them are too: only values must not be there.
 class CellPlace {
   public:
     // `number` is the 1-based row that the element names, null when it names none.
-    // Throws CmXmlException for a row that no worksheet has.
     void beginRow(const int* number);
-    // `reference` is null when the cell has none. Throws CmXmlException.
+    // `reference` is null when the cell has none. Throws CmXmlException for one that names no
+    // column.
     void beginCell(const char* reference);
 
     // Of the current row and the last cell; 0 before the first ones.
@@ -29,10 +30,18 @@ class CellPlace {
     unsigned column() const { return column_; }
 
   private:
+    void goToRow(int number);
+
     unsigned row_ = 0;
     unsigned column_ = 0;
     int nextRow_ = 1;     // 1-based, like the next one
     int nextColumn_ = 1;  // of the current row
+    bool rowIsNumbered_ = true;
 };
+
+// Throws CmXmlException for a value at a place (0-based) that no worksheet has.
+inline void requireInWorksheet(unsigned row, unsigned column) {
+    if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
+}
 
 }  // namespace dp

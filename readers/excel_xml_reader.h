@@ -34,8 +34,8 @@ class DPXLSX_API ExcelXmlReader {
     // other workbooks that the provider already has. To be called before reading.
     void startAtWorksheet(int index) { worksheetIndex = index; }
 
-    // Delivers every worksheet with its cells; to be called once. A cell in a row or column that no
-    // worksheet has is an error.
+    // Delivers every worksheet with its cells; to be called once. A value in a row or column that
+    // no worksheet has is an error.
     virtual void mReadExcelWorkbook();
     // A new format for the style at `styleIndex`, owned by the caller; the automatic numeric format
     // for an index outside the table. A date-time code loses its backslashes in the table.

@@ -126,7 +126,7 @@ void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) 
                            (row < static_cast<unsigned>(provider->GetPreviewNumberOfRows()) &&
                             column < static_cast<unsigned>(provider->GetPreviewNumberOfColumns()));
     if (!hasContent || !readData(inPreview)) return;
-    if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
+    requireInWorksheet(row, column);
     record_.row = row;
     record_.column = column;
     mAddExternalDataRecord(record_, inPreview);

@@ -251,6 +251,7 @@ class WorksheetPass {
     }
 
     void deliverAt(unsigned row, unsigned column, ExternalDataRecord& record) {
+        requireInWorksheet(row, column);
         record.row = row;
         record.column = column;
         owner_.deliver(record);

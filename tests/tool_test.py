@@ -618,6 +618,8 @@ class ToolTest(unittest.TestCase):
                 "</worksheet>", '<mergeCells><mergeCell ref="A1:B2"/></mergeCells></worksheet>')}, []),
             ("a merged range of one cell", changed(SHEET, "</worksheet>", '<mergeCells><mergeCell '
              'ref="A1"/></mergeCells></worksheet>'), []),
+            ("a reference to another row than its own", {**PARTS, SHEET: SHEET_OF.format(
+                '<row r="2"><c r="A1"><v>1</v></c></row>')}, []),
             ("a hidden sheet without values", {**PARTS, SHEET: SHEET_OF.format(
                 '<row r="1"><c r="A1"><v></v></c></row>'), WORKBOOK: PARTS[WORKBOOK].replace(
                     "<sheet ", '<sheet state="hidden" ')}, []),
