@@ -24,7 +24,6 @@ void ExcelXLSXReader::mReadExcelWorkbook() {
     mReadSharedStrings();
     mReadWorkbookRelationships(xlDir, relationshipIds, relationshipTargets);
     relationshipIndex = RelationshipIndex(relationshipIds);
-    resolveNumberKinds();
     readSheets();
 }
 
@@ -47,7 +46,7 @@ void ExcelXLSXReader::readSheet(std::vector<unsigned>& emptySheets) {
     mSearchWorkbookRelationships(id, target);
     if (target.empty()) return;  // a chart sheet, say
     beginWorksheet(name);
-    mReadExcel2007Worksheet(target);
+    readWorksheet(*this, target);
     if (worksheetEmpty) emptySheets.push_back(static_cast<unsigned>(worksheetIndex - 1));
 }
 

@@ -38,16 +38,20 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     void mReadExcel2007Styles();
     // Appends the built-in number formats to the style table.
     void mAddPredefined2007Styles();
-    // Delivers the cells of the worksheet part that the relationship target names. Like the next
-    // one, for use while mReadExcelWorkbook runs.
+    // Delivers the cells of the worksheet part that the relationship target names, with the styles
+    // and shared strings as they are now. Throws CmXmlException, also for a value in a row or
+    // column that no worksheet has.
     void mReadExcel2007Worksheet(const std::string& target);
     // Copies the target of the first relationship called `id`; leaves `target` alone without one.
+    // For use while mReadExcelWorkbook runs.
     void mSearchWorkbookRelationships(const std::string& id, std::string& target);
     // Decodes the escapes by which a package writes control characters, in place.
     static void mParseCharString(std::string& text);
 
   private:
     friend class WorksheetPass;
+    // mReadExcel2007Worksheet with the number kinds as they are.
+    friend void readWorksheet(ExcelXLSXReader& reader, const std::string& target);
 
     void readSheets();
     void readSheet(std::vector<unsigned>& emptySheets);

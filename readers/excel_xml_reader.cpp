@@ -117,7 +117,7 @@ bool ExcelXmlReader::mGetFormat(unsigned column, unsigned row, int& styleIndex) 
     if (resolve(columnStyles, styleByColumn_, column)) return true;
     if (resolve(rowStyles, styleByRow_, row)) return true;
     if (!currentStyle) return false;
-    styleIndex = static_cast<int>(currentStyle - styles.data());
+    mSearchStyleIndexForFormat(currentStyleId, currentStyle, styleIndex);
     return true;
 }
 

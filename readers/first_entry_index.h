@@ -1,37 +1,67 @@
 #pragma once
 
 #include <cstddef>
+#include <limits>
 #include <unordered_map>
 #include <vector>
 
 namespace dp {
 
-// Finds the first entry of a growing list by one of its members, without walking the list for every
-// lookup. Entries may be added at any time; after any other change call forget() before the next
-// lookup.
+// Finds the first entry of a list by one of its members. By itself it walks the list, which may
+// have changed in any way since the last search. While it is in use it walks every entry once:
+// entries may then only be added.
 template <class Entry, class Key>
 class FirstEntryIndex {
   public:
+    // Lasts from one step of a reading to its end. Uses within another one are part of it.
+    class Use {
+      public:
+        explicit Use(FirstEntryIndex& index) : index_(index), outermost_(index.known_ == kUnused) {
+            if (outermost_) index_.beginAnew();
+        }
+        Use(const Use&) = delete;
+        Use& operator=(const Use&) = delete;
+        ~Use() {
+            if (!outermost_) return;
+            index_.beginAnew();
+            index_.known_ = kUnused;
+        }
+
+      private:
+        FirstEntryIndex& index_;
+        const bool outermost_;
+    };
+
     explicit FirstEntryIndex(Key Entry::*key) : key_(key) {}
+
+    Use use() { return Use(*this); }
 
     // The index of the first entry whose member equals `key`, or -1.
     std::ptrdiff_t find(const std::vector<Entry>& entries, const Key& key) {
-        if (entries.size() < known_) forget();
+        if (known_ == kUnused) return walk(entries, key);
+        if (entries.size() < known_) beginAnew();  // no answer may lie outside the list
         for (; known_ < entries.size(); ++known_) first_.try_emplace(entries[known_].*key_, known_);
         const auto found = first_.find(key);
         return found == first_.end() ? -1 : static_cast<std::ptrdiff_t>(found->second);
     }
 
-    // Makes the next lookup index all entries again.
-    void forget() {
+  private:
+    static constexpr std::size_t kUnused = std::numeric_limits<std::size_t>::max();
+
+    void beginAnew() {
         first_.clear();
         known_ = 0;
     }
 
-  private:
+    std::ptrdiff_t walk(const std::vector<Entry>& entries, const Key& key) const {
+        for (std::size_t i = 0; i < entries.size(); ++i)
+            if (entries[i].*key_ == key) return static_cast<std::ptrdiff_t>(i);
+        return -1;
+    }
+
     Key Entry::*key_;
     std::unordered_map<Key, std::size_t> first_;
-    std::size_t known_ = 0;
+    std::size_t known_ = kUnused;  // entries in `first_`
 };
 
 }  // namespace dp

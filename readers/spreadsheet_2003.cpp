@@ -28,13 +28,12 @@ bool readIndex(XmlReader& reader, unsigned& index) {
 void ExcelXmlReader::mReadExcelWorkbook() {
     const SilentLibxml2 silent;
     mReadExcelStyles();
+    const auto byId = styleById_.use();
     std::vector<unsigned> emptySheets;
     emptySheets.reserve(100);
     while (!xmlReader.endOfFile && xml::mReadForElements(xmlReader, {"Worksheet"}) != -1) {
         columnStyles.clear();
         rowStyles.clear();
-        styleByColumn_.forget();
-        styleByRow_.forget();
         mReadExcelWorksheet(emptySheets);
     }
     removeEmptyWorksheets(emptySheets);
@@ -68,6 +67,9 @@ void ExcelXmlReader::mReadExcelStyles() {
 }
 
 void ExcelXmlReader::mReadExcelWorksheet(std::vector<unsigned>& emptySheets) {
+    const auto byId = styleById_.use();
+    const auto byColumn = styleByColumn_.use();
+    const auto byRow = styleByRow_.use();
     const std::string name = xmlReader.attributeText("ss:Name");
     const int element = xml::mReadForElements(xmlReader, {"Table", "WorksheetOptions"});
     if (element == -1) fail();

@@ -111,7 +111,6 @@ void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
 }
 
 void ExcelXmlReader::setCurrentStyle(const char* id) {
-    if (currentStyle && currentStyleId == id) return;
     currentStyleId = id;
     int ignored = -1;
     mSearchStyleIndexForFormat(currentStyleId, currentStyle, ignored);

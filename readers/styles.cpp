@@ -133,6 +133,7 @@ void ExcelXLSXReader::mReadExcel2007Styles() {
         mAddPredefined2007Styles();
     }
     mReplaceDescWithFormat();
+    resolveNumberKinds();
 }
 
 }  // namespace dp

@@ -272,11 +272,16 @@ class WorksheetPass {
     ExternalDataRecord text_{0, 0, 0, 0};
 };
 
+void readWorksheet(ExcelXLSXReader& reader, const std::string& target) {
+    const std::string part = resolveTarget(reader.packageDir, target);
+    reader.repeatedParts.visit(part);
+    reader.textBudget.addPart(part);
+    WorksheetPass(reader, part).run();
+}
+
 void ExcelXLSXReader::mReadExcel2007Worksheet(const std::string& target) {
-    const std::string part = resolveTarget(packageDir, target);
-    repeatedParts.visit(part);
-    textBudget.addPart(part);
-    WorksheetPass(*this, part).run();
+    resolveNumberKinds();  // a derived reader may have changed the style table
+    readWorksheet(*this, target);
 }
 
 }  // namespace dp

@@ -71,6 +71,36 @@ TEST_F(Packages, StylesDecideNumbersAndDates) {
     }
 }
 
+// A host that links the library may take the steps of a reading by itself, and change the style
+// table between them.
+TEST_F(Packages, StepsOfAReading) {
+    class Reader : public dp::ExcelXLSXReader {
+      public:
+        using ExcelXLSXReader::ExcelXLSXReader;
+        using ExcelXLSXReader::styles;
+    };
+    const std::string cells = "<row><c s='0'><v>1</v></c><c s='1'><v>2</v></c></row>";
+    for (const auto& [name, content] : PackageBuilder::of({cells}).parts) write(name, content);
+    write("xl/styles.xml", "<styleSheet><cellXfs><xf numFmtId='14'/><xf numFmtId='164'/></cellXfs></styleSheet>");
+    RecordingProvider provider;
+    Reader reader(files().string(), false, "m/d/yy", 0, &provider, nullptr);
+    reader.mReadExcel2007Styles();
+    const auto readCells = [&] {
+        provider.AddWorksheet("S");
+        provider.SetWorksheetIndex(0);
+        provider.taken();
+        reader.mReadExcel2007Worksheet("worksheets/sheet1.xml");
+        return provider.taken();
+    };
+    EXPECT_EQ(readCells(), "0,0=d1#12 0,1=2");
+    reader.styles.push_back({"164", "yyyy", dp::EXCEL_FORMAT_DATE});
+    EXPECT_EQ(readCells(), "0,0=d1#12 0,1=d2#32") << "a style more";
+    reader.styles[3] = {"164", "0", dp::EXCEL_FORMAT_NUMBER};
+    EXPECT_EQ(readCells(), "0,0=d1#12 0,1=2#3") << "an entry before it";
+    reader.styles.clear();
+    EXPECT_EQ(readCells(), "0,0=1 0,1=2");
+}
+
 TEST_F(Packages, WorksheetsOfTheWorkbook) {
     const std::string one = "<row><c><v>1</v></c></row>";
     EXPECT_EQ(read(PackageBuilder::of({"", one, "<row><c t='e'/></row>"})), "+S1 @0 +S2 @1 0,0=1 +S3 @2 -2 -0 @0");

@@ -114,8 +114,8 @@ TEST_F(Spreadsheet2003, PreviewsDeliverPlainValuesOutside) {
 
 class StyleTable : public dp::ExcelXmlReader {
   public:
-    StyleTable(const std::string& path, dp::IDateTimeVariableFormat* helper)
-        : ExcelXmlReader(path, "yy/m/d", -99.0, nullptr, helper) {}
+    StyleTable(const std::string& path, dp::IDateTimeVariableFormat* helper, dp::IExcelDataProvider* provider = nullptr)
+        : ExcelXmlReader(path, "yy/m/d", -99.0, provider, helper) {}
 
     using ExcelXmlReader::columnStyles;
     using ExcelXmlReader::currentStyle;
@@ -226,6 +226,45 @@ TEST_F(Spreadsheet2003, DefaultStylesAreInherited) {
     EXPECT_EQ(style, &reader.styles[0]);
     EXPECT_FALSE(reader.mSearchStyleIndexForFormat("c", style, index));
     EXPECT_EQ(style, nullptr);
+}
+
+// A derived reader may do to the tables what it likes: the first entry wins, and an inherited style
+// is looked up anew.
+TEST_F(Spreadsheet2003, TablesMayChangeBetweenCalls) {
+    const std::string style = "<Style ss:ID='b'><NumberFormat ss:Format='0'/></Style>";
+    const std::string row = "<Row>" + number("1", "ss:StyleID='b'") + "</Row>";
+    StyleTable reader(write("book.xml", document(sheet(row), style)), nullptr, &provider);
+    reader.mReadExcelWorkbook();
+    EXPECT_EQ(provider.taken(), "+S @0 0,0=1#0 @0");
+    const auto found = [&reader](unsigned column, unsigned row) {
+        int index = 7;
+        const bool any = reader.mGetFormat(column, row, index);
+        EXPECT_EQ(reader.currentStyle, index < 0 ? nullptr : &reader.styles[static_cast<std::size_t>(index)]);
+        return any ? std::to_string(index) : "none";
+    };
+    const auto all = [&found] {
+        std::string indices = found(0, 9);
+        indices += " " + found(9, 0);
+        return indices + " " + found(9, 9);
+    };
+    reader.styles = {{"a", "0", 0}, {"b", "0", 0}};
+    reader.columnStyles = {{0, 0, "b"}};
+    reader.rowStyles = {{0, 0, "a"}};
+    EXPECT_EQ(all(), "1 0 0");
+    reader.styles = {{"b", "0", 0}, {"a", "0", 0}};
+    EXPECT_EQ(all(), "0 1 1") << "as many others";
+    reader.styles.insert(reader.styles.begin(), 1000, {"c", "0", 0});
+    EXPECT_EQ(found(9, 9), "1001") << "grown: the inherited style";
+    EXPECT_EQ(all(), "1000 1001 1001") << "grown";
+    reader.styles[5].styleId = "a";
+    EXPECT_EQ(all(), "1000 5 5") << "edited in place";
+    reader.styles.resize(6);
+    EXPECT_EQ(all(), "-1 5 5") << "shrunk";
+    reader.columnStyles = {{9, 0, "c"}};
+    reader.rowStyles[0].row = 9;
+    EXPECT_EQ(all(), "5 0 0") << "other columns and rows";
+    reader.styles.clear();
+    EXPECT_EQ(all(), "-1 -1 -1");
 }
 
 TEST_F(Spreadsheet2003, DateTimeTexts) {
