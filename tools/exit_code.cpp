@@ -26,7 +26,7 @@ constexpr ResultText kResultTexts[] = {
     {-22, kNoPackage,
      "is not an .xlsx package; save it as an Excel workbook (.xlsx) without a password"},
     {-25, kNoWorkbook,
-     "holds no workbook that can be read (xl/workbook.xml or xl/styles.xml is missing or broken); "
+     "holds no workbook that can be read (xl/workbook.xml or xl/styles.xml is missing or damaged); "
      "open it in a spreadsheet program and save it as .xlsx again"},
 };
 
@@ -37,7 +37,7 @@ constexpr const char* kMalformed =
     "has a part that is missing or malformed; open it in a spreadsheet program and save it as "
     ".xlsx again";
 
-// The library lets the exception of the file system pass when there is none.
+// Without one, the library lets the file system's exception through.
 bool hasTemporaryDirectory() {
     std::error_code error;
     return !std::filesystem::temp_directory_path(error).empty() && !error;
@@ -67,7 +67,8 @@ Failure currentFailure(const std::string& book) {
                                     "; check that the file and the temporary directory can be "
                                     "reached"};
     } catch (...) {
-        // The library's reader throws a type of its own, which a host cannot name.
+        // The library's reader throws a type of its own, which a host that loads the library does
+        // not know.
         return {kMalformedWorkbook, book + ": " + kMalformed};
     }
 }

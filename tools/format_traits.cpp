@@ -11,7 +11,7 @@ namespace dp::tool {
 
 namespace {
 
-// The code without the backslashes, which spreadsheet programs do not show.
+// The code as spreadsheet programs display it: without backslashes.
 std::string asDisplayed(std::string code) {
     code.erase(std::remove(code.begin(), code.end(), '\\'), code.end());
     return code;
@@ -42,8 +42,8 @@ struct Collected {
     }
 };
 
-// Those for which `matches` holds: of the format, of the library's being told a date, and of the
-// kind of the column.
+// The cells for which `matches` holds; it gets the format, whether the library takes the style for
+// a date, and the kind of the column.
 template <class Matches>
 Collected collected(const Findings& findings, const StyleAnswers& answers, Matches matches) {
     Collected result;
@@ -94,7 +94,7 @@ Found notTakenForDates(const Findings& findings, const StyleAnswers& answers) {
         "day numbers arrive", asDates(found)};
 }
 
-// An import takes no more formats than the style sheet says that it has.
+// An import reads no more formats than the style sheet declares.
 Found uncountedFormats(const Findings& findings, const StyleAnswers& answers) {
     const Collected found = collected(findings, answers, [](auto& format, auto answer, auto kind) {
         return isUnknownDate(format, answer, kind) && format.isUncounted;
@@ -102,8 +102,8 @@ Found uncountedFormats(const Findings& findings, const StyleAnswers& answers) {
     if (found.cells.count == 0) return std::nullopt;
     return Trait{"number-format-count",
                  placed(found.cells, "date") +
-                     " in formats beyond the number of them in the style sheet (the count of "
-                     "numFmts): " +
+                     " in formats beyond the number that the style sheet declares (the count "
+                     "of numFmts): " +
                      listed(found.codes, true),
                  "day numbers arrive", asDates(found) + ", or " + kSaveAgain};
 }
@@ -116,11 +116,11 @@ Found defaultDateStyle(const Findings& findings, const StyleAnswers& answers) {
     return Trait{"default-date-style",
                  placed(found.cells, "date") +
                      " in formats without a counterpart: " + listed(found.codes, true),
-                 "the values are right, the look is that of the default date style",
-                 "for a fixed look, use a format such as m/d/yyyy"};
+                 "the values are right, but are displayed in the default date style",
+                 "to choose how they are displayed, use a format such as m/d/yyyy"};
 }
 
-// The first value decides what all cells of a column are.
+// The first value decides the kind of the whole column.
 Found mixedDates(const Findings& findings, const StyleAnswers& answers) {
     Tally cells;
     for (const auto& [key, styled] : findings.styledCells) {

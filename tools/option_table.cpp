@@ -95,9 +95,9 @@ constexpr OptionRow kSheets[] = {
      "; without it the first data cell decides", values<&ReadSettings::types, columnType>},
     {"--rename", "COLUMN=NAME", "name of the variable", "; an empty NAME leaves it as it is",
      values<&ReadSettings::renamed, columnText>},
-    {"--position", "COLUMN=N", "place of the column at the host", "",
+    {"--position", "COLUMN=N", "position of the column at the host", "",
      values<&ReadSettings::positions, columnPosition>},
-    {"--max-name", "N", "longest variable name, in characters", "",
+    {"--max-name", "N", "maximum length of variable names, in characters", "",
      value<&ReadSettings::maxName, wholeFrom<1, kMostCharacters>>},
     {"--clean-sheet-names", "", "replace `? * / : < > | \" \\` in worksheet names by `_`", "",
      flag<&ReadSettings::cleanSheetNames>}};
@@ -108,7 +108,7 @@ constexpr OptionRow kMissing[] = {
     {"--missing-number", "NUMBER=NUMBER", "numbers equal to the first become the second",
      "; rows that `missing=NUMBER` fills still count as missing",
      value<&ReadSettings::missingNumber, numberForNumber>},
-    {"--missing-word", "TEXT=NUMBER", "such texts in numeric columns become a number",
+    {"--missing-word", "TEXT=NUMBER", "this text in numeric columns becomes a number",
      "; not with `--missing-number`", value<&ReadSettings::missingWord, numberForText>},
     {"--missing-text", "TEXT=TEXT", "texts equal to the first become the second", "",
      value<&ReadSettings::missingText, textForText>},
@@ -120,16 +120,16 @@ constexpr OptionRow kValues[] = {
      value<&ReadSettings::decimal, symbolValue>},
     {"--range", "MIN:MAX", "numbers outside become missing (`-1.001e18:1.001e18`)", "",
      value<&ReadSettings::range, rangeValue>},
-    {"--max-text", "N|none", "longest text and name, in bytes (80)", "; `none` for no limit",
-     value<&ReadSettings::maxText, limitValue>},
+    {"--max-text", "N|none", "maximum length of texts and names, in bytes (80)",
+     "; `none` for no limit", value<&ReadSettings::maxText, limitValue>},
     {"--clean-text", "", "trim texts, drop control characters, collapse spaces", "",
      flag<&ReadSettings::cleanText>},
     {"--dates-as-text", "", "read date-times as their displayed texts", "",
      flag<&ReadSettings::datesAsText>},
-    {"--true", "TEXT", "text of a Boolean that holds (TRUE)",
+    {"--true", "TEXT", "text of a true Boolean (TRUE)",
      "; workbooks deliver Booleans as 1 and 0, so nothing in an .xlsx file shows it",
      value<&ReadSettings::trueText, textValue>},
-    {"--false", "TEXT", "text of a Boolean that does not hold (FALSE)", "; see `--true`",
+    {"--false", "TEXT", "text of a false Boolean (FALSE)", "; see `--true`",
      value<&ReadSettings::falseText, textValue>}};
 
 constexpr OptionRow kProgram[] = {
@@ -142,9 +142,9 @@ constexpr OptionGroup kGroups[] = {
     {"What to show", "", "", kOutput},
     {"Rows", "", "", kRows},
     {"Worksheets and columns", "COLUMN is C, 3 or SHEET!C",
-     "COLUMN is a letter, a number from 1, or `SHEET!C` for one worksheet; without a worksheet the "
-     "option holds for all, and passes over those that have no such column. A column that the "
-     "named worksheet does not have is wrong usage.",
+     "COLUMN is a letter, a number from 1, or `SHEET!C` for one worksheet. Without a worksheet the "
+     "option applies to every worksheet that has such a column. Naming a column that the named "
+     "worksheet does not have is wrong usage.",
      kSheets},
     {"Missing values", "NUMBER is a number or the word missing",
      "NUMBER is a number or the word `missing`.", kMissing},

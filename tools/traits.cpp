@@ -59,10 +59,10 @@ Found isoDates(const Findings& findings) {
     if (findings.isoDates.count == 0) return std::nullopt;
     return Trait{"iso-dates",
                  placed(findings.isoDates, "date") + " written as ISO text",
-                 "only the number at the beginning arrives, of a date the year",
+                 "only the number at the beginning arrives: the year of a date",
                  "save the book as an ordinary .xlsx, not in the strict variant of the format",
                  false,
-                 "of dates written as ISO text only the number of the year arrives"};
+                 "of dates written as ISO text only the year arrives, as a number"};
 }
 
 Found datesFrom1904(const Findings& findings) {
@@ -101,8 +101,8 @@ constexpr const char* kSaveAsWorkbook = "open it in a spreadsheet program and sa
 constexpr OtherFile kOtherFiles[] = {
     {FileKind::PasswordProtected, "password-protected", "the book is protected with a password",
      "save it without one"},
-    {FileKind::OldWorkbook, "old-workbook", "the file is a binary workbook of old (.xls)",
-     kSaveAsWorkbook},
+    {FileKind::OldWorkbook, "old-workbook",
+     "the file is a workbook in the old binary format (.xls)", kSaveAsWorkbook},
     {FileKind::OtherCompound, "not-a-package",
      "the file is a document of an old office program, not a workbook", kSaveAsWorkbook},
     {FileKind::Spreadsheet2003, "spreadsheet-2003", "the file is an XML Spreadsheet 2003 document",
@@ -134,7 +134,7 @@ Found otherFile(const Findings& findings) {
     }
     if (findings.namedXlsx) return std::nullopt;
     return Trait{"other-name", "the file's name does not end in .xlsx", kOpenFails,
-                 "copy it under such a name", true};
+                 "copy it to a name that does", true};
 }
 
 Found noStyleSheet(const Findings& findings) {
@@ -160,11 +160,12 @@ Found movedParts(const Findings& findings) {
 Found shownInTexts(const Findings& findings) {
     const Tally& cells = findings.lost.shown;
     if (cells.empty()) return std::nullopt;
-    return Trait{"shown-in-texts",
-                 counted(cells.total(), "number or date", "numbers or dates") +
-                     " in columns of texts: " + cells.text(cells.columns()),
-                 "they arrive as displayed, without what their formats leave out",
-                 "give them columns of their own, or formats that show all of them"};
+    return Trait{
+        "shown-in-texts",
+        counted(cells.total(), "number or date", "numbers or dates") +
+            " in columns of texts: " + cells.text(cells.columns()),
+        "they arrive as displayed: what their formats do not show is lost",
+        "put them into columns of their own, or give them formats that show all of the value"};
 }
 
 Found formulas(const Findings& findings) {
@@ -187,7 +188,7 @@ Found mergedCells(const Findings& findings) {
     if (findings.mergedRanges.count == 0) return std::nullopt;
     return Trait{"merged-cells", placed(findings.mergedRanges, "merged range"),
                  "only the top left cell of each has a value, the others are missing",
-                 "unmerge the ranges and fill their cells where the value stands for all"};
+                 "unmerge the ranges and fill their cells where the value applies to all of them"};
 }
 
 Found phoneticTexts(const Findings& findings) {
@@ -196,7 +197,7 @@ Found phoneticTexts(const Findings& findings) {
     if (findings.phoneticTexts.count > 0) {
         found.push_back(placed(findings.phoneticTexts, "cell") +
                         " with phonetic readings in a shared text");
-        effects.emplace_back("the readings follow the texts");
+        effects.emplace_back("the readings are appended to the texts");
     }
     if (findings.phoneticCells.count > 0) {
         found.push_back(placed(findings.phoneticCells, "inline text") + " with phonetic readings");
@@ -211,7 +212,7 @@ Found errorCells(const Findings& findings) {
     if (findings.errors.count == 0) return std::nullopt;
     return Trait{"error-cells", placed(findings.errors, "cell") + " with an error such as #DIV/0!",
                  "a missing value arrives, or no row where it is the last of its column",
-                 "mend the formula where a value is expected"};
+                 "correct the formula where a value is expected"};
 }
 
 Found hiddenWorksheets(const Findings& findings) {
@@ -240,14 +241,14 @@ Found cdataTexts(const Findings& findings) {
     if (findings.cdataTexts.count == 0) return std::nullopt;
     return Trait{"cdata-texts",
                  placed(findings.cdataTexts, "cell") + " with a shared text in CDATA sections",
-                 "what stands in them is missing", kSaveAgain};
+                 "the content of the sections is missing", kSaveAgain};
 }
 
 Found piecesOfValues(const Findings& findings) {
     if (findings.pieces.count == 0) return std::nullopt;
     return Trait{"values-in-pieces",
                  placed(findings.pieces, "cell") +
-                     " with a value or text that CDATA sections or comments divide",
+                     " with a value or text divided by CDATA sections or comments",
                  "only the first piece arrives", kSaveAgain};
 }
 
@@ -261,7 +262,7 @@ Found booleanWords(const Findings& findings) {
 Found notNumbers(const Findings& findings) {
     if (findings.notNumbers.count == 0) return std::nullopt;
     return Trait{"not-a-number",
-                 placed(findings.notNumbers, "cell") + " of numbers with " +
+                 placed(findings.notNumbers, "cell") + " of type number with " +
                      (findings.notNumbers.count == 1 ? "" : "texts such as ") +
                      quoted(findings.notNumber),
                  "the number at the beginning of such a text arrives, or 0",
@@ -298,7 +299,7 @@ Found longTexts(const Findings& findings) {
     return Trait{"long-texts",
                  counted(texts.total(), "text") + " longer than " +
                      std::to_string(findings.textLimit) + " bytes: " + texts.text(texts.columns()),
-                 "what is longer is cut off",
+                 "the rest is cut off",
                  "to keep all of it: --max-text " + std::to_string(findings.lost.longest)};
 }
 
@@ -317,7 +318,7 @@ std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answer
     add(traits, shownInTexts(findings));
     add(traits, formulas(findings));
     add(traits, numbersAsNames(findings));
-    if (!findings.stylesPrefixed) {  // else that explains what becomes of the formats
+    if (!findings.stylesPrefixed) {  // otherwise the prefix explains what happens to the formats
         add(traits, takenForDates(findings, answers));
         add(traits, notTakenForDates(findings, answers));
         add(traits, uncountedFormats(findings, answers));
@@ -350,8 +351,8 @@ Trait unreadableTrait(const Findings& findings, int code) {
         return {"unreadable", quoted(findings.broken.front()) + " is missing or damaged",
                 kOpenFails, "get a fresh copy, or " + std::string(kSaveAgain), true};
     }
-    return {"unreadable", "a part of the package holds what an import cannot read", kOpenFails,
-            kSaveAgain, true};
+    return {"unreadable", "a part of the package has content that an import cannot read",
+            kOpenFails, kSaveAgain, true};
 }
 
 }  // namespace dp::tool
