@@ -1,5 +1,4 @@
-# What `cmake --install` lays down, and the Debian package made of it. The version is that of
-# project(); nothing here repeats it.
+# What `cmake --install` installs, and the Debian package made of it. The version is that of project().
 include(GNUInstallDirs)
 include(CMakePackageConfigHelpers)
 

@@ -1,5 +1,5 @@
-"""processes_test.py TOOL WORKBOOK: processes that import the same workbook at once do not see each
-other: each prints what a single one prints, and nothing is left in the temporary directory."""
+"""processes_test.py TOOL WORKBOOK: processes that import the same workbook at once do not affect
+each other: each prints what a single one prints, and nothing is left in the temporary directory."""
 
 import os
 import subprocess

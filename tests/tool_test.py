@@ -207,7 +207,7 @@ TRAITS = [
     ("unreadable", changed(SHEET, "</sheetData>", ""), '"xl/worksheets/sheet1.xml" is .*damaged', 13),
     ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
 ]
-# Those that a plain import tells of when it goes well.
+# The traits that a plain import mentions when it succeeds.
 WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904",
          "shared-strings-missing", "worksheet-without-part")
 
