@@ -49,8 +49,9 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
     bool autoFormat = true;
     unsigned dateTimeParameters[4] = {};  // the host's
     const String pattern;
-    // Made of the pattern. Owned; null until the first value is rendered. Making one takes as long
-    // as rendering some twenty values, and most formats never render.
+    // Made from the pattern when the first value is rendered, hence mutable; owned, null until
+    // then. Creating one takes as long as rendering some twenty values, and most formats never
+    // render any.
     mutable icu::DateFormat* formatter = nullptr;
 };
 

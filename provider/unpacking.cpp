@@ -64,7 +64,7 @@ class OutputFile {
     int descriptor_;
 };
 
-// What an archive claims to hold. Its entries unpack to no more bytes than they claim.
+// The contents that an archive claims. Entries never unpack to more bytes than they claim.
 struct Claims {
     std::uint64_t entries = 0;
     std::uint64_t bytes = 0;  // saturates

@@ -43,7 +43,8 @@ void ExcelDataProviderBase::AddWorksheet(const char* name) {
     makeRoomForOne(_worksheetNames);
     makeRoomForOne(_cells);
     makeRoomForOne(keys);
-    // Equal texts of all worksheets are kept once, until the last worksheet goes.
+    // All worksheets share one pool, so that equal texts are kept once; it is destroyed with the
+    // last worksheet.
     const std::shared_ptr<TextPool> texts =
         _cells.empty() ? std::make_shared<TextPool>() : _cells.back().texts();
     _worksheetNames.push_back(std::move(title));

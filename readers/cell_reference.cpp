@@ -17,7 +17,7 @@ const char* mDetermineCol(const char* reference, int& column) {
     const char* letter = reference;
     do {
         if (*letter == '\0') throw CmXmlException(kXmlError);
-        // From beyond these bounds no further letter leads back to a column.
+        // Beyond these bounds no further letter can lead back to a valid column.
         if (value >= -kWorksheetColumns && value <= kWorksheetColumns * 26)
             value = value * 26 + (static_cast<unsigned char>(*letter) - 64);
         ++letter;

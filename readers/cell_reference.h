@@ -4,8 +4,8 @@
 
 namespace dp {
 
-// The size of a worksheet. Values beyond it exist in no workbook, and would make the work on rows
-// and columns as large as their numbers: readers take them for an error.
+// The size of a worksheet. Readers treat values beyond it as an error: no program writes them, and
+// work that is proportional to row and column numbers would be unbounded.
 inline constexpr int kWorksheetRows = 1'048'576;
 inline constexpr int kWorksheetColumns = 16'384;
 
@@ -14,9 +14,9 @@ inline constexpr int kWorksheetColumns = 16'384;
 // for a reference of less than 2 characters and one without a digit behind the first character.
 const char* mDetermineCol(const char* reference, int& column);
 
-// Where the next row or cell of a worksheet goes (0-based): to the place that it names, or right
-// behind the one before it. A row without a number is where its cells say. Rows and cells may be
-// beyond the worksheet, and those right behind them are too: only values must not be there.
+// The position (0-based) of the next row or cell of a worksheet: the one that it names, or else the
+// one after the previous row or cell. A row without a number takes it from the references of its
+// cells. Positions may be beyond the worksheet, as long as there is no value.
 class CellPlace {
   public:
     // `number` is the 1-based row that the element names, null when it names none.
@@ -39,7 +39,7 @@ class CellPlace {
     bool rowIsNumbered_ = true;
 };
 
-// Throws CmXmlException for a value at a place (0-based) that no worksheet has.
+// Throws CmXmlException for a position (0-based) that no worksheet has.
 inline void requireInWorksheet(unsigned row, unsigned column) {
     if (row >= kWorksheetRows || column >= kWorksheetColumns) throw CmXmlException(kXmlError);
 }

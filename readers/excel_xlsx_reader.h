@@ -38,9 +38,9 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     void mReadExcel2007Styles();
     // Appends the built-in number formats to the style table.
     void mAddPredefined2007Styles();
-    // Delivers the cells of the worksheet part that the relationship target names, with the styles
-    // and shared strings as they are now. Throws CmXmlException, also for a value in a row or
-    // column that no worksheet has.
+    // Delivers the cells of the worksheet part that the relationship target names, with the current
+    // styles and shared strings. Throws CmXmlException, also for a value in a row or column that no
+    // worksheet has.
     void mReadExcel2007Worksheet(const std::string& target);
     // Copies the target of the first relationship called `id`; leaves `target` alone without one.
     // For use while mReadExcelWorkbook runs.
@@ -50,7 +50,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
 
   private:
     friend class WorksheetPass;
-    // mReadExcel2007Worksheet with the number kinds as they are.
+    // Like mReadExcel2007Worksheet, but with the number kinds determined before.
     friend void readWorksheet(ExcelXLSXReader& reader, const std::string& target);
 
     void readSheets();

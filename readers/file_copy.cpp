@@ -18,7 +18,8 @@ bool copyFile(const std::string& source, const std::string& target) {
         if (error) return false;
         fs::copy_file(from, to, fs::copy_options::none, error);
         if (error == std::errc::file_exists) return false;
-        // A source that became shorter meanwhile is no error to the library of g++ 14 and later.
+        // The standard library of g++ 14 and later does not report an error when the source is
+        // truncated during the copy.
         if (!error && fs::file_size(to, error) < size)
             error = std::make_error_code(std::errc::io_error);
         if (!error) fs::permissions(to, fs::perms::owner_read | fs::perms::owner_write, error);

@@ -7,13 +7,14 @@
 
 namespace dp {
 
-// Finds the first entry of a list by one of its members. By itself it walks the list, which may
-// have changed in any way since the last search. While it is in use it walks every entry once:
-// entries may then only be added.
+// Finds the first entry of a list by one of its members. Normally every lookup walks the list,
+// which may have changed in any way since the last one. During a Use the entries are indexed, each
+// only once; then entries may only be appended.
 template <class Entry, class Key>
 class FirstEntryIndex {
   public:
-    // Lasts from one step of a reading to its end. Uses within another one are part of it.
+    // Enables the index for the duration of one reading step. A Use within another one does
+    // nothing.
     class Use {
       public:
         explicit Use(FirstEntryIndex& index) : index_(index), outermost_(index.known_ == kUnused) {
@@ -39,7 +40,7 @@ class FirstEntryIndex {
     // The index of the first entry whose member equals `key`, or -1.
     std::ptrdiff_t find(const std::vector<Entry>& entries, const Key& key) {
         if (known_ == kUnused) return walk(entries, key);
-        if (entries.size() < known_) beginAnew();  // no answer may lie outside the list
+        if (entries.size() < known_) beginAnew();  // the result must lie within the list
         for (; known_ < entries.size(); ++known_) first_.try_emplace(entries[known_].*key_, known_);
         const auto found = first_.find(key);
         return found == first_.end() ? -1 : static_cast<std::ptrdiff_t>(found->second);

@@ -58,8 +58,8 @@ inline constexpr std::uint64_t kLeastReading = 4096;
 // for every sheet that names the relationship.
 inline constexpr std::size_t kTargetSize = 4096;
 
-// Bytes of a number-format code; a longer one is left out. Spreadsheet programs allow 255
-// characters; every decimal of a code is one of each text that is rendered with it.
+// Bytes of a number-format code; longer codes are ignored. Spreadsheet programs allow 255
+// characters; every decimal place of a code is a character of each text rendered with it.
 inline constexpr std::size_t kFormatCodeSize = 1024;
 
 // --- The texts, while they are copied into the store ---

@@ -18,7 +18,7 @@ _xmlTextReader* openDocument(const std::string& path, const std::uint32_t& moves
 // keeps cross-references. The reader must be on the first node.
 bool declaresTooMuch(_xmlTextReader* reader);
 
-// Names of the document take no more than a limit. The reader stands on the first node.
+// Limits the memory for names of the document. The reader must be on the first node.
 void limitNames(_xmlTextReader* reader);
 
 }  // namespace dp

@@ -13,7 +13,7 @@ namespace dp {
 void mReadWorkbookRelationships(const std::string& xlDir, std::vector<std::string>& ids,
                                 std::vector<std::string>& targets);
 
-// Finds the first entry of a list of ids. The list must not change meanwhile.
+// Finds the first entry of a list of ids. The list must not change during the index's lifetime.
 class RelationshipIndex {
   public:
     RelationshipIndex() = default;

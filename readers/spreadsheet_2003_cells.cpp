@@ -131,7 +131,7 @@ void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) 
     mAddExternalDataRecord(record_, inPreview);
 }
 
-// The value of the current data, as its type has it. False when there is none.
+// Reads the value of the current data according to its type. False when there is none.
 bool ExcelXmlReader::readData(bool inPreview) {
     ExternalDataRecordCell& cell = record_.cell;
     if (cell.type == CELL_TEXT) {

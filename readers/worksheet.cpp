@@ -148,7 +148,7 @@ class WorksheetPass {
         return text && *text != '\0' ? text : nullptr;
     }
 
-    // True when the reader stands on an element that is still to be visited.
+    // True when the reader is on an element that has not been visited yet.
     bool readValue() {
         const bool empty = xmlTextReaderIsEmptyElement(reader_.textReader) == 1;
         const char* text = readText();

@@ -72,7 +72,7 @@ class DPXLSX_API XmlReader {
     // The current node's value, null when its kind has none. Valid until the next read.
     const char* nodeValue() const;
 
-    bool tempCopy = false;   // the document is a private copy that goes with the reader
+    bool tempCopy = false;   // the document is a private copy, which the destructor removes
     bool endOfFile = false;  // the last forward read came to the end of the document
   private:
     // Incremented at the start and at the end of each move: odd while the reader is moving. It is
@@ -98,7 +98,7 @@ class KnownNames {
     KnownNames() = default;
     KnownNames(XmlReader& reader, const std::vector<std::string>& names);
 
-    // The position of a name that the reader gave, -1 when it is none of these.
+    // The index of a name that the reader returned, -1 when it is not one of these.
     int find(const char* name) const;
 
   private:
@@ -113,8 +113,8 @@ DPXLSX_API int mReadForElements(XmlReader& reader, const std::vector<std::string
 // The same for names that are known already; without any it reads to the end of the document.
 int readToOneOf(XmlReader& reader, const KnownNames& names);
 
-// Moves to the next node that is content: comments and processing instructions are none. False at
-// the end of the document. Throws CmXmlException.
+// Moves to the next node of content, skipping comments and processing instructions. False at the
+// end of the document. Throws CmXmlException.
 bool readContent(XmlReader& reader);
 
 }  // namespace dp::xml

@@ -51,8 +51,8 @@ class DPXLSX_API ExternalDataRecord {
     // Sets the four numbers to 0 and the cell to its defaults.
     void initialize();
 
-    std::uint32_t reserved0;  // 0 from every reader, read by nobody
-    std::uint32_t reserved1;  // 0 from every reader, read by nobody
+    std::uint32_t reserved0;  // readers set 0, and nothing reads it
+    std::uint32_t reserved1;  // readers set 0, and nothing reads it
     std::uint32_t row;        // 0-based
     std::uint32_t column;     // 0-based
     ExternalDataRecordCell cell;

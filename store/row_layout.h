@@ -27,7 +27,7 @@ std::uint32_t lastRow(const WorksheetCells& cells);
 // The rows that a load reads, and which of them it skips.
 struct RowLayout {
     std::uint32_t firstDataRow = kNotSet;
-    std::uint32_t dataRowCount = kNotSet;  // at most so many rows
+    std::uint32_t dataRowCount = kNotSet;  // at most this many rows
     const BlankRows* blankRows = nullptr;  // null when blank rows are kept
 };
 

@@ -71,8 +71,7 @@ TEST_F(Packages, StylesDecideNumbersAndDates) {
     }
 }
 
-// A host that links the library may take the steps of a reading by itself, and change the style
-// table between them.
+// A host that links the library may call the steps of a reading itself, and change the style table between them.
 TEST_F(Packages, StepsOfAReading) {
     class Reader : public dp::ExcelXLSXReader {
       public:

@@ -228,8 +228,8 @@ TEST_F(Spreadsheet2003, DefaultStylesAreInherited) {
     EXPECT_EQ(style, nullptr);
 }
 
-// A derived reader may do to the tables what it likes: the first entry wins, and an inherited style
-// is looked up anew.
+// A derived reader may change the tables in any way: lookups find the first entry, and an inherited style is looked up
+// again.
 TEST_F(Spreadsheet2003, TablesMayChangeBetweenCalls) {
     const std::string style = "<Style ss:ID='b'><NumberFormat ss:Format='0'/></Style>";
     const std::string row = "<Row>" + number("1", "ss:StyleID='b'") + "</Row>";
