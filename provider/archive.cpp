@@ -20,8 +20,9 @@ int closeFile(voidpf file, voidpf) {
     return std::fclose(std::exchange(*static_cast<std::FILE**>(file), nullptr));
 }
 
-// Reports an unexpected end of the file as an error. Left to itself, minizip continues with stale
-// bytes (1.1) or zeros (1.3), and so opens archives that are cut short, other ones in each version.
+// Reports an unexpected end of the file as an error. Left to itself, minizip continues with the
+// preceding bytes (1.1) or zeros (1.3), and so opens archives that are cut short, other ones in
+// each version.
 int failed(voidpf, voidpf stream) {
     std::FILE* const file = static_cast<std::FILE*>(stream);
     return std::ferror(file) != 0 || std::feof(file) != 0;

@@ -25,7 +25,7 @@ namespace dp {
 enum class ColumnType : int { Numeric = 0, Text = 1, Automatic = 2 };
 
 // The provider without the file: settings, read options, the worksheets that a reader announced and
-// their cells, and the columns made of them on demand. What opens a file derives from it.
+// their cells, and the columns made of them on demand. Providers that open files derive from it.
 //
 // The order of the virtual operations and of the members is part of the binary contract; the
 // banners give the slots. One provider is used by one thread at a time; the static settings are
@@ -217,9 +217,10 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     unsigned HandleBlankRows(INumericColumn* column, unsigned key, unsigned expectedRow,
                              unsigned rowCount, CellColumn::const_iterator cell) const;
 
-    // --- Loading; the columns are new, with a reference count of 0 --- `columnIndex` and
-    // `position` are 0-based: the column's index in the sheet and its position at the host.
-    // `formatType` says how the first data cell is shown and is only read; null stands for Numeric.
+    // --- Loading; the columns are new, with a reference count of 0 ---
+    // `columnIndex` and `position` are 0-based: the column's index in the sheet and its position at
+    // the host. `formatType` says how the first data cell is shown and is only read; null stands
+    // for Numeric.
     INumericColumn* LoadNumericColumn(unsigned worksheetKey, const CellColumn& cells,
                                       unsigned columnIndex, unsigned position,
                                       const std::string& name, int key,

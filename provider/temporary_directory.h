@@ -16,8 +16,8 @@ std::string makePrivateDirectory();
 // made.
 bool makeOwnDirectory(const std::string& path);
 
-// Bytes that this process may still write into a directory; the largest number where the file
-// system does not tell.
+// Bytes that this process may still write into a directory; the largest number if the file system
+// does not say.
 std::uint64_t freeSpace(const std::string& directory);
 
 // Removes a directory with everything below it; a path that names no directory is left alone, and

@@ -11,7 +11,7 @@ inline constexpr int kWorksheetColumns = 16'384;
 
 // Sets `column` to the 1-based column of a cell reference, 2 for "B7", or to one beyond the last
 // when no worksheet has such a column. Returns where the row digits begin. Throws CmXmlException
-// for a reference of less than 2 characters and one without a digit behind the first character.
+// for a reference of less than 2 characters and for one without a digit after the first character.
 const char* mDetermineCol(const char* reference, int& column);
 
 // The position (0-based) of the next row or cell of a worksheet: the one that it names, or else the

@@ -30,8 +30,8 @@ inline constexpr std::uint64_t kSpaceCheckInterval = 16ULL << 20;
 // parts of a workbook nest about ten levels deep.
 inline constexpr int kXmlDepth = 256;
 
-// Bytes of the different names in a document, beyond which libxml2 takes no new pool for them. It
-// stops there itself in 2.9, and in 2.15 only at ten times as many.
+// Bytes of the distinct names in a document, after which libxml2 may not allocate more memory for
+// them. libxml2 2.9 has this limit itself, 2.15 has ten times as much.
 inline constexpr std::size_t kXmlNames = 10'000'000;
 
 // Bytes of one tag, comment, CDATA section or other markup, not counting what libxml2 reads ahead.

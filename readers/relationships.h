@@ -9,7 +9,8 @@
 namespace dp {
 
 // Reads the workbook's relationships to worksheets, ids and targets at the same index. Both lists
-// grow from 10 entries by doubling and keep their empty ends. Throws CmXmlException.
+// start with 10 entries and grow by doubling; unused entries at their ends are kept. Throws
+// CmXmlException.
 void mReadWorkbookRelationships(const std::string& xlDir, std::vector<std::string>& ids,
                                 std::vector<std::string>& targets);
 

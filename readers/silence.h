@@ -5,7 +5,7 @@
 
 namespace dp {
 
-// What a handler of errors is given: constant from libxml2 2.12 on.
+// The argument of error handlers, which is const since libxml2 2.12.
 #if LIBXML_VERSION >= 21200
 using XmlErrorPointer = const xmlError*;
 #else
