@@ -13,7 +13,7 @@ class DPXLSX_API TextVariableFormat : public ITextVariableFormat {
 
     FormatType GetType() const override;
     bool GetAuto() const override;
-    // A new, empty string.
+    // A new string, always empty.
     IString* FormatValue(double value, bool fullPrecision) const override;
     int GetCharacterCount() const override;
 

@@ -28,7 +28,7 @@ std::string columnLetters(unsigned number);
 // title has a character that an option or a terminal would misread.
 std::string columnReference(const std::string& title, int key, unsigned number);
 
-// None when the text is no such reference or assignment.
+// No value when the text is not a reference or assignment.
 std::optional<ColumnReference> parseColumnReference(std::string_view text);
 std::optional<ColumnAssignment> parseColumnAssignment(std::string_view text);
 

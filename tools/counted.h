@@ -4,7 +4,7 @@
 
 namespace dp::tool {
 
-// Holds one reference to an object of the library.
+// Owns one reference to an object of the library.
 template <class T>
 class Counted {
   public:

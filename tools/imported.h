@@ -15,7 +15,7 @@ struct ImportedSheet {
     unsigned firstDataRow;
     std::map<unsigned, Kind> columns;
     std::set<unsigned> leftOut;  // columns, by an option
-    std::set<unsigned> chosen;   // columns whose kind is an option's
+    std::set<unsigned> chosen;   // columns whose kind was set by an option
 };
 
 // What an import made of a book.

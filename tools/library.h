@@ -16,7 +16,7 @@ class Library {
     // one that the loader finds. Throws a Failure when none can be loaded.
     explicit Library(const std::string& path);
 
-    // The library's own name for the type of the file, empty when it is not one of its files.
+    // The library's name for the type of the file; empty when the library does not read such files.
     std::string fileType(const std::string& book) const;
     // A provider with a reference count of 0. Throws a Failure when there is none.
     IDataProvider* createProvider(const std::string& type) const;

@@ -30,8 +30,8 @@ class NumberFormats {
     void takeCode(const PartReader& reader);
 
     std::map<int, Code> codes_;   // by id
-    int declared_ = 0;            // codes, as the style sheet says
-    int taken_ = 0;               // codes, so far
+    int declared_ = 0;            // number of codes that the style sheet declares
+    int taken_ = 0;               // number of codes read so far
     std::vector<int> formatIds_;  // by cell style
 };
 

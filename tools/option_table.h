@@ -18,7 +18,7 @@ struct OptionAction {
 // made from these rows; scripts/make-option-pages renews the pages. Words in backticks are literal.
 struct OptionRow {
     const char* names;    // as the parser takes them: "--pad", "-h, --help"
-    const char* value;    // what stands for the value in the help
+    const char* value;    // placeholder of the value in the help
     const char* summary;  // fits a line of the help
     const char* more;     // what the pages add to the summary: "; not with `--names`"
     OptionAction action;
@@ -27,7 +27,7 @@ struct OptionRow {
 struct OptionGroup {
     const char* title;
     const char* note;  // about the values of several options
-    const char* text;  // what the pages say in place of the note
+    const char* text;  // the note in the pages, where there is more room
     std::span<const OptionRow> rows;
 };
 

@@ -33,7 +33,7 @@ class Package {
     std::map<std::string, std::string> byFoldedName_;
 };
 
-// An entry while it is read. Only one of a package may be alive at a time.
+// An entry that is being read. Only one for a package may exist at a time.
 class Entry {
   public:
     Entry(Package& package, const std::string& name);

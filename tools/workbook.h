@@ -16,7 +16,7 @@
 
 namespace dp::tool {
 
-// Where a worksheet's values come from. Rows are 1-based rows of the worksheet.
+// The rows of a worksheet that its values come from, 1-based.
 struct Layout {
     unsigned nameRow;       // 0 for none
     unsigned firstDataRow;  // where data starts
@@ -34,8 +34,9 @@ struct LoadedWorksheet {
     std::set<unsigned> leftOut = {};  // the numbers of the others
 };
 
-// A workbook in a provider, closed at the end so that nothing stays on disk. Its operations throw
-// a Failure when the library reports one, and let the library's own exceptions pass.
+// A workbook in a provider, which the destructor closes, so that nothing is left on disk.
+// Operations throw a Failure when the library reports one, and let the library's own exceptions
+// through.
 class Workbook {
   public:
     Workbook(const Library& library, const Options& options);
@@ -46,9 +47,10 @@ class Workbook {
     // The names of all worksheets, without reading any cell. Not while the workbook is open.
     std::vector<std::string> worksheetNames();
 
-    // Hands the settings over, reads the workbook and hands over the options of its worksheets.
+    // Passes the settings to the provider, reads the workbook, and passes the options of its
+    // worksheets.
     void open();
-    // The wanted worksheets in workbook order.
+    // The worksheets that the options select, in workbook order.
     std::vector<SheetEntry> worksheets();
     LoadedWorksheet load(const SheetEntry& sheet);
 

@@ -17,14 +17,14 @@ struct WorksheetPart {
     size_t place;  // in the book, 0-based
 };
 
-// The shared texts: how many there are, and which are written in a way that costs something.
+// The shared texts: their number, and those written in a way because of which something is lost.
 struct SharedTexts {
     size_t count = 0;
     std::vector<bool> phonetic;
     std::vector<bool> cdata;
 };
 
-// What cells refer to, and what became of them.
+// What the cells of a worksheet refer to, and what an import made of the worksheet.
 struct Tables {
     const NumberFormats* formats;  // null to leave formats out
     const SharedTexts& texts;
@@ -35,8 +35,8 @@ struct Tables {
 void inspectWorksheet(Package& package, const WorksheetPart& worksheet, const Tables& tables,
                       Findings& findings);
 
-// Notes prefixes by the first element alone, the first ISO date, and, when the import has no shared
-// texts, the first cell that wants one. `unpacked` is the same part as a file.
+// Notes only what the first element shows of prefixes, the first ISO date, and, when the import has
+// no shared texts, the first cell that needs one. `unpacked` is the same part as a file.
 void inspectWorksheetQuickly(Package& package, const WorksheetPart& worksheet,
                              const std::string& unpacked, bool hasTexts, Findings& findings);
 
