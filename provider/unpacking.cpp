@@ -14,6 +14,7 @@
 
 #include "provider/archive.h"
 #include "provider/entry_name.h"
+#include "provider/entry_reader.h"
 #include "provider/package.h"
 #include "provider/temporary_directory.h"
 #include "readers/limits.h"
@@ -25,8 +26,8 @@ namespace {
 
 namespace fs = boost::filesystem;
 
-constexpr std::size_t kBufferSize = 8192;  // bytes
-constexpr std::size_t kLongestName = 255;  // bytes; longer names are cut
+constexpr std::size_t kBufferSize = std::size_t{64} << 10;  // bytes
+constexpr std::size_t kLongestName = 255;                   // bytes; longer names are cut
 constexpr int kEntryFailed = UNZ_INTERNALERROR;
 
 // A file being written; the destructor closes it.
@@ -93,7 +94,7 @@ bool exceedsLimits(const Claims& claims, std::uint64_t packageSize, std::uint64_
 class Unpacking {
   public:
     Unpacking(unzFile archive, const std::string& archivePath, const std::string& directory)
-        : archive_(archive), archivePath_(archivePath), directory_(directory) {}
+        : archive_(archive), reader_(archive), archivePath_(archivePath), directory_(directory) {}
 
     PackageStatus run() {
         const std::uint64_t space = freeSpace(directory_);
@@ -148,10 +149,10 @@ class Unpacking {
     int unpackFile(const std::string& path) {
         boost::system::error_code error;
         if (fs::equivalent(path, archivePath_, error)) return kEntryFailed;
-        int result = unzOpenCurrentFile(archive_);
+        int result = reader_.open();
         if (result != UNZ_OK) return result;
         result = copyCurrentFile(path);
-        const int closed = unzCloseCurrentFile(archive_);
+        const int closed = reader_.close();
         return result != UNZ_OK ? result : closed;
     }
 
@@ -159,10 +160,9 @@ class Unpacking {
     int copyCurrentFile(const std::string& path) {
         OutputFile file(path);
         if (!file.isOpen()) return kEntryFailed;
-        std::array<char, kBufferSize> buffer;
         int size = 0;
-        while ((size = unzReadCurrentFile(archive_, buffer.data(), kBufferSize)) > 0)
-            if (!hasSpaceFor(size) || !file.write(buffer.data(), static_cast<std::size_t>(size)))
+        while ((size = reader_.read(buffer_.data(), buffer_.size())) > 0)
+            if (!hasSpaceFor(size) || !file.write(buffer_.data(), static_cast<std::size_t>(size)))
                 return kEntryFailed;
         if (!file.close()) return kEntryFailed;
         return size;
@@ -178,6 +178,8 @@ class Unpacking {
     }
 
     unzFile archive_;
+    EntryReader reader_;
+    std::array<char, kBufferSize> buffer_;
     const std::string& archivePath_;
     const std::string& directory_;
     std::uint64_t spareSpace_ = 0;  // bytes
