@@ -49,7 +49,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     static void mParseCharString(std::string& text);
 
   private:
-    friend class WorksheetPass;
+    friend class CellAssembler;
     // Like mReadExcel2007Worksheet, but with the number kinds determined before.
     friend void readWorksheet(ExcelXLSXReader& reader, const std::string& target);
 

@@ -5,7 +5,11 @@
 #include <boost/filesystem.hpp>
 #include <libxml/xmlreader.h>
 
+#include "readers/attributes.h"
+#include "readers/cm_xml_cast.h"
 #include "readers/excel_xlsx_reader.h"
+#include "readers/shared_string_entries.h"
+#include "store/text_cleaning.h"
 
 // The shared-string table and the escapes of its texts.
 namespace dp {
@@ -49,6 +53,8 @@ bool endsTable(const XmlReader& reader) {
     return reader.nodeType() == XML_READER_TYPE_END_ELEMENT && hasName(reader, "sst");
 }
 
+constexpr std::string_view kEscape = "_x00";  // how each begins
+
 int hexDigit(char digit) {
     if (digit >= '0' && digit <= '9') return digit - '0';
     if (digit >= 'A' && digit <= 'F') return digit - 'A' + 10;
@@ -57,33 +63,57 @@ int hexDigit(char digit) {
 
 }  // namespace
 
-void ExcelXLSXReader::mReadSharedStrings() {
-    sharedStrings.clear();
-    if (!hasSharedStrings) return;
-    const std::string path = xlDir + "/sharedStrings.xml";
+SharedStringEntries::SharedStringEntries(SharedStringTable& table, const std::string& path)
+    : table_(table), path_(path) {
+    table_.clear();
+}
+
+void SharedStringEntries::begin(const char* uniqueCount) {
+    int count = 0;
+    CmXmlCast::instance().mCast(count, uniqueCount);
+    table_.reserve(std::min(static_cast<std::size_t>(std::max(count, 0)), entriesThatFit(path_)));
+}
+
+void SharedStringEntries::endEntry() {
+    addEntry(text_);
+    text_.clear();
+}
+
+void SharedStringEntries::addEntry(std::string_view text) {
+    if (isAllSpaces(text)) return table_.add({});
+    if (text.find(kEscape) == text.npos) return table_.add(text);
+    std::string decoded(text);
+    ExcelXLSXReader::mParseCharString(decoded);
+    table_.add(decoded);
+}
+
+void readAnySharedStrings(const std::string& path, SharedStringTable& table) {
+    SharedStringEntries entries(table, path);
     XmlReader reader;
     reader.mInitialize(path);
-    textBudget.addPart(path);
-    int uniqueCount = 0;
-    if (!reader.mGotoElement("sst") || !reader.mReadAttribute(uniqueCount, "uniqueCount")) return;
-    sharedStrings.reserve(
-        std::min(static_cast<std::size_t>(std::max(uniqueCount, 0)), entriesThatFit(path)));
-
-    std::string text;
+    if (!reader.mGotoElement("sst")) return;
+    Attributes attributes(reader);
+    const char* const uniqueCount = attributes.find("uniqueCount");
+    if (!uniqueCount) return;
+    entries.begin(uniqueCount);
     while (reader.readNode() && !endsTable(reader)) {
         if (isText(reader)) {
-            if (const char* value = reader.nodeValue()) text += value;
+            if (const char* value = reader.nodeValue()) entries.addText(value);
         } else if (endsEntry(reader)) {
-            if (IsStringAllBlank(text)) text.clear();
-            mParseCharString(text);
-            sharedStrings.add(text);
-            text.clear();
+            entries.endEntry();
         }
     }
 }
 
+void ExcelXLSXReader::mReadSharedStrings() {
+    sharedStrings.clear();
+    if (!hasSharedStrings) return;
+    const std::string path = xlDir + "/sharedStrings.xml";
+    if (!readPlainSharedStrings(path, sharedStrings)) readAnySharedStrings(path, sharedStrings);
+    textBudget.addPart(path);
+}
+
 void ExcelXLSXReader::mParseCharString(std::string& text) {
-    constexpr std::string_view kEscape = "_x00";
     constexpr std::size_t kLength = 7;  // of "_x000D_"
     std::size_t escape = text.find(kEscape);
     if (escape == text.npos) return;

@@ -47,8 +47,11 @@ class Packages : public TemporaryFiles {
         "<si><t>x_x005F_y</t></si><si><t>jp</t><rPh><t>ph</t></rPh></si></sst>";
 };
 
+// A part with a comment is read in another way than one without, from the comment on.
 TEST_F(Packages, CellsByPlaceAndKind) {
-    for (const auto& c : caseTable("worksheet_cells.txt")) EXPECT_EQ(readRows(c[1]), c[2]) << c[0];
+    for (const auto& c : caseTable("worksheet_cells.txt"))
+        for (const std::string rows : {c[1], "<!---->" + c[1], c[1] + "<!---->"})
+            EXPECT_EQ(readRows(rows), c[2]) << c[0] << ": " << rows;
 }
 
 TEST_F(Packages, StylesDecideNumbersAndDates) {
@@ -125,7 +128,9 @@ TEST_F(Packages, SharedStringTables) {
     const auto package = PackageBuilder::of({"<row><c t='s'><v>0</v></c><c t='s'><v>1</v></c></row>"});
     EXPECT_EQ(readCells(package), "") << "no such part";
     for (const auto& c : caseTable("shared_strings.txt"))
-        EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", c[1])), c[2]) << c[0];
+        for (const std::string comment : {"", "<!---->"})
+            EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", comment + c[1])), c[2])
+                << c[0] << comment;
 }
 
 // A provider that runs out of memory does not receive the cells that were still waiting.
