@@ -38,6 +38,14 @@ def part(name, content):
     return bytes([PARTS.index(name)]) + content
 
 
+def sources(stem, name, content):
+    """A part that is read both ways, in windows and a few bytes at a time."""
+    if name in (PARTS[2], PARTS[4]):
+        strings = int(name == PARTS[2])
+        yield "sources", stem, bytes([strings, 0]) + content
+        yield "sources", stem + "-by-few", bytes([strings, 1 + len(content) % 7]) + content
+
+
 def entry(name, content, bits=0, extra=b""):
     """An entry of the package target: a number of its table of names, or a name."""
     which = bytes([name]) if isinstance(name, int) else bytes([255, len(name)]) + name.encode()
@@ -64,6 +72,7 @@ def seeds():
                 if known in PARTS and book.getinfo(name).file_size < LARGEST:
                     stem = f"{path.stem}-{pathlib.PurePath(name).stem}"
                     yield "part", stem, part(known, book.read(name))
+                    yield from sources(stem, known, book.read(name))
     for path in sorted((ROOT / "tests/data").glob("*.xml")):
         if path.stat().st_size < LARGEST:
             yield "spreadsheet_2003", path.stem, path.read_bytes()
@@ -75,8 +84,10 @@ def seeds():
 def seeds_of_cases():
     for i, row in enumerate(cases("worksheet_cells.txt")):
         yield "part", f"cells-{i}", part(PARTS[4], worksheet(row[1]))
+        yield from sources(f"cells-{i}", PARTS[4], worksheet(row[1]))
     for i, row in enumerate(cases("shared_strings.txt")):
         yield "part", f"strings-{i}", part(PARTS[2], row[1])
+        yield from sources(f"strings-{i}", PARTS[2], row[1])
     for i, row in enumerate(cases("styles.txt")):
         sheet = row[1].replace(b">F<", b"><numFmt numFmtId='164' formatCode='h:mm'/><")
         sheet = sheet.replace(b">X<", b"><xf numFmtId='14'/><xf numFmtId='164'/><")
