@@ -27,7 +27,8 @@ xlsxDataProvider::~xlsxDataProvider() {
 PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     removeDirectoryAndContents(_tempDirectory);
     fs::path source(textOrEmpty(fileName));
-    if (!source.has_root_directory()) source = fs::current_path() / source;
+    // Two slashes in front begin an absolute path too, though to Boost they may name a machine.
+    if (!source.native().starts_with('/')) source = fs::current_path() / source;
     if (!fs::is_regular_file(source)) return PackageStatus::SourceMissing;
     if (!hasXlsxExtension(source.string())) return PackageStatus::NotAPackage;
 

@@ -229,7 +229,7 @@ TEST_F(Opening, NeedsNoWorkingDirectory) {
     fs::create_directory(file("gone"));
     fs::current_path(file("gone"));
     fs::remove(file("gone"));
-    for (const std::string& book : {file("book.xlsx"), files().string() + "/c://book.xlsx"}) {
+    for (const std::string& book : {file("book.xlsx"), files().string() + "/c://book.xlsx", "/" + file("book.xlsx")}) {
         SCOPED_TRACE(book);
         std::vector<std::string> names;
         EXPECT_EQ(provider.GetWorksheets(book.c_str(), names), 0);
@@ -241,6 +241,7 @@ TEST_F(Opening, NeedsNoWorkingDirectory) {
         EXPECT_EQ(provider.taken(), "+S1 @0 0,0=1 @0");
         provider.ClearWorksheets();
     }
+    EXPECT_EQ(open("//no-such-book.xlsx"), -17);
     EXPECT_THROW(open("book.xlsx"), fs::filesystem_error) << "a relative name has nothing to be relative to";
     ::setenv("TMPDIR", ".", 1);
     EXPECT_THROW(open(file("book.xlsx")), fs::filesystem_error);
