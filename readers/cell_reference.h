@@ -21,8 +21,8 @@ class CellPlace {
   public:
     // `number` is the 1-based row that the element names, null when it names none.
     void beginRow(const int* number);
-    // `reference` is null when the cell has none. Throws CmXmlException for one that names no
-    // column.
+    // `reference` is null when the cell has none. Throws CmXmlException as
+    // mDetermineCol does.
     void beginCell(const char* reference);
 
     // Of the current row and the last cell; 0 before the first ones.

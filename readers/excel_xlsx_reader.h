@@ -40,7 +40,7 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     void mAddPredefined2007Styles();
     // Delivers the cells of the worksheet part that the relationship target names, with the current
     // styles and shared strings. Throws CmXmlException, also for a value in a row or column that no
-    // worksheet has.
+    // worksheet has, and when parts were read again and again, 64 MiB in all.
     void mReadExcel2007Worksheet(const std::string& target);
     // Copies the target of the first relationship called `id`; leaves `target` alone without one.
     // For use while mReadExcelWorkbook runs.

@@ -116,8 +116,8 @@ class DPXLSX_API ExcelXmlReader {
 
     XmlReader xmlReader;
     int worksheetIndex = 0;  // of the next worksheet
-    // The tables may change in any way between calls; while a workbook or a worksheet is read they
-    // may only grow.
+    // The tables may change in any way between calls; while a document or a worksheet of it is read
+    // they may only grow. What grows while a package is read is not looked at.
     std::vector<xStyle> styles;
     std::vector<xStyleRange> columnStyles;
     std::vector<xStyleRange> rowStyles;

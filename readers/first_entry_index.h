@@ -43,7 +43,10 @@ class FirstEntryIndex {
         if (entries.size() < known_) beginAnew();  // the result must lie within the list
         for (; known_ < entries.size(); ++known_) first_.try_emplace(entries[known_].*key_, known_);
         const auto found = first_.find(key);
-        return found == first_.end() ? -1 : static_cast<std::ptrdiff_t>(found->second);
+        if (found == first_.end()) return -1;
+        // An entry that is another one by now gives no wrong answer.
+        if (entries[found->second].*key_ != key) return walk(entries, key);
+        return static_cast<std::ptrdiff_t>(found->second);
     }
 
   private:

@@ -106,7 +106,6 @@ void readAnySharedStrings(const std::string& path, SharedStringTable& table) {
 }
 
 void ExcelXLSXReader::mReadSharedStrings() {
-    sharedStrings.clear();
     if (!hasSharedStrings) return;
     const std::string path = xlDir + "/sharedStrings.xml";
     if (!readPlainSharedStrings(path, sharedStrings)) readAnySharedStrings(path, sharedStrings);

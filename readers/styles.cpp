@@ -125,6 +125,7 @@ void ExcelXLSXReader::mAddPredefined2007Styles() {
 void ExcelXLSXReader::mReadExcel2007Styles() {
     XmlReader reader;
     reader.mInitialize(xlDir + "/styles.xml");
+    cellXfNumFmtIds.clear();
     StyleSheetPass pass(*this, reader, styles, cellXfNumFmtIds);
     bool more = reader.nodeType() == 1 || reader.readToElement();
     for (; more; more = reader.readToElement()) pass.visitElement();

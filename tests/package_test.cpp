@@ -50,7 +50,7 @@ class Packages : public TemporaryFiles {
 // A part with a comment is read in another way than one without, from the comment on.
 TEST_F(Packages, CellsByPlaceAndKind) {
     for (const auto& c : caseTable("worksheet_cells.txt"))
-        for (const std::string rows : {c[1], "<!---->" + c[1], c[1] + "<!---->"})
+        for (const std::string& rows : {c[1], "<!---->" + c[1], c[1] + "<!---->"})
             EXPECT_EQ(readRows(rows), c[2]) << c[0] << ": " << rows;
 }
 
@@ -81,11 +81,11 @@ TEST_F(Packages, StepsOfAReading) {
         using ExcelXLSXReader::ExcelXLSXReader;
         using ExcelXLSXReader::styles;
     };
-    const std::string cells = "<row><c s='0'><v>1</v></c><c s='1'><v>2</v></c></row>";
+    const std::string cells = "<row><c s='0'><v>1</v></c><c s='1'><v>2</v></c><c t='s'><v>0</v></c></row>";
     for (const auto& [name, content] : PackageBuilder::of({cells}).parts) write(name, content);
     write("xl/styles.xml", "<styleSheet><cellXfs><xf numFmtId='14'/><xf numFmtId='164'/></cellXfs></styleSheet>");
     RecordingProvider provider;
-    Reader reader(files().string(), false, "m/d/yy", 0, &provider, nullptr);
+    Reader reader(files().string(), true, "m/d/yy", 0, &provider, nullptr);
     reader.mReadExcel2007Styles();
     const auto readCells = [&] {
         provider.AddWorksheet("S");
@@ -101,6 +101,15 @@ TEST_F(Packages, StepsOfAReading) {
     EXPECT_EQ(readCells(), "0,0=d1#12 0,1=2#3") << "an entry before it";
     reader.styles.clear();
     EXPECT_EQ(readCells(), "0,0=1 0,1=2");
+    for (const std::string& text : {std::string("one"), std::string("two")}) {
+        write("xl/sharedStrings.xml", "<sst uniqueCount='1'><si><t>" + text + "</t></si></sst>");
+        reader.mReadSharedStrings();
+        EXPECT_EQ(readCells(), "0,0=1 0,1=2 0,2='" + text + "'") << "texts in place of those before";
+    }
+    write("xl/styles.xml",
+          "<styleSheet><cellXfs count='2'><xf numFmtId='2'/><xf numFmtId='14'/></cellXfs></styleSheet>");
+    reader.mReadExcel2007Styles();
+    EXPECT_EQ(readCells(), "0,0=1#1 0,1=d2#12 0,2='two'") << "cell formats in place of those before";
 }
 
 TEST_F(Packages, WorksheetsOfTheWorkbook) {
@@ -128,7 +137,7 @@ TEST_F(Packages, SharedStringTables) {
     const auto package = PackageBuilder::of({"<row><c t='s'><v>0</v></c><c t='s'><v>1</v></c></row>"});
     EXPECT_EQ(readCells(package), "") << "no such part";
     for (const auto& c : caseTable("shared_strings.txt"))
-        for (const std::string comment : {"", "<!---->"})
+        for (const std::string& comment : {std::string(), std::string("<!---->")})
             EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", comment + c[1])), c[2])
                 << c[0] << comment;
 }
