@@ -116,9 +116,9 @@ class Pass {
 
     void beginRow() {
         endCell();
-        const auto given = number(reader_.attribute("r"));
+        const auto given = rowNumber(reader_.attribute("r"));
         rowIsGiven_ = given.has_value();
-        row_ = static_cast<unsigned>(given.value_or(row_ + 1));
+        row_ = given.value_or(row_ + 1);
         column_ = 0;
     }
 
@@ -144,7 +144,7 @@ class Pass {
             column_ = isLowerCase_ ? columnOfImport(letters) : *column;
         }
         if (rowIsGiven_) return;
-        if (const auto row = number(reference->substr(digits))) row_ = static_cast<unsigned>(*row);
+        row_ = rowNumber(reference->substr(digits)).value_or(row_);
     }
 
     static bool isLower(char c) { return c >= 'a' && c <= 'z'; }
@@ -169,11 +169,15 @@ class Pass {
         findings_.lowerCaseFails = findings_.lowerCaseFails || fails;
     }
 
-    static std::optional<long> number(const std::optional<std::string>& text) {
-        if (!text || text->empty()) return std::nullopt;
+    // As an import reads it: the number that the text begins with, or one behind all rows for a row
+    // that no worksheet has.
+    static std::optional<unsigned> rowNumber(const std::optional<std::string>& text) {
+        if (!text) return std::nullopt;
         char* end = nullptr;
         const long value = std::strtol(text->c_str(), &end, 10);
-        return *end == '\0' && value > 0 && value < UINT_MAX ? std::optional(value) : std::nullopt;
+        if (end == text->c_str()) return std::nullopt;
+        return value > 0 && value <= kWorksheetRows ? static_cast<unsigned>(value)
+                                                    : kWorksheetRows + 1;
     }
 
     void endCell() {
@@ -323,6 +327,7 @@ class Pass {
     static constexpr size_t kLongest = 32;  // bytes of what is quoted from a cell
     static constexpr int kNoContent = -2;   // neither this nor the value plus one is a depth
     static constexpr unsigned kWorksheetColumns = 16384;
+    static constexpr unsigned kWorksheetRows = 1048576;
 
     PartReader reader_;
     const WorksheetPart& worksheet_;
@@ -346,7 +351,7 @@ class Pass {
     int inlineDepth_ = 0;  // of the inline text of the cell, 0 for none
     unsigned row_ = 0;     // 1-based
     unsigned column_ = 0;  // 1-based, where an import puts the cell
-    bool rowIsGiven_ = false;
+    bool rowIsGiven_ = true;
     bool isLowerCase_ = false;  // the reference
     bool nameIsText_ = false;
     Places numbersAsNames_;  // in the row of names
