@@ -63,7 +63,8 @@ TEST_F(PlainXmlNodes, AreNotReadNearALimit) {
     };
     for (const auto& c : kCases) {
         EXPECT_NE(read(c.plain, dp::PlainXml::kWindow).back(), '!') << c.name;
-        if (!c.beyond.empty()) EXPECT_EQ(read(c.beyond, dp::PlainXml::kWindow).back(), '!') << c.name;
+        if (c.beyond.empty()) continue;
+        EXPECT_EQ(read(c.beyond, dp::PlainXml::kWindow).back(), '!') << c.name;
     }
 }
 

@@ -114,8 +114,8 @@ TEST_F(Spreadsheet2003, PreviewsDeliverPlainValuesOutside) {
 
 class StyleTable : public dp::ExcelXmlReader {
   public:
-    StyleTable(const std::string& path, dp::IDateTimeVariableFormat* helper, dp::IExcelDataProvider* provider = nullptr)
-        : ExcelXmlReader(path, "yy/m/d", -99.0, provider, helper) {}
+    StyleTable(const std::string& path, dp::IDateTimeVariableFormat* helper, dp::IExcelDataProvider* receiver = nullptr)
+        : ExcelXmlReader(path, "yy/m/d", -99.0, receiver, helper) {}
 
     using ExcelXmlReader::columnStyles;
     using ExcelXmlReader::currentStyle;
@@ -236,9 +236,9 @@ TEST_F(Spreadsheet2003, TablesMayChangeBetweenCalls) {
     StyleTable reader(write("book.xml", document(sheet(row), style)), nullptr, &provider);
     reader.mReadExcelWorkbook();
     EXPECT_EQ(provider.taken(), "+S @0 0,0=1#0 @0");
-    const auto found = [&reader](unsigned column, unsigned row) {
+    const auto found = [&reader](unsigned column, unsigned line) {
         int index = 7;
-        const bool any = reader.mGetFormat(column, row, index);
+        const bool any = reader.mGetFormat(column, line, index);
         EXPECT_EQ(reader.currentStyle, index < 0 ? nullptr : &reader.styles[static_cast<std::size_t>(index)]);
         return any ? std::to_string(index) : "none";
     };
