@@ -184,9 +184,8 @@ QName split(std::string_view name) {
 }
 
 std::size_t slotOf(std::string_view text, std::size_t slots) {
-    return (text.size() * 31 + static_cast<unsigned char>(text.front()) * 7 +
-            static_cast<unsigned char>(text.back())) %
-           slots;
+    const auto byte = [](char c) { return std::size_t{static_cast<unsigned char>(c)}; };
+    return (text.size() * 31 + byte(text.front()) * 7 + byte(text.back())) % slots;
 }
 
 }  // namespace

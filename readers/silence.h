@@ -52,7 +52,7 @@ class SilentLibxml2 {
     }
 
     static inline constinit thread_local unsigned depth_ = 0;
-    Channels before_;  // of the outermost
+    Channels before_{};  // of the outermost
 };
 
 }  // namespace dp
