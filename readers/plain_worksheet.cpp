@@ -11,10 +11,12 @@ namespace dp {
 namespace {
 
 bool isUpper(char c) { return c >= 'A' && c <= 'Z'; }
+bool isLower(char c) { return c >= 'a' && c <= 'z'; }
 bool isDigit(char c) { return c >= '0' && c <= '9'; }
 bool isOfNumber(char c) { return isDigit(c) || c == '.' || c == '-' || c == 'E' || c == '+'; }
 
-// Goes behind `literal` when it stands at `p`. There is always a zero behind what was read.
+// Moves `p` behind `literal` if that stands there. The bytes read so far end with a zero, which is
+// in no literal.
 template <std::size_t Size>
 bool take(char*& p, const char (&literal)[Size]) {
     if (std::strncmp(p, literal, Size - 1) != 0) return false;
@@ -87,7 +89,8 @@ class PlainWorksheet {
         }
     }
 
-    // <c r="B7" s="1" t="s"><v>12</v></c>, which nearly all cells look like.
+    // <c r="B7" s="1" t="s"><v>12</v></c>, which nearly all cells look like. False, and nothing has
+    // happened, for anything else; the same cell may come by visit() then.
     bool takeCell() {
         char* p = xml_.ahead();
         if (!take(p, "<c r=\"")) return false;
@@ -98,15 +101,16 @@ class PlainWorksheet {
         char* const referenceEnd = p;
         std::string_view style;
         if (take(p, "\" s=\"")) style = takeAll(p, isDigit);
+        char* const styleEnd = p;
         std::string_view type;
-        if (take(p, "\" t=\"")) type = takeAll(p, [](char c) { return c >= 'a' && c <= 'z'; });
+        if (take(p, "\" t=\"")) type = takeAll(p, isLower);
+        char* const typeEnd = p;
         if (!take(p, "\"><v>")) return false;
         char* const value = p;
         takeAll(p, isOfNumber);
         char* const valueEnd = p;
         if (value == valueEnd || !take(p, "</v></c>")) return false;
-        *referenceEnd = *valueEnd = '\0';
-        if (!style.empty()) const_cast<char*>(style.data())[style.size()] = '\0';
+        *referenceEnd = *styleEnd = *typeEnd = *valueEnd = '\0';
         cells_.beginCell(
             std::string_view(reference, static_cast<std::size_t>(referenceEnd - reference)), type,
             style);
