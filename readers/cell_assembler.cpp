@@ -1,6 +1,7 @@
 #include "readers/cell_assembler.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <string>
 
 #include "readers/cm_xml_cast.h"

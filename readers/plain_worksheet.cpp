@@ -1,4 +1,4 @@
-#include <algorithm>
+#include <cstddef>
 #include <cstring>
 #include <optional>
 #include <string_view>

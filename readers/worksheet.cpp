@@ -1,5 +1,6 @@
-#include <cstring>
+#include <optional>
 #include <string>
+#include <string_view>
 
 #include <libxml/xmlreader.h>
 
