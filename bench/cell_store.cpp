@@ -18,7 +18,7 @@
 #include <vector>
 
 #include "bench/verify.h"
-#include "store/worksheet_cells.h"
+#include "dpxlsx/store/worksheet_cells.h"
 
 namespace {
 

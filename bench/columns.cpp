@@ -18,10 +18,10 @@
 #include <unicode/timezone.h>
 
 #include "bench/verify.h"
-#include "formats/date_time_variable_format.h"
-#include "formats/numeric_variable_format.h"
-#include "provider/excel_data_provider_base.h"
-#include "store/text_cleaning.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 namespace {
 

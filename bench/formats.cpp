@@ -18,10 +18,10 @@
 #include <unicode/timezone.h>
 
 #include "bench/verify.h"
-#include "formats/date_time_variable_format.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/style_classification.h"
-#include "model/host/i_string.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/style_classification.h"
+#include "dpxlsx/model/host/i_string.h"
 
 namespace {
 

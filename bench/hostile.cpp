@@ -24,10 +24,10 @@
 #include <boost/filesystem.hpp>
 
 #include "bench/verify.h"
-#include "model/host/i_column.h"
-#include "provider/xlsx_data_provider.h"
-#include "readers/limits.h"
-#include "readers/xml_reader.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
+#include "dpxlsx/readers/limits.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 #include "tests/package_builder.h"
 
 namespace {

@@ -29,8 +29,8 @@
 
 #include "bench/verify.h"
 #include "bench/workbooks.h"
-#include "provider/xlsx_data_provider.h"
-#include "readers/excel_xml_reader.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
+#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
 
 namespace {
 

@@ -15,9 +15,9 @@
 
 #include "bench/verify.h"
 #include "bench/workbooks.h"
-#include "model/host/i_column.h"
-#include "model/host/i_string.h"
-#include "provider/xlsx_data_provider.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 
 namespace {
 

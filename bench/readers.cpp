@@ -10,7 +10,7 @@
 #include <vector>
 
 #include "bench/verify.h"
-#include "readers/cm_xml_cast.h"
+#include "dpxlsx/readers/xml/cm_xml_cast.h"
 
 namespace {
 

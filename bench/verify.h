@@ -6,9 +6,9 @@
 #include <stdexcept>
 #include <string>
 
-#include "model/host/i_column.h"
-#include "model/host/i_data_provider.h"
-#include "model/host/i_finders.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_data_provider.h"
+#include "dpxlsx/model/host/i_finders.h"
 
 // A benchmark reports a figure only if the work was done: the values behind every figure are
 // counted.

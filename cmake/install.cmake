@@ -9,7 +9,7 @@ set(CMAKE_SKIP_INSTALL_ALL_DEPENDENCY ON)
 if(EXISTS /etc/debian_version AND CMAKE_LIBRARY_ARCHITECTURE AND CMAKE_INSTALL_LIBDIR STREQUAL "lib")
     set(CMAKE_INSTALL_LIBDIR lib/${CMAKE_LIBRARY_ARCHITECTURE})
 endif()
-set(headers_dir ${CMAKE_INSTALL_INCLUDEDIR}/dpxlsx)
+set(headers_dir ${CMAKE_INSTALL_INCLUDEDIR})
 set(config_dir ${CMAKE_INSTALL_LIBDIR}/cmake/dpxlsx)
 
 install(TARGETS dpxlsx EXPORT dpxlsx-targets LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
@@ -53,16 +53,16 @@ set(class_headers
     provider/package.h
     provider/temporary_directory.h
     provider/xlsx_data_provider.h
-    readers/cm_xml_cast.h
-    readers/excel_xlsx_reader.h
-    readers/excel_xml_reader.h
-    readers/first_entry_index.h
+    readers/xml/cm_xml_cast.h
+    readers/xlsx/excel_xlsx_reader.h
+    readers/xml2003/excel_xml_reader.h
+    readers/xml2003/first_entry_index.h
     readers/limits.h
-    readers/relationships.h
-    readers/repeated_parts.h
-    readers/shared_string_table.h
-    readers/text_budget.h
-    readers/xml_reader.h
+    readers/xlsx/relationships.h
+    readers/xlsx/repeated_parts.h
+    readers/xlsx/shared_string_table.h
+    readers/xlsx/text_budget.h
+    readers/xml/xml_reader.h
     store/blank_rows.h
     store/cell_column.h
     store/column_loading.h
@@ -77,7 +77,7 @@ set(class_headers
     store/worksheet_cells.h)
 foreach(header IN LISTS host_headers class_headers)
     cmake_path(GET header PARENT_PATH folder)
-    install(FILES ${header} DESTINATION ${headers_dir}/${folder})
+    install(FILES ${header} DESTINATION ${headers_dir}/dpxlsx/${folder})
 endforeach()
 
 # find_package(dpxlsx CONFIG) gives the target dpxlsx::dpxlsx.

@@ -1,5 +1,11 @@
 # What every target of this project is compiled and linked with.
 add_library(dpxlsx_options INTERFACE)
+# The library's headers have the paths that they have when they are installed, "dpxlsx/..."; all else
+# is found from the root.
+file(MAKE_DIRECTORY ${PROJECT_BINARY_DIR}/include)
+file(CREATE_LINK ${PROJECT_SOURCE_DIR} ${PROJECT_BINARY_DIR}/include/dpxlsx SYMBOLIC)
+target_include_directories(dpxlsx_options INTERFACE
+    ${PROJECT_BINARY_DIR}/include ${PROJECT_SOURCE_DIR})
 target_compile_options(dpxlsx_options INTERFACE
     -Wall -Wextra -Wpedantic -Wshadow -Wconversion
     # g++ 12 sees overlapping copies in the standard library's own string concatenation.

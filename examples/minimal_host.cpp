@@ -4,11 +4,11 @@
 
 #include <cstdio>
 
-#include "model/host/entry_points.h"
-#include "model/host/i_column.h"
-#include "model/host/i_data_provider.h"
-#include "model/host/i_finders.h"
-#include "model/host/i_string.h"
+#include <dpxlsx/model/host/entry_points.h>
+#include <dpxlsx/model/host/i_column.h>
+#include <dpxlsx/model/host/i_data_provider.h>
+#include <dpxlsx/model/host/i_finders.h>
+#include <dpxlsx/model/host/i_string.h>
 
 static long printColumns(dp::IDataProvider& provider, const char* book) {
     const long result = provider.OpenFile(book, dp::IDataProvider::FileAccess::Read);

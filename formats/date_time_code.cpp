@@ -2,8 +2,8 @@
 #include <string_view>
 #include <utility>
 
-#include "formats/format_codes.h"
-#include "formats/input_decimal.h"
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/formats/input_decimal.h"
 
 namespace dp {
 namespace {

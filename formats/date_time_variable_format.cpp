@@ -1,4 +1,4 @@
-#include "formats/date_time_variable_format.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
 
 #include <algorithm>
 #include <cmath>

@@ -4,9 +4,9 @@
 
 #include <unicode/uversion.h>
 
-#include "model/host/export.h"
-#include "model/host/i_variable_format.h"
-#include "model/string.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/model/host/i_variable_format.h"
+#include "dpxlsx/model/string.h"
 
 U_NAMESPACE_BEGIN
 class DateFormat;

@@ -1,4 +1,4 @@
-#include "formats/excel_to_icu.h"
+#include "dpxlsx/formats/excel_to_icu.h"
 
 #include <map>
 

@@ -1,4 +1,4 @@
-#include "formats/format_codes.h"
+#include "dpxlsx/formats/format_codes.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -6,8 +6,8 @@
 #include <stdexcept>
 #include <string_view>
 
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
 
 namespace dp {
 

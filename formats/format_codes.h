@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "formats/style.h"
-#include "model/host/export.h"
+#include "dpxlsx/formats/style.h"
+#include "dpxlsx/model/host/export.h"
 
 // Recognisers of Excel number-format codes. They accept the plain shapes that Excel's built-in
 // formats use and reject everything else; none of them fails on any text.

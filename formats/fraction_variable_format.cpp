@@ -1,10 +1,10 @@
-#include "formats/fraction_variable_format.h"
+#include "dpxlsx/formats/fraction_variable_format.h"
 
 #include <cmath>
 #include <string>
 
-#include "formats/number_text.h"
-#include "model/string.h"
+#include "dpxlsx/formats/number_text.h"
+#include "dpxlsx/model/string.h"
 
 namespace dp {
 namespace {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "model/host/export.h"
-#include "model/host/i_variable_format.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/model/host/i_variable_format.h"
 
 namespace dp {
 

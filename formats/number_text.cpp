@@ -1,4 +1,4 @@
-#include "formats/number_text.h"
+#include "dpxlsx/formats/number_text.h"
 
 #include <algorithm>
 #include <charconv>
@@ -8,7 +8,7 @@
 #include <limits>
 #include <system_error>
 
-#include "formats/input_decimal.h"
+#include "dpxlsx/formats/input_decimal.h"
 
 namespace dp {
 namespace {

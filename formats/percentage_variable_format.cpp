@@ -1,10 +1,10 @@
-#include "formats/percentage_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
 
 #include <string>
 #include <utility>
 
-#include "formats/number_text.h"
-#include "model/string.h"
+#include "dpxlsx/formats/number_text.h"
+#include "dpxlsx/model/string.h"
 
 namespace dp {
 

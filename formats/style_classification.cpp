@@ -1,14 +1,14 @@
-#include "formats/style_classification.h"
+#include "dpxlsx/formats/style_classification.h"
 
 #include <algorithm>
 #include <memory>
 #include <utility>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/excel_to_icu.h"
-#include "formats/format_codes.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/excel_to_icu.h"
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
 
 namespace dp {
 namespace {

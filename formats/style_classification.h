@@ -6,9 +6,9 @@
 #include <string_view>
 #include <vector>
 
-#include "formats/style.h"
-#include "model/host/export.h"
-#include "model/host/i_variable_format.h"
+#include "dpxlsx/formats/style.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/model/host/i_variable_format.h"
 
 // What the readers do with their style tables: classify the number-format codes, replace names and
 // locale-dependent codes by concrete ones, and build the format objects of columns.

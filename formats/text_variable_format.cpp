@@ -1,6 +1,6 @@
-#include "formats/text_variable_format.h"
+#include "dpxlsx/formats/text_variable_format.h"
 
-#include "model/string.h"
+#include "dpxlsx/model/string.h"
 
 namespace dp {
 

@@ -16,7 +16,7 @@
 #include <boost/filesystem.hpp>
 #include <libxml/parser.h>
 
-#include "readers/silence.h"
+#include "dpxlsx/readers/xml/silence.h"
 
 namespace fuzz {
 

@@ -15,10 +15,9 @@
 #include <boost/filesystem.hpp>
 #include <libxml/parser.h>
 
-#include "model/host/entry_points.h"
-#include "model/host/i_column.h"
-#include "readers/xml_reader.h"
-
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/parts.h"

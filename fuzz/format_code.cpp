@@ -5,17 +5,16 @@
 #include <string>
 #include <vector>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/excel_to_icu.h"
-#include "formats/format_codes.h"
-#include "formats/fraction_variable_format.h"
-#include "formats/number_text.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
-#include "formats/style_classification.h"
-#include "formats/text_variable_format.h"
-#include "model/host/i_string.h"
-
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/excel_to_icu.h"
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/formats/fraction_variable_format.h"
+#include "dpxlsx/formats/number_text.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/formats/style_classification.h"
+#include "dpxlsx/formats/text_variable_format.h"
+#include "dpxlsx/model/host/i_string.h"
 #include "fuzz/checks.h"
 #include "fuzz/input.h"
 

@@ -4,10 +4,9 @@
 #include <cstdlib>
 #include <cstring>
 
-#include "model/host/i_column.h"
-#include "model/host/i_string.h"
-#include "model/host/i_worksheet.h"
-
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/model/host/i_worksheet.h"
 #include "fuzz/checks.h"
 
 namespace fuzz {

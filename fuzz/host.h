@@ -4,10 +4,10 @@
 #include <string>
 #include <vector>
 
-#include "formats/date_time_variable_format.h"
-#include "model/host/i_finders.h"
-#include "provider/excel_data_provider_base.h"
-#include "readers/excel_xml_reader.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/model/host/i_finders.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
 
 // What hosts do with a provider.
 namespace fuzz {

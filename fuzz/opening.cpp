@@ -4,9 +4,8 @@
 #include <iterator>
 #include <vector>
 
-#include "model/host/entry_points.h"
-#include "readers/xml_reader.h"
-
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 

@@ -9,10 +9,9 @@
 
 #include <boost/filesystem.hpp>
 
-#include "formats/format_codes.h"
-#include "provider/package.h"
-#include "readers/excel_xlsx_reader.h"
-
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/provider/package.h"
+#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/input.h"

@@ -8,12 +8,11 @@
 #include <utility>
 #include <vector>
 
-#include "model/host/entry_points.h"
-#include "model/host/i_column.h"
-#include "model/host/i_worksheet.h"
-#include "readers/cell_reference.h"
-#include "store/external_data_record.h"
-
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/readers/worksheet_size.h"
+#include "dpxlsx/store/external_data_record.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/input.h"

@@ -14,12 +14,11 @@
 
 #include <boost/filesystem.hpp>
 
-#include "formats/format_codes.h"
-#include "readers/cell_assembler.h"
-#include "readers/excel_xlsx_reader.h"
-#include "readers/shared_string_entries.h"
-#include "readers/worksheet_sources.h"
-
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/readers/xlsx/cell_assembler.h"
+#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
+#include "dpxlsx/readers/xlsx/shared_string_entries.h"
+#include "dpxlsx/readers/xlsx/worksheet_sources.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/input.h"

@@ -7,8 +7,7 @@
 
 #include <boost/lexical_cast.hpp>
 
-#include "formats/format_codes.h"
-
+#include "dpxlsx/formats/format_codes.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 

@@ -6,14 +6,14 @@
 #include <cstdint>
 #include <string>
 
-#include "provider/entry_name.h"
-#include "readers/cell_reference.h"
-#include "readers/cm_xml_cast.h"
-#include "readers/excel_xlsx_reader.h"
-#include "store/conversion.h"
-#include "store/number_recognition.h"
-#include "store/text_cleaning.h"
-
+#include "dpxlsx/provider/entry_name.h"
+#include "dpxlsx/readers/worksheet_size.h"
+#include "dpxlsx/readers/xlsx/cell_reference.h"
+#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
+#include "dpxlsx/readers/xml/cm_xml_cast.h"
+#include "dpxlsx/store/conversion.h"
+#include "dpxlsx/store/number_recognition.h"
+#include "dpxlsx/store/text_cleaning.h"
 #include "fuzz/checks.h"
 #include "fuzz/input.h"
 

@@ -1,4 +1,4 @@
-#include "model/collections.h"
+#include "dpxlsx/model/collections.h"
 
 #include <cassert>
 

@@ -2,8 +2,8 @@
 
 #include <vector>
 
-#include "model/host/i_read_only_collection.h"
-#include "model/string.h"
+#include "dpxlsx/model/host/i_read_only_collection.h"
+#include "dpxlsx/model/string.h"
 
 namespace dp {
 

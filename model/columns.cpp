@@ -1,4 +1,4 @@
-#include "model/columns.h"
+#include "dpxlsx/model/columns.h"
 
 #include <langinfo.h>
 #include <locale.h>
@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <string>
 
-#include "model/reference_count.h"
+#include "dpxlsx/model/reference_count.h"
 
 namespace dp {
 

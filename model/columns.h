@@ -3,10 +3,10 @@
 #include <cstdint>
 #include <memory>
 
-#include "model/collections.h"
-#include "model/host/i_column.h"
-#include "model/host/i_variable_format.h"
-#include "model/string.h"
+#include "dpxlsx/model/collections.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_variable_format.h"
+#include "dpxlsx/model/string.h"
 
 // The columns that loading makes. A getter returns the field of its name where there is one. A load
 // fills the fields; afterwards only the setters of keys change any. The order of the fields and of

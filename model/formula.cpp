@@ -1,4 +1,4 @@
-#include "model/formula.h"
+#include "dpxlsx/model/formula.h"
 
 #include <cassert>
 #include <cstddef>

@@ -4,8 +4,8 @@
 #include <memory>
 #include <vector>
 
-#include "model/host/i_formula.h"
-#include "model/string.h"
+#include "dpxlsx/model/host/i_formula.h"
+#include "dpxlsx/model/string.h"
 
 // The formula objects of the host's model. An import fills none of them. A getter returns the
 // field of its name; whoever makes the object fills the fields. Field and slot order are part of

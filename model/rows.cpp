@@ -1,4 +1,4 @@
-#include "model/rows.h"
+#include "dpxlsx/model/rows.h"
 
 namespace dp {
 

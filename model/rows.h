@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "model/host/i_rows.h"
+#include "dpxlsx/model/host/i_rows.h"
 
 namespace dp {
 

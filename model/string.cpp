@@ -1,4 +1,4 @@
-#include "model/string.h"
+#include "dpxlsx/model/string.h"
 
 #include <utility>
 

@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "model/host/i_string.h"
+#include "dpxlsx/model/host/i_string.h"
 
 namespace dp {
 

@@ -1,6 +1,6 @@
-#include "model/worksheet.h"
+#include "dpxlsx/model/worksheet.h"
 
-#include "model/reference_count.h"
+#include "dpxlsx/model/reference_count.h"
 
 namespace dp {
 

@@ -2,9 +2,9 @@
 
 #include <string>
 
-#include "model/formula.h"
-#include "model/host/i_worksheet.h"
-#include "model/string.h"
+#include "dpxlsx/model/formula.h"
+#include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/model/string.h"
 
 // The worksheet objects handed to the host. A getter returns the field of its name. The provider
 // fills the key and the title of a worksheet; an import leaves all other fields at their defaults.

@@ -1,4 +1,4 @@
-#include "provider/archive.h"
+#include "dpxlsx/provider/archive.h"
 
 #include <utility>
 

@@ -1,4 +1,4 @@
-#include "model/columns.h"
+#include "dpxlsx/model/columns.h"
 
 #include <algorithm>
 #include <iterator>
@@ -6,9 +6,9 @@
 #include <numeric>
 #include <utility>
 
-#include "provider/excel_data_provider_base.h"
-#include "store/column_loading.h"
-#include "store/text_cleaning.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/column_loading.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 // Columns on demand: their keys, names and kinds, and the load itself.
 namespace dp {

@@ -1,4 +1,4 @@
-#include "provider/entry_name.h"
+#include "dpxlsx/provider/entry_name.h"
 
 #include <string_view>
 

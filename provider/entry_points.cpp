@@ -1,4 +1,4 @@
-#include "model/host/entry_points.h"
+#include "dpxlsx/model/host/entry_points.h"
 
 #include <algorithm>
 #include <cctype>
@@ -7,9 +7,9 @@
 
 #include <boost/filesystem/path.hpp>
 
-#include "model/string.h"
-#include "provider/file_type.h"
-#include "provider/xlsx_data_provider.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/provider/file_type.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 
 namespace dp {
 

@@ -1,4 +1,4 @@
-#include "provider/entry_reader.h"
+#include "dpxlsx/provider/entry_reader.h"
 
 #include <algorithm>
 #include <array>

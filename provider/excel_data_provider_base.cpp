@@ -1,6 +1,6 @@
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 
-#include "model/reference_count.h"
+#include "dpxlsx/model/reference_count.h"
 
 // Construction, reference counting and destruction of the provider.
 namespace dp {

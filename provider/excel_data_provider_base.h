@@ -6,18 +6,18 @@
 #include <string>
 #include <vector>
 
-#include "model/collections.h"
-#include "model/host/i_column.h"
-#include "model/host/i_data_provider.h"
-#include "model/host/i_finders.h"
-#include "model/host/i_variable_format.h"
-#include "model/host/i_worksheet.h"
-#include "store/blank_rows.h"
-#include "store/column_loading.h"
-#include "store/conversion.h"
-#include "store/external_data_record.h"
-#include "store/read_options.h"
-#include "store/worksheet_cells.h"
+#include "dpxlsx/model/collections.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_data_provider.h"
+#include "dpxlsx/model/host/i_finders.h"
+#include "dpxlsx/model/host/i_variable_format.h"
+#include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/store/blank_rows.h"
+#include "dpxlsx/store/column_loading.h"
+#include "dpxlsx/store/conversion.h"
+#include "dpxlsx/store/external_data_record.h"
+#include "dpxlsx/store/read_options.h"
+#include "dpxlsx/store/worksheet_cells.h"
 
 namespace dp {
 

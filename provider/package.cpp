@@ -1,11 +1,11 @@
-#include "provider/package.h"
+#include "dpxlsx/provider/package.h"
 
 #include <exception>
 
 #include <boost/filesystem.hpp>
 
-#include "readers/silence.h"
-#include "readers/xml_reader.h"
+#include "dpxlsx/readers/xml/silence.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 
 namespace dp {
 

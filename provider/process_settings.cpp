@@ -1,7 +1,7 @@
-#include "formats/input_decimal.h"
-#include "model/string.h"
-#include "provider/excel_data_provider_base.h"
-#include "store/number_recognition.h"
+#include "dpxlsx/formats/input_decimal.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/number_recognition.h"
 
 namespace dp {
 

@@ -1,7 +1,7 @@
-#include "store/read_options.h"
+#include "dpxlsx/store/read_options.h"
 
-#include "model/string.h"
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 
 // What the host asks for when worksheets and columns are read.
 namespace dp {

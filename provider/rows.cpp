@@ -1,6 +1,6 @@
-#include "model/columns.h"
-#include "provider/excel_data_provider_base.h"
-#include "store/row_layout.h"
+#include "dpxlsx/model/columns.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/row_layout.h"
 
 // Derives the rows of a worksheet from read options and stored cells. The results are kept: cells
 // and column options that come later do not change them.

@@ -1,8 +1,8 @@
 #include <string>
 #include <utility>
 
-#include "model/string.h"
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 
 // The settings of one provider.
 namespace dp {

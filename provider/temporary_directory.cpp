@@ -1,4 +1,4 @@
-#include "provider/temporary_directory.h"
+#include "dpxlsx/provider/temporary_directory.h"
 
 #include <unistd.h>
 
@@ -8,7 +8,7 @@
 
 #include <boost/filesystem.hpp>
 
-#include "readers/temporary_path.h"
+#include "dpxlsx/readers/xml/temporary_path.h"
 
 namespace dp {
 

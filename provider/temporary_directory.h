@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <string>
 
-#include "model/host/export.h"
+#include "dpxlsx/model/host/export.h"
 
 namespace dp {
 

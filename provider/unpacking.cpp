@@ -12,12 +12,12 @@
 #include <boost/filesystem.hpp>
 #include <minizip/unzip.h>
 
-#include "provider/archive.h"
-#include "provider/entry_name.h"
-#include "provider/entry_reader.h"
-#include "provider/package.h"
-#include "provider/temporary_directory.h"
-#include "readers/limits.h"
+#include "dpxlsx/provider/archive.h"
+#include "dpxlsx/provider/entry_name.h"
+#include "dpxlsx/provider/entry_reader.h"
+#include "dpxlsx/provider/package.h"
+#include "dpxlsx/provider/temporary_directory.h"
+#include "dpxlsx/provider/unpacking_limits.h"
 
 // The archive's entries, one after the other, into the private directory.
 namespace dp {

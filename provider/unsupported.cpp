@@ -1,4 +1,4 @@
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 
 // Operations of the host's interfaces that an import does not have.
 namespace dp {

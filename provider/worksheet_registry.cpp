@@ -3,10 +3,10 @@
 #include <memory>
 #include <stdexcept>
 
-#include "model/string.h"
-#include "model/worksheet.h"
-#include "provider/excel_data_provider_base.h"
-#include "store/text_cleaning.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/model/worksheet.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 // The worksheets that a reader announced: names, keys, positions, and their cells.
 namespace dp {

@@ -1,4 +1,4 @@
-#include "provider/xlsx_data_provider.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 
 #include <algorithm>
 #include <cctype>
@@ -6,12 +6,12 @@
 
 #include <boost/filesystem.hpp>
 
-#include "formats/format_codes.h"
-#include "formats/numeric_variable_format.h"
-#include "model/string.h"
-#include "provider/file_type.h"
-#include "provider/temporary_directory.h"
-#include "readers/file_copy.h"
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/provider/file_type.h"
+#include "dpxlsx/provider/temporary_directory.h"
+#include "dpxlsx/readers/xml/file_copy.h"
 
 namespace dp {
 

@@ -4,9 +4,9 @@
 #include <string>
 #include <vector>
 
-#include "provider/excel_data_provider_base.h"
-#include "provider/package.h"
-#include "readers/excel_xlsx_reader.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/provider/package.h"
+#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 
 namespace dp {
 

@@ -1,4 +1,4 @@
-#include "store/blank_rows.h"
+#include "dpxlsx/store/blank_rows.h"
 
 #include <algorithm>
 #include <array>

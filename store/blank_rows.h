@@ -4,8 +4,8 @@
 #include <functional>
 #include <vector>
 
-#include "model/host/export.h"
-#include "store/worksheet_cells.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/store/worksheet_cells.h"
 
 namespace dp {
 

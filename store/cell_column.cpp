@@ -1,4 +1,4 @@
-#include "store/cell_column.h"
+#include "dpxlsx/store/cell_column.h"
 
 #include <algorithm>
 #include <utility>

@@ -9,9 +9,9 @@
 #include <unordered_map>
 #include <vector>
 
-#include "model/host/export.h"
-#include "store/external_data_record.h"
-#include "store/text_pool.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/store/external_data_record.h"
+#include "dpxlsx/store/text_pool.h"
 
 namespace dp {
 

@@ -5,10 +5,10 @@
 #include <string>
 #include <string_view>
 
-#include "model/columns.h"
-#include "store/conversion.h"
-#include "store/read_options.h"
-#include "store/row_layout.h"
+#include "dpxlsx/model/columns.h"
+#include "dpxlsx/store/conversion.h"
+#include "dpxlsx/store/read_options.h"
+#include "dpxlsx/store/row_layout.h"
 
 // Columns built from stored cells, in one pass in row order.
 namespace dp {

@@ -1,10 +1,10 @@
-#include "store/conversion.h"
+#include "dpxlsx/store/conversion.h"
 
 #include <cstdio>
 
-#include "model/string.h"
-#include "store/number_recognition.h"
-#include "store/text_cleaning.h"
+#include "dpxlsx/model/string.h"
+#include "dpxlsx/store/number_recognition.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 namespace dp {
 

@@ -7,10 +7,10 @@
 #include <string>
 #include <string_view>
 
-#include "model/host/i_string.h"
-#include "model/host/i_variable_format.h"
-#include "store/cell_column.h"
-#include "store/external_data_record.h"
+#include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/model/host/i_variable_format.h"
+#include "dpxlsx/store/cell_column.h"
+#include "dpxlsx/store/external_data_record.h"
 
 namespace dp {
 

@@ -1,4 +1,4 @@
-#include "store/external_data_record.h"
+#include "dpxlsx/store/external_data_record.h"
 
 namespace dp {
 

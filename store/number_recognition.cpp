@@ -1,4 +1,4 @@
-#include "store/number_recognition.h"
+#include "dpxlsx/store/number_recognition.h"
 
 #include <array>
 #include <charconv>
@@ -8,7 +8,7 @@
 #include <sstream>
 #include <string_view>
 
-#include "store/text_cleaning.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 namespace dp {
 

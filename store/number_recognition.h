@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "model/host/export.h"
+#include "dpxlsx/model/host/export.h"
 
 namespace dp {
 

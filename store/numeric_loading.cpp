@@ -1,8 +1,8 @@
 #include <algorithm>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/numeric_variable_format.h"
-#include "store/column_loading.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/store/column_loading.h"
 
 namespace dp {
 

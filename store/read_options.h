@@ -4,7 +4,7 @@
 #include <map>
 #include <string>
 
-#include "model/host/i_data_provider.h"
+#include "dpxlsx/model/host/i_data_provider.h"
 
 // What the host asks for when a worksheet or a column is read.
 namespace dp {

@@ -1,4 +1,4 @@
-#include "store/row_layout.h"
+#include "dpxlsx/store/row_layout.h"
 
 #include <algorithm>
 #include <iterator>

@@ -2,9 +2,9 @@
 
 #include <cstdint>
 
-#include "store/blank_rows.h"
-#include "store/read_options.h"
-#include "store/worksheet_cells.h"
+#include "dpxlsx/store/blank_rows.h"
+#include "dpxlsx/store/read_options.h"
+#include "dpxlsx/store/worksheet_cells.h"
 
 // Derives concrete rows from the host's row options, and the value slots of a column from rows. All
 // rows are 0-based here unless said otherwise; arithmetic on rows is that of unsigned 32-bit

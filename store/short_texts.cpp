@@ -1,4 +1,4 @@
-#include "store/short_texts.h"
+#include "dpxlsx/store/short_texts.h"
 
 #include <algorithm>
 #include <chrono>

@@ -1,4 +1,4 @@
-#include "store/text_cleaning.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 #include <algorithm>
 #include <cctype>

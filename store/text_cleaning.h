@@ -3,7 +3,7 @@
 #include <string>
 #include <string_view>
 
-#include "model/host/export.h"
+#include "dpxlsx/model/host/export.h"
 
 // Cleaning of texts and names, in place. White space and control characters are those of the
 // platform's character classification, byte by byte.

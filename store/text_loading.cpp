@@ -1,8 +1,8 @@
 #include <algorithm>
 
-#include "formats/text_variable_format.h"
-#include "store/column_loading.h"
-#include "store/text_cleaning.h"
+#include "dpxlsx/formats/text_variable_format.h"
+#include "dpxlsx/store/column_loading.h"
+#include "dpxlsx/store/text_cleaning.h"
 
 namespace dp {
 

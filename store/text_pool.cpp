@@ -1,4 +1,4 @@
-#include "store/text_pool.h"
+#include "dpxlsx/store/text_pool.h"
 
 #include <bit>
 #include <cstring>

@@ -6,8 +6,8 @@
 #include <string_view>
 #include <unordered_map>
 
-#include "model/host/export.h"
-#include "store/short_texts.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/store/short_texts.h"
 
 namespace dp {
 

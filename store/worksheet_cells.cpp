@@ -1,4 +1,4 @@
-#include "store/worksheet_cells.h"
+#include "dpxlsx/store/worksheet_cells.h"
 
 #include <algorithm>
 #include <cassert>

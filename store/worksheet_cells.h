@@ -7,10 +7,10 @@
 #include <optional>
 #include <vector>
 
-#include "model/host/export.h"
-#include "store/cell_column.h"
-#include "store/external_data_record.h"
-#include "store/text_pool.h"
+#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/store/cell_column.h"
+#include "dpxlsx/store/external_data_record.h"
+#include "dpxlsx/store/text_pool.h"
 
 namespace dp {
 

@@ -1,15 +1,15 @@
 #include <algorithm>
 #include <memory>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/fraction_variable_format.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
-#include "formats/text_variable_format.h"
-#include "model/columns.h"
-#include "model/formula.h"
-#include "model/rows.h"
-#include "model/worksheet.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/fraction_variable_format.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/formats/text_variable_format.h"
+#include "dpxlsx/model/columns.h"
+#include "dpxlsx/model/formula.h"
+#include "dpxlsx/model/rows.h"
+#include "dpxlsx/model/worksheet.h"
 #include "tests/abi.h"
 
 // The objects that a host receives, seen through raw tables and memory.

@@ -3,9 +3,9 @@
 
 #include <gmock/gmock.h>
 
-#include "formats/date_time_variable_format.h"
-#include "model/host/entry_points.h"
-#include "provider/xlsx_data_provider.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 #include "tests/abi.h"
 #include "tests/provider_fixture.h"
 

@@ -1,7 +1,7 @@
 // An import library for the tests of the tool: the numbers of a workbook arrive as Booleans, which
 // no .xlsx file delivers.
-#include "model/host/entry_points.h"
-#include "provider/xlsx_data_provider.h"
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 
 namespace dp {
 namespace {

@@ -14,9 +14,9 @@
 
 #include <gtest/gtest.h>
 
-#include "store/blank_rows.h"
-#include "store/row_layout.h"
-#include "store/worksheet_cells.h"
+#include "dpxlsx/store/blank_rows.h"
+#include "dpxlsx/store/row_layout.h"
+#include "dpxlsx/store/worksheet_cells.h"
 #include "tests/allocated_bytes.h"
 
 namespace dp {

@@ -1,4 +1,4 @@
-#include "model/columns.h"
+#include "dpxlsx/model/columns.h"
 
 #include <algorithm>
 #include <functional>

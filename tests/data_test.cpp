@@ -11,14 +11,14 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-#include "formats/date_time_variable_format.h"
-#include "model/host/entry_points.h"
-#include "model/host/i_column.h"
-#include "model/host/i_finders.h"
-#include "model/host/i_string.h"
-#include "model/host/i_worksheet.h"
-#include "provider/xlsx_data_provider.h"
-#include "readers/excel_xml_reader.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/i_finders.h"
+#include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
+#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
 #include "tests/temporary_files.h"
 
 namespace {

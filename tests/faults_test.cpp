@@ -9,13 +9,12 @@
 #include <sys/statvfs.h>
 #include <utility>
 
-#include "provider/xlsx_data_provider.h"
-#include "readers/file_copy.h"
-#include "readers/limits.h"
+#include "dpxlsx/provider/unpacking_limits.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
+#include "dpxlsx/readers/xml/file_copy.h"
+#include "fuzz/zip_writer.h"
 #include "tests/package_builder.h"
 #include "tests/temporary_files.h"
-
-#include "fuzz/zip_writer.h"
 
 // Simulated faults of the machine: this program replaces functions of the C library that the library calls. Whatever
 // fails, nothing is left on the disk once the provider is closed, and the same provider can open a good workbook. Lack

@@ -8,13 +8,13 @@
 
 #include <gtest/gtest.h>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/excel_to_icu.h"
-#include "formats/format_codes.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
-#include "formats/style_classification.h"
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/excel_to_icu.h"
+#include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/formats/style_classification.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 #include "tests/case_table.h"
 
 namespace dp {

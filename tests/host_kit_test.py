@@ -33,9 +33,9 @@ target_link_libraries(linked_host dpxlsx::dpxlsx)
 
 FRAGMENT = """#include <dlfcn.h>
 #include <cstdio>
-#include "model/host/entry_points.h"
-#include "model/host/i_data_provider.h"
-#include "model/host/i_finders.h"
+#include <dpxlsx/model/host/entry_points.h>
+#include <dpxlsx/model/host/i_data_provider.h>
+#include <dpxlsx/model/host/i_finders.h>
 void fragment(dp::IDataProvider& provider);
 void fragment([[maybe_unused]] dp::IDataProvider& provider) {
 %s}
@@ -91,7 +91,7 @@ class HostKitTest(unittest.TestCase):
             cls.prefix = cls.work / "moved"
             run(CMAKE, "--install", BUILD, "--prefix", cls.work / "installed")
             (cls.work / "installed").rename(cls.prefix)  # nothing may depend on the place
-        cls.headers = cls.prefix / "include" / "dpxlsx"
+        cls.headers = cls.prefix / "include"
         pkgconfig = next(cls.prefix.glob("lib/**/pkgconfig"))
         cls.libraries = pkgconfig.parent
         cls.environment = {"PATH": os.environ["PATH"], "PKG_CONFIG_PATH": str(pkgconfig),
@@ -105,25 +105,32 @@ class HostKitTest(unittest.TestCase):
                    env={**self.environment, "LD_LIBRARY_PATH": str(self.libraries)})
 
     def test_every_header_compiles_alone(self):
-        exporting = {str(path.relative_to(SOURCE)) for folder in
+        exporting = {f"dpxlsx/{path.relative_to(SOURCE)}" for folder in
                      ("model", "formats", "store", "readers", "provider")
                      for path in SOURCE.glob(f"{folder}/**/*.h") if "DPXLSX_API" in path.read_text()}
         installed = {str(path.relative_to(self.headers)) for path in self.headers.glob("**/*.h")}
+        self.assertEqual({path.split("/")[0] for path in installed}, {"dpxlsx"})
         self.assertEqual(exporting - installed, set(), "export something, but are not installed")
 
         def compiled(job):
             compiler, header = job
-            standard = "c++17" if header.startswith("model/") else "c++20"
+            standard = "c++17" if header.startswith("dpxlsx/model/") else "c++20"
             return run(compiler, f"-std={standard}", *WARNINGS, "-fsyntax-only", "-x", "c++",
-                       "-include", header, "-I", self.headers, "/dev/null", cwd=self.work)
+                       "-include", header, "-I", own, "-I", self.headers, "/dev/null", cwd=self.work)
+
+        # A host's own files of the same names, earlier in the search.
+        own = self.work / "own"
+        for name in ("model/string.h", "store/conversion.h", "readers/limits.h", "i_string.h"):
+            (own / name).parent.mkdir(parents=True, exist_ok=True)
+            (own / name).write_text("#error the header of the host\n")
 
         jobs = [("g++", header) for header in sorted(installed)]
-        jobs += [("clang++", header) for header in sorted(installed) if header.startswith("model/host")]
+        jobs += [("clang++", header) for header in sorted(installed) if header.startswith("dpxlsx/model/host")]
         with multiprocessing.pool.ThreadPool(2) as pool:
             pool.map(compiled, jobs)
 
     def test_inline_functions_reach_what_the_library_exports(self):
-        source = "".join(f'#include "{path.relative_to(self.headers)}"\n'
+        source = "".join(f"#include <{path.relative_to(self.headers)}>\n"
                          for path in sorted(self.headers.glob("**/*.h")))
         (self.work / "inline.cpp").write_text(source + """
 int main() {
@@ -203,7 +210,7 @@ int main() {
         self.assertEqual(run(made / "dates"), "1900-01-01 1, 1900-02-28 59, 1900-03-01 61, 1950-06-30 18444, "
                          "2024-02-29 45351, no, no\n18:00:00 12:00:00\n")
         # Every operation of the provider that sets something is explained.
-        settings = set(re.findall(r"\b((?:Set|Clear)\w+)\(", (self.headers / "model/host/i_data_provider.h").read_text()))
+        settings = set(re.findall(r"\b((?:Set|Clear)\w+)\(", (self.headers / "dpxlsx/model/host/i_data_provider.h").read_text()))
         inner = {"SetWorksheetIndex"}  # is the readers' own
         self.assertEqual({name for name in settings - inner if f"{name}" not in guide}, set())
 

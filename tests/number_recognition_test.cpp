@@ -1,4 +1,4 @@
-#include "store/number_recognition.h"
+#include "dpxlsx/store/number_recognition.h"
 
 #include <bit>
 #include <cmath>

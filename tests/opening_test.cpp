@@ -3,12 +3,12 @@
 #include <algorithm>
 #include <sys/stat.h>
 
-#include "model/host/entry_points.h"
-#include "provider/entry_name.h"
-#include "provider/package.h"
-#include "provider/temporary_directory.h"
-#include "readers/file_copy.h"
-#include "readers/xml_reader.h"
+#include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/provider/entry_name.h"
+#include "dpxlsx/provider/package.h"
+#include "dpxlsx/provider/temporary_directory.h"
+#include "dpxlsx/readers/xml/file_copy.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 #include "tests/case_table.h"
 #include "tests/package_builder.h"
 #include "tests/recording_provider.h"

@@ -1,7 +1,7 @@
 #include <algorithm>
 #include <regex>
 
-#include "readers/xml_reader.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 #include "tests/case_table.h"
 #include "tests/package_builder.h"
 #include "tests/recording_provider.h"

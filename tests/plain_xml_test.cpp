@@ -1,4 +1,4 @@
-#include "readers/plain_xml.h"
+#include "dpxlsx/readers/xml/plain_xml.h"
 
 #include <regex>
 #include <string>

@@ -9,11 +9,11 @@
 
 #include <gtest/gtest.h>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
-#include "model/host/i_string.h"
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 
 namespace dp {
 

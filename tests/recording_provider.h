@@ -3,7 +3,7 @@
 #include <sstream>
 #include <string>
 
-#include "provider/xlsx_data_provider.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 
 // A provider that records the calls of a reader, one word each: "+Name" adds a worksheet, "@0" selects one, "-1"
 // removes one, and a record is its row, column and content.

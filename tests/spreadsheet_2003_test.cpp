@@ -2,8 +2,8 @@
 
 #include <boost/lexical_cast.hpp>
 
-#include "formats/date_time_variable_format.h"
-#include "readers/excel_xml_reader.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
 #include "tests/case_table.h"
 #include "tests/recording_provider.h"
 #include "tests/temporary_files.h"

@@ -1,6 +1,6 @@
-#include "store/text_cleaning.h"
+#include "dpxlsx/store/text_cleaning.h"
 
-#include "store/conversion.h"
+#include "dpxlsx/store/conversion.h"
 #include "tests/case_table.h"
 
 namespace {

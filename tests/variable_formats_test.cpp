@@ -15,13 +15,13 @@
 #include <unicode/locid.h>
 #include <unicode/timezone.h>
 
-#include "formats/date_time_variable_format.h"
-#include "formats/fraction_variable_format.h"
-#include "formats/number_text.h"
-#include "formats/numeric_variable_format.h"
-#include "formats/percentage_variable_format.h"
-#include "formats/text_variable_format.h"
-#include "provider/excel_data_provider_base.h"
+#include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/formats/fraction_variable_format.h"
+#include "dpxlsx/formats/number_text.h"
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/formats/text_variable_format.h"
+#include "dpxlsx/provider/excel_data_provider_base.h"
 #include "tests/allocated_bytes.h"
 
 namespace dp {

@@ -1,4 +1,4 @@
-#include "readers/xml_reader.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 
 #include <bit>
 #include <clocale>
@@ -9,8 +9,8 @@
 #include <gmock/gmock.h>
 #include <libxml/xmlreader.h>
 
-#include "readers/cm_xml_cast.h"
-#include "readers/limits.h"
+#include "dpxlsx/readers/limits.h"
+#include "dpxlsx/readers/xml/cm_xml_cast.h"
 #include "tests/case_table.h"
 #include "tests/temporary_files.h"
 

@@ -1,18 +1,18 @@
 #include <cstdio>
 #include <filesystem>
 
-#include "tools/csv.h"
-#include "tools/exit_code.h"
-#include "tools/explain.h"
-#include "tools/help.h"
-#include "tools/interrupt.h"
-#include "tools/json_view.h"
-#include "tools/library.h"
-#include "tools/options.h"
-#include "tools/output.h"
-#include "tools/table_view.h"
-#include "tools/text.h"
-#include "tools/workbook.h"
+#include "tools/explain/explain.h"
+#include "tools/host/exit_code.h"
+#include "tools/host/interrupt.h"
+#include "tools/host/library.h"
+#include "tools/host/workbook.h"
+#include "tools/options/help.h"
+#include "tools/options/options.h"
+#include "tools/views/csv.h"
+#include "tools/views/json_view.h"
+#include "tools/views/output.h"
+#include "tools/views/table_view.h"
+#include "tools/views/text.h"
 
 namespace dp::tool {
 

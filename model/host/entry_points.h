@@ -1,6 +1,6 @@
 #pragma once
 
-#include "model/host/export.h"
+#include "export.h"
 
 // The exported functions, under their plain names: a host finds them by name after loading the
 // library. A null name counts as the empty text.

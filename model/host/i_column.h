@@ -1,9 +1,9 @@
 #pragma once
 
-#include "model/host/export.h"
-#include "model/host/i_read_only_collection.h"
-#include "model/host/i_resource.h"
-#include "model/host/i_variable.h"
+#include "export.h"
+#include "i_read_only_collection.h"
+#include "i_resource.h"
+#include "i_variable.h"
 
 // The columns that a provider makes. A loaded column depends on neither the provider nor the file
 // any more. What a getter returns by pointer belongs to the column, is valid while the column lives

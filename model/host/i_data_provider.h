@@ -3,9 +3,9 @@
 #include <string>
 #include <vector>
 
-#include "model/host/export.h"
-#include "model/host/i_resource.h"
-#include "model/host/i_variable.h"
+#include "export.h"
+#include "i_resource.h"
+#include "i_variable.h"
 
 // The provider as the host sees it. The order of the operations is the binary contract: hosts call
 // through the table of virtual functions, so nothing here is ever moved, inserted or removed.
@@ -71,7 +71,7 @@ class DPXLSX_API IDataProvider : public IResource {
     // the file system's errors. Not to be called while a file is open, whose unpacked parts go.
     virtual long GetWorksheets(const char* fileName, std::vector<std::string>& names) = 0;
     // Reads a whole workbook into the provider, behind the worksheets that it has already; -1 for
-    // other access than Read. Errors in its XML leave as CmXmlException (readers/xml_reader.h),
+    // other access than Read. Errors in its XML leave as CmXmlException (readers/xml/xml_reader.h),
     // others, those of the file system for example, as std::exception. After any failure the
     // provider is usable, what was read until then stays, and CloseFile removes what is left on
     // disk.

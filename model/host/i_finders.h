@@ -1,9 +1,9 @@
 #pragma once
 
-#include "model/host/export.h"
-#include "model/host/i_read_only_collection.h"
-#include "model/host/i_variable.h"
-#include "model/host/i_variable_format.h"
+#include "export.h"
+#include "i_read_only_collection.h"
+#include "i_variable.h"
+#include "i_variable_format.h"
 
 // The two interfaces through which a host finds what a provider holds. Key collections belong to
 // the provider and are never null; their content is valid until the next query of the same kind or

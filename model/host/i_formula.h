@@ -1,6 +1,6 @@
 #pragma once
 
-#include "model/host/export.h"
+#include "export.h"
 
 // The host's formula objects. An import brings no formulas, only the values that they had: the
 // library hands out an empty manager, and what the numbers in the other objects mean is the host's.

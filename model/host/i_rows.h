@@ -1,6 +1,6 @@
 #pragma once
 
-#include "model/host/export.h"
+#include "export.h"
 
 namespace dp {
 

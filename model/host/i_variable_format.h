@@ -1,6 +1,6 @@
 #pragma once
 
-#include "model/host/export.h"
+#include "export.h"
 
 // How the values of a column are shown. A format is a plain heap object: whoever holds it deletes
 // it; that of a column belongs to the column. Texts that an operation makes are new objects owned

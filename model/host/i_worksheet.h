@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "model/host/export.h"
-#include "model/host/i_resource.h"
+#include "export.h"
+#include "i_resource.h"
 
 namespace dp {
 

@@ -1,0 +1,155 @@
+#include "tools/explain/explain.h"
+
+#include <algorithm>
+#include <cctype>
+#include <optional>
+#include <vector>
+
+#include <nlohmann/json.hpp>
+
+#include "tools/explain/inspection.h"
+#include "tools/explain/traits.h"
+#include "tools/host/interrupt.h"
+#include "tools/host/workbook.h"
+#include "tools/views/text.h"
+
+namespace dp::tool {
+
+namespace {
+
+constexpr const char* kNothing = "nothing to explain";
+
+struct Attempt {
+    std::optional<Failure> failure;  // none when the import goes well
+    Lost lost;
+    Imported imported;
+};
+
+ImportedSheet described(const LoadedWorksheet& worksheet, const ReadSettings& settings) {
+    ImportedSheet sheet{worksheet.key,
+                        worksheet.layout.nameRow,
+                        worksheet.layout.firstDataRow,
+                        {},
+                        worksheet.leftOut,
+                        {}};
+    for (size_t i = 0; i < worksheet.columns.size(); ++i) {
+        sheet.columns.emplace(worksheet.numbers[i], worksheet.columns[i].kind());
+    }
+    for (const auto& [where, type] : settings.types) {
+        const std::string& name = where.worksheet;
+        const bool here =
+            name.empty() || name == worksheet.title || name == std::to_string(worksheet.key);
+        if (here) sheet.chosen.insert(where.column);
+    }
+    return sheet;
+}
+
+Attempt tryImport(const Library& library, const Options& options) {
+    Attempt attempt;
+    try {
+        Workbook workbook(library, options);
+        workbook.open();
+        attempt.imported.leftOut = workbook.leftOut();
+        for (const SheetEntry& sheet : workbook.worksheets()) {
+            const LoadedWorksheet worksheet = workbook.load(sheet);
+            workbook.noteShown(worksheet);
+            attempt.imported.sheets.emplace(sheet.title, described(worksheet, options.settings));
+        }
+        attempt.lost = workbook.losses().lost();
+    } catch (const Interrupted&) {
+        throw;
+    } catch (...) {
+        attempt = {currentFailure(options.book), {}, {}};
+    }
+    return attempt;
+}
+
+// Whether the failure says nothing about the book.
+bool isOfTheSystem(const Failure& failure) {
+    const int code = failure.code();
+    return code == kNoSuchFile || code == kTemporaryDirectory || code == kSystemFailure ||
+           code == kLibraryFailure || code == kUsage;
+}
+
+std::vector<Trait> allTraits(const Library& library, Options options) {
+    options.settings.cleanSheetNames = false;  // the book itself has the original names
+    const Attempt attempt = tryImport(library, options);
+    const std::optional<Failure>& failure = attempt.failure;
+    if (failure && isOfTheSystem(*failure)) throw *failure;
+    // A package that the library cannot unpack is not inspected either.
+    const bool unpacked = !failure || failure->code() != kReadFailure;
+    Findings findings = unpacked ? inspect(options.book, attempt.imported) : Findings();
+    findings.lost = attempt.lost;
+    findings.textLimit = options.settings.maxText.value_or(kDefaultLongestText);
+    std::vector<Trait> traits =
+        traitsOf(findings, askForStyles(library, options.book, findings.formats));
+    const bool explained =
+        std::any_of(traits.begin(), traits.end(), [](const Trait& trait) { return trait.fatal; });
+    if (failure && !explained) traits.push_back(unreadableTrait(findings, failure->code()));
+    return traits;
+}
+
+// Nothing when the inspection fails: the result of the import itself stands.
+Findings quickFindings(const std::string& book, const std::string& folder,
+                       const std::set<std::string>& leftOut) {
+    try {
+        return inspectQuickly(book, folder, leftOut);
+    } catch (const std::exception&) {
+        return {};
+    }
+}
+
+std::string line(const Trait& trait) {
+    std::string text = printable(trait.found + ": " + trait.effect + "; " + trait.advice);
+    text[0] = static_cast<char>(std::toupper(static_cast<unsigned char>(text[0])));
+    return text + "\n";
+}
+
+std::string jsonText(const std::string& book, const std::vector<Trait>& traits) {
+    using Json = nlohmann::ordered_json;
+    Json list = Json::array();
+    for (const Trait& trait : traits) {
+        list.push_back({{"trait", trait.key},
+                        {"found", validUtf8(trait.found)},
+                        {"effect", validUtf8(trait.effect)},
+                        {"advice", validUtf8(trait.advice)},
+                        {"importFails", trait.fatal}});
+    }
+    return Json({{"file", validUtf8(book)}, {"traits", list}}).dump() + "\n";
+}
+
+}  // namespace
+
+void explain(const Library& library, const Options& options, Output& output) {
+    const std::vector<Trait> traits = allTraits(library, options);
+    if (options.view == View::Json) return output.write(jsonText(options.book, traits));
+    for (const Trait& trait : traits) output.write(line(trait));
+    if (traits.empty()) output.write(printable(options.book) + ": " + kNothing + "\n");
+}
+
+std::string importNote(const std::string& book, const std::string& folder,
+                       const std::set<std::string>& leftOut) {
+    std::string text;
+    for (const Trait& trait : quickTraitsOf(quickFindings(book, folder, leftOut))) {
+        if (trait.note.empty()) continue;
+        text += (text.empty() ? "" : "; ") + trait.note;
+    }
+    return text.empty() ? text : book + ": " + text + "; see dpxlsx --explain";
+}
+
+Failure explained(const Failure& failure, const std::string& book) {
+    const int code = failure.code();
+    if (code != kMalformedWorkbook && code != kNoPackage && code != kNoWorkbook) return failure;
+    for (const Trait& trait : traitsOf(quickFindings(book, "", {}), {})) {
+        if (!trait.fatal) continue;
+        return {failure.code(),
+                book + ": " + trait.found + "; " + trait.advice + "; see dpxlsx --explain"};
+    }
+    if (code == kMalformedWorkbook) {
+        return {failure.code(),
+                std::string(failure.what()) + "; dpxlsx --explain may name the part"};
+    }
+    return failure;
+}
+
+}  // namespace dp::tool

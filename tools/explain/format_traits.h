@@ -1,0 +1,20 @@
+#pragma once
+
+#include <map>
+
+#include "tools/explain/style_probe.h"
+#include "tools/explain/trait.h"
+
+// Traits that result from number formats. They follow from how spreadsheet programs and the library
+// each treat the cell styles, and from the kinds that the import gave the columns.
+namespace dp::tool {
+
+using StyleAnswers = std::map<int, StyleAnswer>;  // by index of the cell style
+
+Found takenForDates(const Findings& findings, const StyleAnswers& answers);
+Found notTakenForDates(const Findings& findings, const StyleAnswers& answers);
+Found uncountedFormats(const Findings& findings, const StyleAnswers& answers);
+Found mixedDates(const Findings& findings, const StyleAnswers& answers);
+Found defaultDateStyle(const Findings& findings, const StyleAnswers& answers);
+
+}  // namespace dp::tool

@@ -1,0 +1,358 @@
+#include "tools/explain/traits.h"
+
+#include <algorithm>
+
+#include "tools/host/exit_code.h"
+#include "tools/views/text.h"
+
+namespace dp::tool {
+
+namespace {
+
+Found namespacePrefix(const Findings& findings) {
+    const bool fatal = findings.workbookPrefixed || findings.relationshipPrefixed;
+    if (!fatal && findings.prefixedParts.count == 0) return std::nullopt;
+    std::vector<std::string> found;
+    if (findings.prefixedParts.count > 0) {
+        found.push_back("elements have a namespace prefix, such as <" + findings.prefixedName +
+                        "> (in " + listed(findings.prefixedParts, false) + ")");
+    }
+    if (findings.relationshipPrefixed) {
+        found.emplace_back("the worksheets' r:id has another prefix in xl/workbook.xml");
+    }
+    std::vector<std::string> effects;
+    const Names& sheets = findings.prefixedWorksheets;
+    if (sheets.count > 0) {
+        effects.push_back(worksheets(sheets) + (sheets.count == 1 ? " comes" : " come") +
+                          " out empty");
+    }
+    if (findings.stringsPrefixed) effects.emplace_back("the shared texts are missing");
+    if (findings.stylesPrefixed) effects.emplace_back("dates arrive as day numbers");
+    const std::string effect = fatal ? kOpenFails : joined(effects, ", ");
+    return Trait{"namespace-prefix", joined(found, ", "), effect, kSaveAgain, fatal, effect};
+}
+
+Found stringsWithoutCount(const Findings& findings) {
+    if (!findings.stringsWithoutCount) return std::nullopt;
+    const std::string cells =
+        findings.sharedTexts > 0 ? " (" + counted(findings.sharedTexts, "cell") + ")" : "";
+    return Trait{"shared-strings-without-count",
+                 "the table of shared texts does not say how many there are (uniqueCount)",
+                 "the texts that cells take from it are missing" + cells,
+                 kSaveAgain,
+                 false,
+                 "the shared texts are missing"};
+}
+
+Found missingTexts(const Findings& findings) {
+    if (findings.missingTexts.count == 0) return std::nullopt;
+    return Trait{"shared-strings-missing",
+                 placed(findings.missingTexts, "cell") +
+                     " with a text that the package does not have (xl/sharedStrings.xml)",
+                 "the texts are missing",
+                 "get a fresh copy, or " + std::string(kSaveAgain),
+                 false,
+                 "the shared texts are missing"};
+}
+
+Found isoDates(const Findings& findings) {
+    if (findings.isoDates.count == 0) return std::nullopt;
+    return Trait{"iso-dates",
+                 placed(findings.isoDates, "date") + " written as ISO text",
+                 "only the number at the beginning arrives: the year of a date",
+                 "save the book as an ordinary .xlsx, not in the strict variant of the format",
+                 false,
+                 "of dates written as ISO text only the year arrives, as a number"};
+}
+
+Found datesFrom1904(const Findings& findings) {
+    if (!findings.datesFrom1904) return std::nullopt;
+    return Trait{"date-system-1904",
+                 "the book counts its dates from 1904",
+                 "dates arrive 1,462 days early",
+                 "add 1462 to them after the import",
+                 false,
+                 "dates, if there are any, arrive 1,462 days early"};
+}
+
+Found lostWorksheets(const Findings& findings) {
+    const Names& sheets = findings.lostWorksheets;
+    if (sheets.count == 0) return std::nullopt;
+    const bool one = sheets.count == 1;
+    return Trait{"worksheet-without-part",
+                 worksheets(sheets) +
+                     " for which the package has no relationship to a worksheet's "
+                     "part (xl/_rels/workbook.xml.rels)",
+                 one ? "it is not imported" : "they are not imported",
+                 "get a fresh copy, or " + std::string(kSaveAgain),
+                 false,
+                 worksheets(sheets) + (one ? " is not imported" : " are not imported")};
+}
+
+struct OtherFile {
+    FileKind kind;
+    const char* key;
+    const char* found;
+    const char* advice;
+};
+
+constexpr const char* kSaveAsWorkbook = "open it in a spreadsheet program and save it as .xlsx";
+
+constexpr OtherFile kOtherFiles[] = {
+    {FileKind::PasswordProtected, "password-protected", "the book is protected with a password",
+     "save it without one"},
+    {FileKind::OldWorkbook, "old-workbook",
+     "the file is a workbook in the old binary format (.xls)", kSaveAsWorkbook},
+    {FileKind::OtherCompound, "not-a-package",
+     "the file is a document of an old office program, not a workbook", kSaveAsWorkbook},
+    {FileKind::Spreadsheet2003, "spreadsheet-2003", "the file is an XML Spreadsheet 2003 document",
+     kSaveAsWorkbook},
+    {FileKind::WebPage, "web-page", "the file is a web page", kSaveAsWorkbook},
+    {FileKind::PlainText, "plain-text", "the file is plain text, such as CSV", kSaveAsWorkbook},
+    {FileKind::Empty, "empty-file", "the file is empty", "get a fresh copy"},
+    {FileKind::CutPackage, "cut-package", "the package is cut off or damaged", "get a fresh copy"},
+    {FileKind::OpenDocument, "open-document", "the file is an OpenDocument file, such as .ods",
+     kSaveAsWorkbook},
+    {FileKind::TextDocument, "text-document", "the file is a text document (.docx)",
+     "copy its tables into a workbook"},
+    {FileKind::Presentation, "presentation", "the file is a presentation (.pptx)",
+     "copy its tables into a workbook"},
+    {FileKind::BinaryWorkbook, "binary-workbook", "the file is a binary workbook (.xlsb)",
+     kSaveAsWorkbook},
+    {FileKind::OtherArchive, "other-archive", "the file is a ZIP archive without a workbook",
+     "name the workbook itself; if it is inside, unpack it first"},
+    {FileKind::Unknown, "not-a-package", "the file is no workbook of any known kind",
+     "check where it comes from"},
+};
+
+Found otherFile(const Findings& findings) {
+    const auto entry =
+        std::find_if(std::begin(kOtherFiles), std::end(kOtherFiles),
+                     [&](const OtherFile& file) { return file.kind == findings.kind; });
+    if (entry != std::end(kOtherFiles)) {
+        return Trait{entry->key, entry->found, kOpenFails, entry->advice, true};
+    }
+    if (findings.namedXlsx) return std::nullopt;
+    return Trait{"other-name", "the file's name does not end in .xlsx", kOpenFails,
+                 "copy it to a name that does", true};
+}
+
+Found noStyleSheet(const Findings& findings) {
+    const bool workbook = findings.kind == FileKind::Workbook;
+    if (!workbook || findings.hasStyles) return std::nullopt;
+    return Trait{"no-style-sheet", "the package has no style sheet (xl/styles.xml)", kOpenFails,
+                 kSaveAgain, true};
+}
+
+Found movedParts(const Findings& findings) {
+    if (findings.moved.empty()) return std::nullopt;
+    const MovedPart& first = findings.moved.front();
+    const bool textsOnly = findings.moved.size() == 1 && first.wanted == "xl/sharedStrings.xml";
+    std::string found =
+        "the package has " + quoted(first.found) + " where " + quoted(first.wanted) + " belongs";
+    if (findings.moved.size() > 1) {
+        found += ", and " + counted(findings.moved.size() - 1, "more part") + " under other names";
+    }
+    return Trait{"part-names", found, textsOnly ? "the shared texts are missing" : kOpenFails,
+                 kSaveAgain, !textsOnly};
+}
+
+Found shownInTexts(const Findings& findings) {
+    const Tally& cells = findings.lost.shown;
+    if (cells.empty()) return std::nullopt;
+    return Trait{
+        "shown-in-texts",
+        counted(cells.total(), "number or date", "numbers or dates") +
+            " in columns of texts: " + cells.text(cells.columns()),
+        "they arrive as displayed: what their formats do not show is lost",
+        "put them into columns of their own, or give them formats that show all of the value"};
+}
+
+Found formulas(const Findings& findings) {
+    if (findings.formulas.count == 0) return std::nullopt;
+    return Trait{"formulas-without-values",
+                 placed(findings.formulas, "formula") + " without a saved value",
+                 "a missing value arrives",
+                 "open the book in a spreadsheet program, let it calculate, and save it"};
+}
+
+Found numbersAsNames(const Findings& findings) {
+    if (findings.numbersAsNames.count == 0) return std::nullopt;
+    return Trait{"numbers-as-names",
+                 placed(findings.numbersAsNames, "number") + " and no text in the row of names",
+                 "they become names, not data",
+                 "if they are data: --names none; if the names are in another row: --name-row ROW"};
+}
+
+Found mergedCells(const Findings& findings) {
+    if (findings.mergedRanges.count == 0) return std::nullopt;
+    return Trait{"merged-cells", placed(findings.mergedRanges, "merged range"),
+                 "only the top left cell of each has a value, the others are missing",
+                 "unmerge the ranges and fill their cells where the value applies to all of them"};
+}
+
+Found phoneticTexts(const Findings& findings) {
+    std::vector<std::string> found;
+    std::vector<std::string> effects;
+    if (findings.phoneticTexts.count > 0) {
+        found.push_back(placed(findings.phoneticTexts, "cell") +
+                        " with phonetic readings in a shared text");
+        effects.emplace_back("the readings are appended to the texts");
+    }
+    if (findings.phoneticCells.count > 0) {
+        found.push_back(placed(findings.phoneticCells, "inline text") + " with phonetic readings");
+        effects.emplace_back("the readings replace inline texts");
+    }
+    if (found.empty()) return std::nullopt;
+    return Trait{"phonetic-texts", joined(found, ", "), joined(effects, ", "),
+                 "delete the phonetic guides in a spreadsheet program"};
+}
+
+Found errorCells(const Findings& findings) {
+    if (findings.errors.count == 0) return std::nullopt;
+    return Trait{"error-cells", placed(findings.errors, "cell") + " with an error such as #DIV/0!",
+                 "a missing value arrives, or no row where it is the last of its column",
+                 "correct the formula where a value is expected"};
+}
+
+Found hiddenWorksheets(const Findings& findings) {
+    if (findings.hiddenWorksheets.count == 0) return std::nullopt;
+    return Trait{
+        "hidden-worksheets", "hidden " + worksheets(findings.hiddenWorksheets),
+        "imported like the visible ones",
+        "to leave one out: --exclude-sheet " + shellWord(findings.hiddenWorksheets.first.front())};
+}
+
+Found inlineRuns(const Findings& findings) {
+    if (findings.runs.count == 0) return std::nullopt;
+    return Trait{"inline-runs",
+                 placed(findings.runs, "cell") + " with an inline text of several pieces",
+                 "only the last piece arrives", kSaveAgain};
+}
+
+Found inlineValues(const Findings& findings) {
+    if (findings.inlineValues.count == 0) return std::nullopt;
+    return Trait{"inline-values",
+                 placed(findings.inlineValues, "cell") + " with an inline text and a value",
+                 "the value arrives in place of the text", kSaveAgain};
+}
+
+Found cdataTexts(const Findings& findings) {
+    if (findings.cdataTexts.count == 0) return std::nullopt;
+    return Trait{"cdata-texts",
+                 placed(findings.cdataTexts, "cell") + " with a shared text in CDATA sections",
+                 "the content of the sections is missing", kSaveAgain};
+}
+
+Found piecesOfValues(const Findings& findings) {
+    if (findings.pieces.count == 0) return std::nullopt;
+    return Trait{"values-in-pieces",
+                 placed(findings.pieces, "cell") +
+                     " with a value or text divided by CDATA sections or comments",
+                 "only the first piece arrives", kSaveAgain};
+}
+
+Found booleanWords(const Findings& findings) {
+    if (findings.booleanWords.count == 0) return std::nullopt;
+    return Trait{"booleans-as-words",
+                 placed(findings.booleanWords, "Boolean") + " written as the word true",
+                 "0 arrives, as for FALSE", kSaveAgain};
+}
+
+Found notNumbers(const Findings& findings) {
+    if (findings.notNumbers.count == 0) return std::nullopt;
+    return Trait{"not-a-number",
+                 placed(findings.notNumbers, "cell") + " of type number with " +
+                     (findings.notNumbers.count == 1 ? "" : "texts such as ") +
+                     quoted(findings.notNumber),
+                 "the number at the beginning of such a text arrives, or 0",
+                 "let the program that makes the book write plain numbers, such as 1.5"};
+}
+
+Found lowerCase(const Findings& findings) {
+    if (findings.lowerCase.count == 0) return std::nullopt;
+    const std::string found =
+        placed(findings.lowerCase, "cell") + " with lower-case letters in the reference";
+    if (findings.lowerCaseFails) {
+        return Trait{"lower-case-references", found, kOpenFails, kSaveAgain, true};
+    }
+    const std::string first = findings.lowerCase.count == 1 ? "it" : "the first one";
+    return Trait{"lower-case-references", found,
+                 first + " arrives in column " + findings.lowerCaseColumn +
+                     (findings.lowerCase.count == 1 ? "" : ", the others are moved as well"),
+                 kSaveAgain};
+}
+
+Found lostCells(const Findings& findings) {
+    const Tally& cells = findings.lost.cells;
+    if (cells.empty()) return std::nullopt;
+    return Trait{"lost-on-conversion",
+                 counted(cells.total(), "cell") + (cells.total() == 1 ? " does" : " do") +
+                     " not fit the kind of the column: " + cells.text(cells.columns()),
+                 "a missing value arrives",
+                 "to keep the content as displayed: " + cells.textTypes(cells.columns())};
+}
+
+Found longTexts(const Findings& findings) {
+    const Tally& texts = findings.lost.cutTexts;
+    if (texts.empty()) return std::nullopt;
+    return Trait{"long-texts",
+                 counted(texts.total(), "text") + " longer than " +
+                     std::to_string(findings.textLimit) + " bytes: " + texts.text(texts.columns()),
+                 "the rest is cut off",
+                 "to keep all of it: --max-text " + std::to_string(findings.lost.longest)};
+}
+
+void add(std::vector<Trait>& traits, Found found) {
+    if (found) traits.push_back(std::move(*found));
+}
+
+}  // namespace
+
+std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers) {
+    std::vector<Trait> traits = quickTraitsOf(findings);
+    add(traits, noStyleSheet(findings));
+    add(traits, movedParts(findings));
+    add(traits, lostCells(findings));
+    add(traits, longTexts(findings));
+    add(traits, shownInTexts(findings));
+    add(traits, formulas(findings));
+    add(traits, numbersAsNames(findings));
+    if (!findings.stylesPrefixed) {  // otherwise the prefix explains what happens to the formats
+        add(traits, takenForDates(findings, answers));
+        add(traits, notTakenForDates(findings, answers));
+        add(traits, uncountedFormats(findings, answers));
+        add(traits, mixedDates(findings, answers));
+        add(traits, defaultDateStyle(findings, answers));
+    }
+    for (const auto trait :
+         {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns, inlineValues,
+          cdataTexts, piecesOfValues, booleanWords, notNumbers, lowerCase}) {
+        add(traits, trait(findings));
+    }
+    return traits;
+}
+
+std::vector<Trait> quickTraitsOf(const Findings& findings) {
+    std::vector<Trait> traits;
+    for (const auto trait : {namespacePrefix, stringsWithoutCount, missingTexts, lostWorksheets,
+                             isoDates, datesFrom1904, otherFile}) {
+        add(traits, trait(findings));
+    }
+    return traits;
+}
+
+Trait unreadableTrait(const Findings& findings, int code) {
+    if (code == kReadFailure) {
+        return {"unreadable", "an entry of the package cannot be unpacked", kOpenFails,
+                "get a fresh copy of the file, or free some space if the disk is full", true};
+    }
+    if (!findings.broken.empty()) {
+        return {"unreadable", quoted(findings.broken.front()) + " is missing or damaged",
+                kOpenFails, "get a fresh copy, or " + std::string(kSaveAgain), true};
+    }
+    return {"unreadable", "a part of the package has content that an import cannot read",
+            kOpenFails, kSaveAgain, true};
+}
+
+}  // namespace dp::tool

@@ -1,0 +1,20 @@
+#pragma once
+
+#include <vector>
+
+#include "tools/explain/format_traits.h"
+#include "tools/explain/trait.h"
+
+namespace dp::tool {
+
+// The traits behind the findings, the most frequent in real workbooks first.
+std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers);
+
+// The traits that inspectQuickly() finds.
+std::vector<Trait> quickTraitsOf(const Findings& findings);
+
+// The trait of a file whose import fails with this exit code for a reason that nothing else
+// explains.
+Trait unreadableTrait(const Findings& findings, int code);
+
+}  // namespace dp::tool

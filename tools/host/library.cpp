@@ -1,0 +1,70 @@
+#include "tools/host/library.h"
+
+#include <dlfcn.h>
+
+#include <cstdlib>
+#include <filesystem>
+
+#include "tools/host/exit_code.h"
+
+namespace dp::tool {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+constexpr const char* kLibraryName = "libdpxlsx.so.1";
+
+std::string nextToProgram() {
+    std::error_code error;
+    const fs::path program = fs::read_symlink("/proc/self/exe", error);
+    const fs::path library = program.parent_path().parent_path() / "lib" / kLibraryName;
+    return !error && fs::exists(library, error) ? library.string() : std::string();
+}
+
+std::string wantedLibrary(const std::string& given) {
+    if (!given.empty()) return given;
+    const char* named = std::getenv("DPXLSX_LIBRARY");
+    if (named != nullptr && *named != '\0') return named;
+    const std::string found = nextToProgram();
+    return found.empty() ? kLibraryName : found;
+}
+
+Failure loadFailure(const std::string& library) {
+    const char* reason = dlerror();
+    return {kLibraryFailure, library + ": the import library cannot be loaded (" +
+                                 (reason == nullptr ? "no reason given" : reason) +
+                                 "); name the right file with --library"};
+}
+
+template <class Function>
+Function find(void* handle, const char* name, const std::string& library) {
+    void* symbol = dlsym(handle, name);
+    if (symbol == nullptr) throw loadFailure(library);
+    return reinterpret_cast<Function>(symbol);
+}
+
+}  // namespace
+
+Library::Library(const std::string& path) {
+    const std::string library = wantedLibrary(path);
+    void* const handle = dlopen(library.c_str(), RTLD_NOW | RTLD_LOCAL);
+    if (handle == nullptr) throw loadFailure(library);
+    create_ = find<decltype(create_)>(handle, "CreateDataProvider", library);
+    type_ = find<decltype(type_)>(handle, "GetDataProviderFiletype", library);
+}
+
+std::string Library::fileType(const std::string& book) const { return type_(book.c_str()); }
+
+IDataProvider* Library::createProvider(const std::string& type) const {
+    IDataProvider* provider = nullptr;
+    const long result = create_(type.c_str(), &provider);
+    if (result != 0 || provider == nullptr) {
+        throw Failure(kLibraryFailure, "the import library makes no provider for the type \"" +
+                                           type + "\" (result " + std::to_string(result) +
+                                           "); install a library of this version");
+    }
+    return provider;
+}
+
+}  // namespace dp::tool

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <string>
+
+#include <dpxlsx/model/host/entry_points.h>
+#include <dpxlsx/model/host/i_data_provider.h>
+
+namespace dp::tool {
+
+// The import library. It stays loaded until the program ends: exceptions that it threw may still be
+// alive, and unloading would lose the tables that the libraries below it keep.
+class Library {
+  public:
+    // Loads the library at `path`. If that is empty: the one that the environment variable
+    // DPXLSX_LIBRARY names, else the one in the folder lib beside the program's folder, else the
+    // one that the loader finds. Throws a Failure when none can be loaded.
+    explicit Library(const std::string& path);
+
+    // The library's name for the type of the file; empty when the library does not read such files.
+    std::string fileType(const std::string& book) const;
+    // A provider with a reference count of 0. Throws a Failure when there is none.
+    IDataProvider* createProvider(const std::string& type) const;
+
+  private:
+    decltype(&CreateDataProvider) create_;
+    decltype(&GetDataProviderFiletype) type_;
+};
+
+}  // namespace dp::tool

@@ -1,0 +1,49 @@
+#include "tools/host/progress.h"
+
+#include <unistd.h>
+
+#include <chrono>
+#include <cstdio>
+
+#include "tools/views/terminal.h"
+#include "tools/views/text.h"
+
+namespace dp::tool {
+
+namespace {
+
+constexpr double kPause = 0.1;  // seconds between two lines
+
+double now() {
+    const auto passed = std::chrono::steady_clock::now().time_since_epoch();
+    return std::chrono::duration<double>(passed).count();
+}
+
+}  // namespace
+
+Progress::Progress() : terminal_(isatty(STDERR_FILENO) == 1) {}
+
+Progress::~Progress() { erase(); }
+
+void Progress::opening(const std::string& book) { show("Opening " + book); }
+
+void Progress::column(const std::string& worksheet, size_t number, size_t count) {
+    if (now() - lastShown_ < kPause) return;
+    show(worksheet + ": column " + std::to_string(number) + " of " + std::to_string(count));
+}
+
+void Progress::erase() {
+    if (shown_) std::fputs("\r\033[K", stderr);
+    shown_ = false;
+}
+
+void Progress::show(const std::string& text) {
+    if (!terminal_) return;
+    // A line that wraps cannot be erased.
+    const int width = terminalWidth(STDERR_FILENO).value_or(80) - 1;
+    std::fprintf(stderr, "\r\033[K%s", cutToWidth(printable(text), width).c_str());
+    shown_ = true;
+    lastShown_ = now();
+}
+
+}  // namespace dp::tool
