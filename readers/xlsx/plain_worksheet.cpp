@@ -15,11 +15,12 @@ bool isLower(char c) { return c >= 'a' && c <= 'z'; }
 bool isDigit(char c) { return c >= '0' && c <= '9'; }
 bool isOfNumber(char c) { return isDigit(c) || c == '.' || c == '-' || c == 'E' || c == '+'; }
 
-// Moves `p` behind `literal` if that stands there. The bytes read so far end with a zero, which is
-// in no literal.
+// Moves `p` behind `literal` if that stands there. The zeros behind the bytes read so far are in no
+// literal, so that it need not be looked for byte by byte.
 template <std::size_t Size>
 bool take(char*& p, const char (&literal)[Size]) {
-    if (std::strncmp(p, literal, Size - 1) != 0) return false;
+    static_assert(Size - 1 <= PlainXml::kZeros);
+    if (std::memcmp(p, literal, Size - 1) != 0) return false;
     p += Size - 1;
     return true;
 }

@@ -200,7 +200,7 @@ PlainXml::~PlainXml() {
 bool PlainXml::open(const std::string& path) {
     descriptor_ = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
     if (descriptor_ < 0) return false;
-    buffer_.reset(new char[kWindow + 1]);
+    buffer_.reset(new char[kWindow + kZeros]);
     at_ = end_ = buffer_.get();
     constexpr std::ptrdiff_t kLongestBeginning = 256;
     while (end_ - at_ < kLongestBeginning && fill()) {
@@ -226,7 +226,7 @@ bool PlainXml::fill() {
     readError_ = count < 0;
     endOfFile_ = count <= 0;
     if (count > 0) end_ += count;
-    *end_ = '\0';
+    std::memset(end_, 0, kZeros);
     return !endOfFile_;
 }
 

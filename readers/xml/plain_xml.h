@@ -57,7 +57,9 @@ class PlainXml {
 
     // --- For callers who know what usually comes next ---
 
-    // The bytes from the next node on, with a zero behind the last one that has been read so far.
+    // Zeros behind the bytes that have been read: callers may compare so many bytes at a time.
+    static constexpr std::size_t kZeros = 16;
+    // The bytes from the next node on, and behind those that have been read so far kZeros zeros.
     // The caller may write to them, and puts back what was there.
     char* ahead();
     // Goes on at `place`, which is behind plain elements that begin at ahead() and are complete;
@@ -107,7 +109,7 @@ class PlainXml {
     int descriptor_ = -1;
     std::unique_ptr<char[]> buffer_;
     char* at_ = nullptr;   // where the next node begins
-    char* end_ = nullptr;  // behind the bytes read so far; holds a zero
+    char* end_ = nullptr;  // behind the bytes read so far; kZeros zeros follow
     bool endOfFile_ = false;
     bool readError_ = false;
     bool rootSeen_ = false;
