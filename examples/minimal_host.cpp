@@ -9,6 +9,7 @@
 #include <dpxlsx/model/host/i_data_provider.h>
 #include <dpxlsx/model/host/i_finders.h>
 #include <dpxlsx/model/host/i_string.h>
+#include <dpxlsx/model/host/reference.h>
 
 static long printColumns(dp::IDataProvider& provider, const char* book) {
     const long result = provider.OpenFile(book, dp::IDataProvider::FileAccess::Read);
@@ -18,12 +19,11 @@ static long printColumns(dp::IDataProvider& provider, const char* book) {
     const dp::IVariableFinder& finder = *provider.GetVariableFinder();
     const auto& keys = *finder.GetColumnPrimeKeys(sheets.Item(0));
     for (unsigned long i = 0; i < keys.Count(); ++i) {
-        dp::IColumn* column = nullptr;
-        if (!finder.FindColumn(keys.Item(i), &column, false)) continue;
-        column->AddRef();
+        dp::IColumn* loaded = nullptr;
+        if (!finder.FindColumn(keys.Item(i), &loaded, false)) continue;
+        const dp::Reference<dp::IColumn> column(loaded);
         std::printf("%s: type %d, %d rows, %d missing\n", column->GetName()->application_str(),
                     column->GetDataType(), column->GetRowCount(), column->GetMissingCount());
-        column->Release();
     }
     return 0;
 }
@@ -34,9 +34,9 @@ int main(int count, char** arguments) {
     void* const entry = library == nullptr ? nullptr : dlsym(library, "CreateDataProvider");
     if (entry == nullptr) return std::fprintf(stderr, "%s\n", dlerror()), 1;
     const auto create = reinterpret_cast<decltype(&dp::CreateDataProvider)>(entry);
-    dp::IDataProvider* provider = nullptr;
-    if (create("xlsx", &provider) != 0) return 1;
-    provider->AddRef();
+    dp::IDataProvider* made = nullptr;
+    if (create("xlsx", &made) != 0) return 1;
+    const dp::Reference<dp::IDataProvider> provider(made);
     long result = -1;
     try {
         result = printColumns(*provider, arguments[1]);
@@ -44,6 +44,5 @@ int main(int count, char** arguments) {
     }
     if (result != 0) std::fprintf(stderr, "%s: result %ld\n", arguments[1], result);
     provider->CloseFile();
-    provider->Release();
     return result == 0 ? 0 : 1;
 }

@@ -8,6 +8,7 @@
 #include "dpxlsx/formats/text_variable_format.h"
 #include "dpxlsx/model/columns.h"
 #include "dpxlsx/model/formula.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/model/rows.h"
 #include "dpxlsx/model/worksheet.h"
 #include "tests/abi.h"
@@ -96,6 +97,54 @@ TEST(HostContract, ReferencesAreCounted) {
     expectCounted<dp::NumericColumn>();
     expectCounted<dp::TextColumn>();
     expectCounted<dp::Worksheet>();
+}
+
+// What each use of a Reference does to the counts of two objects that another one holds.
+TEST(HostContract, ReferenceHoldsOneCount) {
+    struct Object {
+        unsigned count = 0;
+        unsigned AddRef() { return ++count; }
+        void Release() { --count; }
+    };
+    using Reference = dp::Reference<Object>;
+    struct Case {
+        const char* name;
+        void (*use)(Reference& first, Reference& second);
+        unsigned counts[2];
+        bool isNull[2];
+    };
+    const Case cases[] = {
+        {"none", [](Reference&, Reference&) {}, {1, 1}, {false, false}},
+        {"reset", [](Reference& first, Reference&) { first.reset(); }, {0, 1}, {true, false}},
+        {"reset to itself", [](Reference& first, Reference&) { first.reset(first.get()); }, {1, 1}, {false, false}},
+        {"reset to another",
+         [](Reference& first, Reference& second) { first.reset(&*second); },
+         {0, 2},
+         {false, false}},
+        {"copy", [](Reference& first, Reference& second) { second = first; }, {2, 0}, {false, false}},
+        {"copy to itself", [](Reference& first, Reference&) { first = *&first; }, {1, 1}, {false, false}},
+        {"move", [](Reference& first, Reference& second) { second = std::move(first); }, {1, 0}, {true, false}},
+        {"move to itself", [](Reference& first, Reference&) { first = std::move(*&first); }, {1, 1}, {false, false}},
+        {"null", [](Reference& first, Reference&) { first = Reference(nullptr); }, {0, 1}, {true, false}},
+        {"copied and gone", [](Reference& first, Reference&) { const Reference copy(first); }, {1, 1}, {false, false}},
+        {"moved and gone",
+         [](Reference& first, Reference&) { const Reference moved(std::move(first)); },
+         {0, 1},
+         {true, false}},
+    };
+    for (const auto& [name, use, counts, isNull] : cases) {
+        Object objects[2];
+        {
+            Reference first(&objects[0]), second(&objects[1]);
+            use(first, second);
+            EXPECT_EQ(objects[0].count, counts[0]) << name;
+            EXPECT_EQ(objects[1].count, counts[1]) << name;
+            EXPECT_EQ(first == nullptr, isNull[0]) << name;
+            EXPECT_EQ(second == nullptr, isNull[1]) << name;
+            EXPECT_TRUE(first == nullptr || &first->count == &(*first).count) << name;
+        }
+        EXPECT_EQ(objects[0].count + objects[1].count, 0U) << name;
+    }
 }
 
 // A format that records how it was called.

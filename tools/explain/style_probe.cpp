@@ -5,6 +5,7 @@
 #include <vector>
 
 #include <dpxlsx/model/host/i_finders.h>
+#include <dpxlsx/model/host/reference.h>
 #include <minizip/zip.h>
 
 #include "tools/host/column.h"
@@ -140,7 +141,7 @@ std::vector<StyleAnswer> readAnswers(IDataProvider& provider) {
 }
 
 std::vector<StyleAnswer> importProbe(const Library& library, const std::string& path) {
-    const Counted<IDataProvider> provider(library.createProvider("xlsx"));
+    const Reference<IDataProvider> provider(library.createProvider("xlsx"));
     std::vector<StyleAnswer> answers;
     provider->SetReadOptionDefaultUseVariableNameRow(VNR_NONE);
     try {

@@ -3,8 +3,7 @@
 #include <string>
 
 #include <dpxlsx/model/host/i_column.h>
-
-#include "tools/host/counted.h"
+#include <dpxlsx/model/host/reference.h>
 
 namespace dp::tool {
 
@@ -50,7 +49,7 @@ class Column {
     const INumericColumn& numeric() const;
     const ITextColumn& textual() const;
 
-    Counted<IColumn> column_;
+    Reference<IColumn> column_;
     double missing_;
     bool preview_;
     Kind kind_;

@@ -80,10 +80,10 @@ LoadedWorksheet Workbook::load(const SheetEntry& sheet) {
     return worksheet;
 }
 
-Counted<IWorksheet> Workbook::findWorksheet(int key) {
+Reference<IWorksheet> Workbook::findWorksheet(int key) {
     IWorksheet* found = nullptr;
     provider_->GetWorksheetFinder()->FindWorksheet(key, &found);
-    return Counted<IWorksheet>(found);
+    return Reference<IWorksheet>(found);
 }
 
 void Workbook::loadColumns(LoadedWorksheet& worksheet) {

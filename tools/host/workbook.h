@@ -6,9 +6,9 @@
 
 #include <dpxlsx/model/host/i_data_provider.h>
 #include <dpxlsx/model/host/i_worksheet.h>
+#include <dpxlsx/model/host/reference.h>
 
 #include "tools/host/column.h"
-#include "tools/host/counted.h"
 #include "tools/host/library.h"
 #include "tools/host/losses.h"
 #include "tools/host/progress.h"
@@ -26,7 +26,7 @@ struct Layout {
 };
 
 struct LoadedWorksheet {
-    Counted<IWorksheet> host;
+    Reference<IWorksheet> host;
     int key;
     std::string title;
     Layout layout;
@@ -72,14 +72,14 @@ class Workbook {
 
   private:
     [[noreturn]] void refuse(const UnknownWorksheet& unknown);
-    Counted<IWorksheet> findWorksheet(int key);
+    Reference<IWorksheet> findWorksheet(int key);
     void loadColumns(LoadedWorksheet& worksheet);
     unsigned numberOf(int key, const IColumn* column) const;
     void notePositions(const LoadedWorksheet& worksheet);
     Layout layoutOf(const LoadedWorksheet& worksheet) const;
 
     const Options& options_;
-    Counted<IDataProvider> provider_;
+    Reference<IDataProvider> provider_;
     Progress progress_;
     Losses losses_;
     ReadPlan plan_;

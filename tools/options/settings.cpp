@@ -8,8 +8,8 @@
 #include <dpxlsx/model/host/i_finders.h>
 #include <dpxlsx/model/host/i_string.h>
 #include <dpxlsx/model/host/i_worksheet.h>
+#include <dpxlsx/model/host/reference.h>
 
-#include "tools/host/counted.h"
 #include "tools/host/date_time_helper.h"
 #include "tools/options/column_reference.h"
 
@@ -75,7 +75,7 @@ bool hasNames(IDataProvider& provider, int sheet) {
     for (unsigned long i = 0; i < keys.Count(); ++i) {
         IColumn* found = nullptr;
         if (!finder.FindColumn(keys.Item(i), &found, true)) continue;
-        const Counted<IColumn> column(found);
+        const Reference<IColumn> column(found);
         if (*column->GetName()->database_str() != '\0') return true;
     }
     return false;
@@ -114,7 +114,7 @@ std::map<int, unsigned> columnsOf(IDataProvider& provider, int sheet) {
     for (unsigned long i = 0; i < keys.Count(); ++i) {
         IColumn* found = nullptr;
         if (!finder.FindColumn(keys.Item(i), &found, true)) continue;
-        const Counted<IColumn> column(found);
+        const Reference<IColumn> column(found);
         numbers[keys.Item(i)] = static_cast<unsigned>(column->GetPosition());
     }
     return numbers;
@@ -237,7 +237,7 @@ std::vector<SheetEntry> listSheets(IDataProvider& provider) {
     for (unsigned long i = 0; i < keys.Count(); ++i) {
         IWorksheet* found = nullptr;
         if (!finder.FindWorksheet(keys.Item(i), &found)) continue;
-        const Counted<IWorksheet> sheet(found);
+        const Reference<IWorksheet> sheet(found);
         sheets.push_back({keys.Item(i), sheet->GetTitle()});
     }
     return sheets;
