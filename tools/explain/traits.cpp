@@ -1,6 +1,8 @@
 #include "tools/explain/traits.h"
 
 #include <algorithm>
+#include <string>
+#include <utility>
 
 #include "tools/host/exit_code.h"
 #include "tools/views/text.h"
@@ -8,6 +10,99 @@
 namespace dp::tool {
 
 namespace {
+
+// Cells or ranges that all have the same effect.
+struct CellTrait {
+    const char* key;
+    Places Findings::*cells;
+    const char* unit;  // one of them
+    const char* what;  // they are, behind their places
+    const char* effect;
+    const char* advice;
+    const char* note = "";
+};
+
+constexpr CellTrait kMissingTexts{
+    "shared-strings-missing",
+    &Findings::missingTexts,
+    "cell",
+    "with a text that the package does not have (xl/sharedStrings.xml)",
+    "the texts are missing",
+    "get a fresh copy, or open the book in a spreadsheet program and save it as .xlsx again",
+    "the shared texts are missing"};
+constexpr CellTrait kIsoDates{
+    "iso-dates",
+    &Findings::isoDates,
+    "date",
+    "written as ISO text",
+    "only the number at the beginning arrives: the year of a date",
+    "save the book as an ordinary .xlsx, not in the strict variant of the format",
+    "of dates written as ISO text only the year arrives, as a number"};
+constexpr CellTrait kFormulas{
+    "formulas-without-values",
+    &Findings::formulas,
+    "formula",
+    "without a saved value",
+    "a missing value arrives",
+    "open the book in a spreadsheet program, let it calculate, and save it"};
+constexpr CellTrait kNumbersAsNames{
+    "numbers-as-names",
+    &Findings::numbersAsNames,
+    "number",
+    "and no text in the row of names",
+    "they become names, not data",
+    "if they are data: --names none; if the names are in another row: --name-row ROW"};
+constexpr CellTrait kMergedCells{
+    "merged-cells",
+    &Findings::mergedRanges,
+    "merged range",
+    "",
+    "only the top left cell of each has a value, the others are missing",
+    "unmerge the ranges and fill their cells where the value applies to all of them"};
+constexpr CellTrait kErrorCells{
+    "error-cells",
+    &Findings::errors,
+    "cell",
+    "with an error such as #DIV/0!",
+    "a missing value arrives, or no row where it is the last of its column",
+    "correct the formula where a value is expected"};
+constexpr CellTrait kInlineRuns{"inline-runs",
+                                &Findings::runs,
+                                "cell",
+                                "with an inline text of several pieces",
+                                "only the last piece arrives",
+                                kSaveAgain};
+constexpr CellTrait kInlineValues{"inline-values",
+                                  &Findings::inlineValues,
+                                  "cell",
+                                  "with an inline text and a value",
+                                  "the value arrives in place of the text",
+                                  kSaveAgain};
+constexpr CellTrait kCdataTexts{"cdata-texts",
+                                &Findings::cdataTexts,
+                                "cell",
+                                "with a shared text in CDATA sections",
+                                "the content of the sections is missing",
+                                kSaveAgain};
+constexpr CellTrait kPieces{"values-in-pieces",
+                            &Findings::pieces,
+                            "cell",
+                            "with a value or text divided by CDATA sections or comments",
+                            "only the first piece arrives",
+                            kSaveAgain};
+constexpr CellTrait kBooleanWords{
+    "booleans-as-words",        &Findings::booleanWords,   "Boolean",
+    "written as the word true", "0 arrives, as for FALSE", kSaveAgain};
+
+Found found(const Findings& findings, const CellTrait& trait) {
+    const Places& cells = findings.*trait.cells;
+    if (cells.count == 0) return std::nullopt;
+    std::string what = placed(cells, trait.unit);
+    if (*trait.what != '\0') what += std::string(" ") + trait.what;
+    return Trait{trait.key, what, trait.effect, trait.advice, false, trait.note};
+}
+
+Found found(const Findings& findings, Found (*trait)(const Findings&)) { return trait(findings); }
 
 Found namespacePrefix(const Findings& findings) {
     const bool fatal = findings.workbookPrefixed || findings.relationshipPrefixed;
@@ -42,27 +137,6 @@ Found stringsWithoutCount(const Findings& findings) {
                  kSaveAgain,
                  false,
                  "the shared texts are missing"};
-}
-
-Found missingTexts(const Findings& findings) {
-    if (findings.missingTexts.count == 0) return std::nullopt;
-    return Trait{"shared-strings-missing",
-                 placed(findings.missingTexts, "cell") +
-                     " with a text that the package does not have (xl/sharedStrings.xml)",
-                 "the texts are missing",
-                 "get a fresh copy, or " + std::string(kSaveAgain),
-                 false,
-                 "the shared texts are missing"};
-}
-
-Found isoDates(const Findings& findings) {
-    if (findings.isoDates.count == 0) return std::nullopt;
-    return Trait{"iso-dates",
-                 placed(findings.isoDates, "date") + " written as ISO text",
-                 "only the number at the beginning arrives: the year of a date",
-                 "save the book as an ordinary .xlsx, not in the strict variant of the format",
-                 false,
-                 "of dates written as ISO text only the year arrives, as a number"};
 }
 
 Found datesFrom1904(const Findings& findings) {
@@ -168,29 +242,6 @@ Found shownInTexts(const Findings& findings) {
         "put them into columns of their own, or give them formats that show all of the value"};
 }
 
-Found formulas(const Findings& findings) {
-    if (findings.formulas.count == 0) return std::nullopt;
-    return Trait{"formulas-without-values",
-                 placed(findings.formulas, "formula") + " without a saved value",
-                 "a missing value arrives",
-                 "open the book in a spreadsheet program, let it calculate, and save it"};
-}
-
-Found numbersAsNames(const Findings& findings) {
-    if (findings.numbersAsNames.count == 0) return std::nullopt;
-    return Trait{"numbers-as-names",
-                 placed(findings.numbersAsNames, "number") + " and no text in the row of names",
-                 "they become names, not data",
-                 "if they are data: --names none; if the names are in another row: --name-row ROW"};
-}
-
-Found mergedCells(const Findings& findings) {
-    if (findings.mergedRanges.count == 0) return std::nullopt;
-    return Trait{"merged-cells", placed(findings.mergedRanges, "merged range"),
-                 "only the top left cell of each has a value, the others are missing",
-                 "unmerge the ranges and fill their cells where the value applies to all of them"};
-}
-
 Found phoneticTexts(const Findings& findings) {
     std::vector<std::string> found;
     std::vector<std::string> effects;
@@ -208,55 +259,12 @@ Found phoneticTexts(const Findings& findings) {
                  "delete the phonetic guides in a spreadsheet program"};
 }
 
-Found errorCells(const Findings& findings) {
-    if (findings.errors.count == 0) return std::nullopt;
-    return Trait{"error-cells", placed(findings.errors, "cell") + " with an error such as #DIV/0!",
-                 "a missing value arrives, or no row where it is the last of its column",
-                 "correct the formula where a value is expected"};
-}
-
 Found hiddenWorksheets(const Findings& findings) {
     if (findings.hiddenWorksheets.count == 0) return std::nullopt;
     return Trait{
         "hidden-worksheets", "hidden " + worksheets(findings.hiddenWorksheets),
         "imported like the visible ones",
         "to leave one out: --exclude-sheet " + shellWord(findings.hiddenWorksheets.first.front())};
-}
-
-Found inlineRuns(const Findings& findings) {
-    if (findings.runs.count == 0) return std::nullopt;
-    return Trait{"inline-runs",
-                 placed(findings.runs, "cell") + " with an inline text of several pieces",
-                 "only the last piece arrives", kSaveAgain};
-}
-
-Found inlineValues(const Findings& findings) {
-    if (findings.inlineValues.count == 0) return std::nullopt;
-    return Trait{"inline-values",
-                 placed(findings.inlineValues, "cell") + " with an inline text and a value",
-                 "the value arrives in place of the text", kSaveAgain};
-}
-
-Found cdataTexts(const Findings& findings) {
-    if (findings.cdataTexts.count == 0) return std::nullopt;
-    return Trait{"cdata-texts",
-                 placed(findings.cdataTexts, "cell") + " with a shared text in CDATA sections",
-                 "the content of the sections is missing", kSaveAgain};
-}
-
-Found piecesOfValues(const Findings& findings) {
-    if (findings.pieces.count == 0) return std::nullopt;
-    return Trait{"values-in-pieces",
-                 placed(findings.pieces, "cell") +
-                     " with a value or text divided by CDATA sections or comments",
-                 "only the first piece arrives", kSaveAgain};
-}
-
-Found booleanWords(const Findings& findings) {
-    if (findings.booleanWords.count == 0) return std::nullopt;
-    return Trait{"booleans-as-words",
-                 placed(findings.booleanWords, "Boolean") + " written as the word true",
-                 "0 arrives, as for FALSE", kSaveAgain};
 }
 
 Found notNumbers(const Findings& findings) {
@@ -303,42 +311,36 @@ Found longTexts(const Findings& findings) {
                  "to keep all of it: --max-text " + std::to_string(findings.lost.longest)};
 }
 
-void add(std::vector<Trait>& traits, Found found) {
-    if (found) traits.push_back(std::move(*found));
+void add(std::vector<Trait>& traits, Found trait) {
+    if (trait) traits.push_back(std::move(*trait));
+}
+
+// Adds those that are found, in this order.
+template <class... Sources>
+void addAll(std::vector<Trait>& traits, const Findings& findings, const Sources&... sources) {
+    (add(traits, found(findings, sources)), ...);
 }
 
 }  // namespace
 
 std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers) {
     std::vector<Trait> traits = quickTraitsOf(findings);
-    add(traits, noStyleSheet(findings));
-    add(traits, movedParts(findings));
-    add(traits, lostCells(findings));
-    add(traits, longTexts(findings));
-    add(traits, shownInTexts(findings));
-    add(traits, formulas(findings));
-    add(traits, numbersAsNames(findings));
+    addAll(traits, findings, noStyleSheet, movedParts, lostCells, longTexts, shownInTexts,
+           kFormulas, kNumbersAsNames);
     if (!findings.stylesPrefixed) {  // otherwise the prefix explains what happens to the formats
-        add(traits, takenForDates(findings, answers));
-        add(traits, notTakenForDates(findings, answers));
-        add(traits, uncountedFormats(findings, answers));
-        add(traits, mixedDates(findings, answers));
-        add(traits, defaultDateStyle(findings, answers));
+        for (const auto trait :
+             {takenForDates, notTakenForDates, uncountedFormats, mixedDates, defaultDateStyle})
+            add(traits, trait(findings, answers));
     }
-    for (const auto trait :
-         {mergedCells, phoneticTexts, errorCells, hiddenWorksheets, inlineRuns, inlineValues,
-          cdataTexts, piecesOfValues, booleanWords, notNumbers, lowerCase}) {
-        add(traits, trait(findings));
-    }
+    addAll(traits, findings, kMergedCells, phoneticTexts, kErrorCells, hiddenWorksheets,
+           kInlineRuns, kInlineValues, kCdataTexts, kPieces, kBooleanWords, notNumbers, lowerCase);
     return traits;
 }
 
 std::vector<Trait> quickTraitsOf(const Findings& findings) {
     std::vector<Trait> traits;
-    for (const auto trait : {namespacePrefix, stringsWithoutCount, missingTexts, lostWorksheets,
-                             isoDates, datesFrom1904, otherFile}) {
-        add(traits, trait(findings));
-    }
+    addAll(traits, findings, namespacePrefix, stringsWithoutCount, kMissingTexts, lostWorksheets,
+           kIsoDates, datesFrom1904, otherFile);
     return traits;
 }
 

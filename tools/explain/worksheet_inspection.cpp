@@ -8,8 +8,6 @@
 #include <fstream>
 #include <vector>
 
-#include <climits>
-
 #include "tools/options/column_reference.h"
 #include "tools/package/part_reader.h"
 
@@ -38,6 +36,93 @@ std::string lowerWord(std::string_view text) {
                    [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
     return word;
 }
+
+constexpr unsigned kWorksheetColumns = 16384;
+constexpr unsigned kWorksheetRows = 1048576;
+
+// Where an import puts the cells.
+class CellPosition {
+  public:
+    void beginRow(const std::optional<std::string>& number) {
+        const auto given = rowNumber(number);
+        rowIsGiven_ = given.has_value();
+        row_ = given.value_or(row_ + 1);
+        column_ = 0;
+    }
+
+    // A cell without a reference follows the one before it.
+    void beginCell(const std::optional<std::string>& reference) {
+        ++column_;
+        isLowerCase_ = false;
+        if (!reference) return;
+        const size_t digits = std::min(reference->find_first_of("0123456789"), reference->size());
+        const std::string letters = reference->substr(0, digits);
+        if (const auto column = columnNumber(letters)) {
+            isLowerCase_ = std::any_of(letters.begin(), letters.end(), isLower);
+            column_ = isLowerCase_ ? columnOfImport(letters) : *column;
+        }
+        if (rowIsGiven_) return;
+        row_ = rowNumber(reference->substr(digits)).value_or(row_);
+    }
+
+    unsigned row() const { return row_; }        // 1-based
+    unsigned column() const { return column_; }  // 1-based
+    // Whether the reference is in lower case, because of which the cell arrives in another column.
+    bool isLowerCase() const { return isLowerCase_; }
+
+  private:
+    static bool isLower(char c) { return c >= 'a' && c <= 'z'; }
+
+    // An import takes all letters for upper-case ones, and lower-case letters have codes that are
+    // higher by 32.
+    static unsigned columnOfImport(const std::string& letters) {
+        unsigned column = 0;
+        for (const char letter : letters) column = column * 26 + static_cast<unsigned>(letter - 64);
+        return column;
+    }
+
+    // As an import reads it: the number that the text begins with, or one behind all rows for a row
+    // that no worksheet has.
+    static std::optional<unsigned> rowNumber(const std::optional<std::string>& text) {
+        if (!text) return std::nullopt;
+        char* end = nullptr;
+        const long value = std::strtol(text->c_str(), &end, 10);
+        if (end == text->c_str()) return std::nullopt;
+        return value > 0 && value <= kWorksheetRows ? static_cast<unsigned>(value)
+                                                    : kWorksheetRows + 1;
+    }
+
+    unsigned row_ = 0;
+    unsigned column_ = 0;
+    bool rowIsGiven_ = true;
+    bool isLowerCase_ = false;
+};
+
+// What the tag of a cell says.
+struct CellTag {
+    std::string type;
+    std::string style;
+    std::string place;
+};
+
+// What was found in a cell until it ended.
+struct CellContent {
+    bool hasFormula = false;
+    bool hasValue = false;
+    bool valueInPieces = false;
+    bool textInPieces = false;  // the inline text
+    bool phonetic = false;
+    size_t runs = 0;
+};
+
+// The value or inline text that the reader is in.
+struct OpenText {
+    static constexpr int kNone = -2;  // neither this nor the next number is a depth
+
+    bool isValue = false;
+    int depth = kNone;
+    size_t pieces = 0;
+};
 
 // One forward pass over the cells.
 class Pass {
@@ -80,27 +165,26 @@ class Pass {
 
     // Comments and CDATA sections divide a text into pieces, of which an import takes the first.
     void takeText() {
-        if (reader_.depth() != contentDepth_ + 1) return;
-        if (++pieces_ == 1) return inValue_ ? countValue() : noteReference();
-        (inValue_ ? valueInPieces_ : textInPieces_) = true;
+        if (reader_.depth() != text_.depth + 1) return;
+        if (++text_.pieces == 1) return text_.isValue ? countValue() : noteReference();
+        (text_.isValue ? content_.valueInPieces : content_.textInPieces) = true;
     }
 
     void takeElement(std::string_view name) {
         inPhonetic_ = inPhonetic_ && reader_.depth() > phoneticDepth_;
-        inValue_ = name == "v";
-        const bool inText = name == "t" && type_ == "inlineStr" && isInline();
-        if (inText) textInPieces_ = false;  // of several texts an import takes the last one
-        contentDepth_ = inValue_ || inText ? reader_.depth() : kNoContent;
-        pieces_ = 0;
+        const bool isValue = name == "v";
+        const bool inText = name == "t" && cell_.type == "inlineStr" && isInline();
+        if (inText) content_.textInPieces = false;  // of several texts an import takes the last one
+        text_ = {isValue, isValue || inText ? reader_.depth() : OpenText::kNone};
         if (name == "c") beginCell();
         if (name == "row") beginRow();
         if (name == "is") inlineDepth_ = reader_.depth();
-        if (name == "f") hasFormula_ = true;
-        if (name == "t" && !inPhonetic_ && isInline()) ++runs_;
+        if (name == "f") content_.hasFormula = true;
+        if (name == "t" && !inPhonetic_ && isInline()) ++content_.runs;
         if (name == "rPh") {
             inPhonetic_ = true;
             phoneticDepth_ = reader_.depth();
-            phonetic_ = true;
+            content_.phonetic = true;
         }
         if (name == "mergeCell" && tables_.imported != nullptr) noteMerged();
         notePrefix();
@@ -116,120 +200,77 @@ class Pass {
 
     void beginRow() {
         endCell();
-        const auto given = rowNumber(reader_.attribute("r"));
-        rowIsGiven_ = given.has_value();
-        row_ = given.value_or(row_ + 1);
-        column_ = 0;
+        position_.beginRow(reader_.attribute("r"));
     }
 
     void beginCell() {
         endCell();
-        type_ = reader_.attribute("t").value_or("");
-        style_ = reader_.attribute("s").value_or("");
         const auto reference = reader_.attribute("r");
-        place_ = at(reference);
-        takeReference(reference);
+        cell_ = {reader_.attribute("t").value_or(""), reader_.attribute("s").value_or(""),
+                 at(reference)};
+        position_.beginCell(reference);
         inlineDepth_ = 0;
-    }
-
-    // A cell without a reference follows the one before it.
-    void takeReference(const std::optional<std::string>& reference) {
-        ++column_;
-        isLowerCase_ = false;
-        if (!reference) return;
-        const size_t digits = std::min(reference->find_first_of("0123456789"), reference->size());
-        const std::string letters = reference->substr(0, digits);
-        if (const auto column = columnNumber(letters)) {
-            isLowerCase_ = std::any_of(letters.begin(), letters.end(), isLower);
-            column_ = isLowerCase_ ? columnOfImport(letters) : *column;
-        }
-        if (rowIsGiven_) return;
-        row_ = rowNumber(reference->substr(digits)).value_or(row_);
-    }
-
-    static bool isLower(char c) { return c >= 'a' && c <= 'z'; }
-
-    // The column in which an import puts the cell: it takes all letters for upper-case ones, and
-    // lower-case letters have codes that are higher by 32.
-    static unsigned columnOfImport(const std::string& letters) {
-        unsigned column = 0;
-        for (const char letter : letters) column = column * 26 + static_cast<unsigned>(letter - 64);
-        return column;
     }
 
     // Called for cells with content only.
     void noteReference() {
-        if (!isLowerCase_ || !isRead()) return;
+        if (!position_.isLowerCase() || !isRead()) return;
         const ImportedSheet* const sheet = tables_.imported;
-        const bool fails = column_ > kWorksheetColumns;
-        const bool arrives = sheet != nullptr && sheet->columns.count(column_) != 0;
+        const bool fails = position_.column() > kWorksheetColumns;
+        const bool arrives = sheet != nullptr && sheet->columns.count(position_.column()) != 0;
         if (!fails && !arrives) return;
-        if (findings_.lowerCase.count == 0) findings_.lowerCaseColumn = columnLetters(column_);
-        findings_.lowerCase.add(place_);
+        if (findings_.lowerCase.count == 0)
+            findings_.lowerCaseColumn = columnLetters(position_.column());
+        findings_.lowerCase.add(cell_.place);
         findings_.lowerCaseFails = findings_.lowerCaseFails || fails;
-    }
-
-    // As an import reads it: the number that the text begins with, or one behind all rows for a row
-    // that no worksheet has.
-    static std::optional<unsigned> rowNumber(const std::optional<std::string>& text) {
-        if (!text) return std::nullopt;
-        char* end = nullptr;
-        const long value = std::strtol(text->c_str(), &end, 10);
-        if (end == text->c_str()) return std::nullopt;
-        return value > 0 && value <= kWorksheetRows ? static_cast<unsigned>(value)
-                                                    : kWorksheetRows + 1;
     }
 
     void endCell() {
         if (isRead()) noteCell();
-        if (runs_ > 0 && isName()) nameIsText_ = true;
-        hasFormula_ = false;
-        runs_ = 0;
-        hasValue_ = false;
-        phonetic_ = false;
-        valueInPieces_ = false;
-        textInPieces_ = false;
+        if (content_.runs > 0 && isName()) nameIsText_ = true;
+        content_ = {};
     }
 
     void noteCell() {
-        const bool isInlineText = type_ == "inlineStr";
-        if (hasFormula_ && !hasValue_ && type_ != "str") findings_.formulas.add(place_);
-        if (isInlineText && phonetic_) findings_.phoneticCells.add(place_);
-        if (isInlineText && runs_ > 0 && hasValue_) {
-            findings_.inlineValues.add(place_);
-        } else if (isInlineText && runs_ > 1) {
-            findings_.runs.add(place_);
+        const bool isInlineText = cell_.type == "inlineStr";
+        if (content_.hasFormula && !content_.hasValue && cell_.type != "str")
+            findings_.formulas.add(cell_.place);
+        if (isInlineText && content_.phonetic) findings_.phoneticCells.add(cell_.place);
+        if (isInlineText && content_.runs > 0 && content_.hasValue) {
+            findings_.inlineValues.add(cell_.place);
+        } else if (isInlineText && content_.runs > 1) {
+            findings_.runs.add(cell_.place);
         }
-        const bool inPieces = hasValue_ ? valueInPieces_ : textInPieces_;
-        if (inPieces && type_ != "e") findings_.pieces.add(place_);
+        const bool inPieces = content_.hasValue ? content_.valueInPieces : content_.textInPieces;
+        if (inPieces && cell_.type != "e") findings_.pieces.add(cell_.place);
     }
 
     void countValue() {
-        hasValue_ = true;
+        content_.hasValue = true;
         if (!isRead()) return;
-        if (type_ != "e") noteReference();
+        if (cell_.type != "e") noteReference();
         if (isTakenForNumber()) checkNumber();
-        const bool isNumber = type_.empty() || type_ == "n";
-        if (type_ == "s") countSharedText();
-        if (type_ == "d") findings_.isoDates.add(place_);
-        if (type_ == "e") findings_.errors.add(place_);
+        const bool isNumber = cell_.type.empty() || cell_.type == "n";
+        if (cell_.type == "s") countSharedText();
+        if (cell_.type == "d") findings_.isoDates.add(cell_.place);
+        if (cell_.type == "e") findings_.errors.add(cell_.place);
         if (isName()) return noteName(isNumber);
-        if (isNumber || type_ == "b") countStyle();
+        if (isNumber || cell_.type == "b") countStyle();
     }
 
     // An import treats Booleans and types that it does not know as numbers.
     bool isTakenForNumber() const {
         constexpr std::string_view kOthers[] = {"s", "str", "inlineStr", "e", "d"};
-        return std::find(std::begin(kOthers), std::end(kOthers), type_) == std::end(kOthers);
+        return std::find(std::begin(kOthers), std::end(kOthers), cell_.type) == std::end(kOthers);
     }
 
     void checkNumber() {
         const std::string text = reader_.text();
-        const std::string word = type_ == "b" ? lowerWord(text) : std::string();
-        if (word == "true") findings_.booleanWords.add(place_);
+        const std::string word = cell_.type == "b" ? lowerWord(text) : std::string();
+        if (word == "true") findings_.booleanWords.add(cell_.place);
         if (word == "true" || word == "false" || isNumber(text)) return;
         if (findings_.notNumbers.count == 0) findings_.notNumber = text.substr(0, kLongest);
-        findings_.notNumbers.add(place_);
+        findings_.notNumbers.add(cell_.place);
     }
 
     // Whether the import reads the cell: it is not above the data, nor in a column that is left
@@ -237,17 +278,18 @@ class Pass {
     bool isRead() const {
         const ImportedSheet* sheet = tables_.imported;
         if (sheet == nullptr) return true;
-        return (isName() || row_ >= sheet->firstDataRow) && sheet->leftOut.count(column_) == 0;
+        return (isName() || position_.row() >= sheet->firstDataRow) &&
+               sheet->leftOut.count(position_.column()) == 0;
     }
 
     bool isName() const {
-        return tables_.imported != nullptr && row_ == tables_.imported->nameRow &&
-               row_ < tables_.imported->firstDataRow;
+        return tables_.imported != nullptr && position_.row() == tables_.imported->nameRow &&
+               position_.row() < tables_.imported->firstDataRow;
     }
 
     void noteName(bool isNumber) {
         if (isNumber) {
-            numbersAsNames_.add(place_);
+            numbersAsNames_.add(cell_.place);
         } else {
             nameIsText_ = true;
         }
@@ -263,13 +305,13 @@ class Pass {
         ++findings_.sharedTexts;
         const long index = std::strtol(reader_.text().c_str(), nullptr, 10);
         const bool known = index >= 0 && static_cast<size_t>(index) < tables_.texts.count;
-        if (!known) findings_.missingTexts.add(place_);
+        if (!known) findings_.missingTexts.add(cell_.place);
         const auto has = [index](const std::vector<bool>& texts) {
             return index >= 0 && static_cast<size_t>(index) < texts.size() &&
                    texts[static_cast<size_t>(index)];
         };
-        if (has(tables_.texts.phonetic)) findings_.phoneticTexts.add(place_);
-        if (has(tables_.texts.cdata)) findings_.cdataTexts.add(place_);
+        if (has(tables_.texts.phonetic)) findings_.phoneticTexts.add(cell_.place);
+        if (has(tables_.texts.cdata)) findings_.cdataTexts.add(cell_.place);
     }
 
     // A cell without a style has the first one.
@@ -277,16 +319,16 @@ class Pass {
         const NumberFormats* const formats = tables_.formats;
         if (formats == nullptr) return;
         int style = StyledColumn::kBoolean;
-        if (type_ != "b") {
-            const long index = std::strtol(style_.c_str(), nullptr, 10);
+        if (cell_.type != "b") {
+            const long index = std::strtol(cell_.style.c_str(), nullptr, 10);
             if (index < 0 || index >= static_cast<long>(formats->size())) return;
             style = static_cast<int>(index);
             if (findings_.formats.count(style) == 0) {
                 findings_.formats.emplace(style, formats->of(style));
             }
         }
-        StyledCells* const cells = cellsOf({worksheet_.place, column_, style});
-        if (cells != nullptr) cells->cells.add(place_);
+        StyledCells* const cells = cellsOf({worksheet_.place, position_.column(), style});
+        if (cells != nullptr) cells->cells.add(cell_.place);
     }
 
     // Null when there are already too many combinations of column and style.
@@ -305,10 +347,10 @@ class Pass {
     void describe(StyledCells& cells) const {
         const ImportedSheet* sheet = tables_.imported;
         if (sheet == nullptr) return;
-        cells.reference = columnReference(worksheet_.name, sheet->key, column_);
-        const auto column = sheet->columns.find(column_);
+        cells.reference = columnReference(worksheet_.name, sheet->key, position_.column());
+        const auto column = sheet->columns.find(position_.column());
         if (column != sheet->columns.end()) cells.kind = column->second;
-        cells.isChosen = sheet->chosen.count(column_) != 0;
+        cells.isChosen = sheet->chosen.count(position_.column()) != 0;
     }
 
     void notePrefix() {
@@ -325,34 +367,19 @@ class Pass {
     }
 
     static constexpr size_t kLongest = 32;  // bytes of what is quoted from a cell
-    static constexpr int kNoContent = -2;   // neither this nor the value plus one is a depth
-    static constexpr unsigned kWorksheetColumns = 16384;
-    static constexpr unsigned kWorksheetRows = 1048576;
 
     PartReader reader_;
     const WorksheetPart& worksheet_;
     const Tables tables_;
     Findings& findings_;
 
-    std::string type_;
-    std::string style_;
-    std::string place_;
-    bool inValue_ = false;
-    int contentDepth_ = kNoContent;  // of the value or inline text
-    size_t pieces_ = 0;              // of its text
-    bool hasValue_ = false;          // the cell
-    bool valueInPieces_ = false;
-    bool textInPieces_ = false;
-    size_t runs_ = 0;
-    bool phonetic_ = false;
+    CellPosition position_;
+    CellTag cell_;
+    CellContent content_;
+    OpenText text_;
+    int inlineDepth_ = 0;  // of the inline text of the cell, 0 for none
     bool inPhonetic_ = false;
     int phoneticDepth_ = 0;
-    bool hasFormula_ = false;
-    int inlineDepth_ = 0;  // of the inline text of the cell, 0 for none
-    unsigned row_ = 0;     // 1-based
-    unsigned column_ = 0;  // 1-based, where an import puts the cell
-    bool rowIsGiven_ = true;
-    bool isLowerCase_ = false;  // the reference
     bool nameIsText_ = false;
     Places numbersAsNames_;  // in the row of names
     bool prefixed_ = false;
