@@ -23,8 +23,7 @@ inline constexpr std::size_t kXmlNames = 10'000'000;
 // an element with every other, and copies a whole comment for every error in it.
 inline constexpr std::size_t kMarkupSize = 256 << 10;
 // Markup longer than this many bytes may have at most this many equal signs (one for each
-// attribute) and hyphens beyond them. CDATA sections are text and may have any number, if the
-// encoding allows recognising them.
+// attribute) and hyphens beyond them. CDATA sections are text and may have any number.
 inline constexpr std::size_t kLongMarkup = 16 << 10;
 inline constexpr std::size_t kLongMarkupMarks = 4096;
 

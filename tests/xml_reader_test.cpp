@@ -141,6 +141,7 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
                  {"one in a comment", repeated(9'000, "b", "<a><!--<![CDATA[--><b @/></a>"), 13},
                  {"one in an instruction", repeated(9'000, "b", "<a><?c <![CDATA[?><b @/></a>"), 13},
                  {"one by its bytes", repeated(9'000, "b", japanese + "<a>\x1B$B<![CDATA[x\x1B(B<b @/></a>"), 13},
+                 {"marks in one of bytes decoded", marked(japanese + "<a>\x1B$B!!\x1B(B<![CDATA[@]]></a>"), 0},
                  {"bytes that are no character", sized(10'000, western + "<a>@<b>\x81</b></a>"), 13},
                  {"an entity", "<!DOCTYPE a [<!ENTITY e 'x'>]><a b='&e;'/>", 13},
                  {"declared attributes", "<!DOCTYPE a [<!ATTLIST a b IDREF #IMPLIED>]><a b='c'/>", 13},
@@ -164,6 +165,64 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
     while (reader.readNode())
         if (reader.nodeType() == XML_READER_TYPE_TEXT) text += reader.nodeValue();
     EXPECT_EQ(text, "") << "external entities are not fetched";
+}
+
+TEST_F(XmlReading, DecodesAlikeWithEveryLibxml2) {
+    const auto declaring = [](const std::string& encoding, const std::string& rest) {
+        return "<?xml version='1.0' encoding='" + encoding + "'?><a>" + rest;
+    };
+    const auto widened = [](const std::string& text, std::size_t before, std::size_t behind) {
+        std::string wide;
+        for (const char c : text) wide += std::string(before, '\0') + c + std::string(behind, '\0');
+        return wide;
+    };
+    const auto times = [](int count, const std::string& text) {
+        std::string all;
+        for (; count > 0; --count) all += text;
+        return all;
+    };
+    const std::string refused = "refused";
+    const std::string ebcdic =  // <?xml version='1.0' encoding='IBM500'?><a>!</a>
+        "\x4C\x6F\xA7\x94\x93\x40\xA5\x85\x99\xA2\x89\x96\x95\x7E\x7D\xF1\x4B\xF0\x7D\x40\x85\x95\x83\x96\x84\x89\x95"
+        "\x87"
+        "\x7E\x7D\xC9\xC2\xD4\xF5\xF0\xF0\x7D\x6F\x6E\x4C\x81\x6E\x4F\x4C\x61\x81\x6E";
+    const struct {
+        const char* name;
+        std::string document;
+        std::string text;
+    } cases[] = {
+        {"undefined", declaring("windows-1252", "\x81</a>"), refused},
+        {"undefined, behind it all", declaring("windows-1252", "</a>\x81"), refused},
+        {"half a character at the end", declaring("Shift_JIS", "</a>\x81"), refused},
+        {"half of one before the buffer's end", declaring("Shift_JIS", times(40'000, "\x93\xFA") + "</a>"),
+         times(40'000, "\u65E5")},
+        {"the other half", declaring("Shift_JIS", "x" + times(40'000, "\x93\xFA") + "</a>"),
+         "x" + times(40'000, "\u65E5")},
+        {"kept back by the decoder", declaring("windows-1258", "a\xEC</a>"), "\u00E1"},
+        {"in small letters, without a hyphen", declaring("iso8859-15", "\xA4</a>"), "\u20AC"},
+        {"libxml2's own name", declaring("ISO-LATIN-2", "\xB1</a>"), "\u0105"},
+        {"unknown", declaring("unknown", "x</a>"), refused},
+        {"with instructions for iconv", declaring("US-ASCII//IGNORE", "x\x81</a>"), refused},
+        {"against its mark", "\xEF\xBB\xBF" + declaring("ISO-8859-1", "\xE9</a>"), "\u00E9"},
+        {"UTF-16", "\xFF\xFE" + widened(declaring("UTF-16", "x</a>"), 0, 1), "x"},
+        {"UTF-16, undeclared", "\xFE\xFF" + widened("<a>x</a>", 1, 0), "x"},
+        {"UTF-16 without a mark", widened(declaring("UTF-16", "x</a>"), 1, 0), "x"},
+        {"UTF-16 that declares something else", widened(declaring("IBM500", "x</a>"), 0, 1), "x"},
+        {"UTF-32", widened(declaring("UTF-32", "x</a>"), 0, 3), "x"},
+        {"half a surrogate pair", "\xFF\xFE" + widened("<a>", 0, 1) + "\x3D\xD8" + widened("</a>", 0, 1), refused},
+        {"EBCDIC", ebcdic, "!"}};
+    for (const auto& c : cases) {
+        std::string text;
+        try {
+            XmlReader reader;
+            open(reader, c.document);
+            while (reader.readNode())
+                if (reader.nodeType() == XML_READER_TYPE_TEXT) text += reader.nodeValue();
+        } catch (const CmXmlException&) {
+            text = refused;
+        }
+        EXPECT_EQ(text, c.text) << c.name;
+    }
 }
 
 // Each name with a prefix is added to libxml2's dictionary when it is asked for; the dictionary takes 50 MB at most.

@@ -6,7 +6,7 @@ std::size_t MarkupMarks::countIn(std::string_view bytes) {
     std::size_t count = 0;
     for (const char c : bytes) {
         take(c);
-        if (isMarkupMark(c) && (enclosed_ != &kSection || !isAscii_)) ++count;
+        if (isMarkupMark(c) && enclosed_ != &kSection) ++count;
     }
     return count;
 }
@@ -14,7 +14,6 @@ std::size_t MarkupMarks::countIn(std::string_view bytes) {
 void MarkupMarks::take(char c) {
     last_ = last_ << 8 | static_cast<unsigned char>(c);
     ++length_;
-    isAscii_ = isAscii_ && c != '\0';
     if (enclosed_) {
         // The opening and the closing share no bytes: "<!-->" does not end a comment.
         const bool isLongEnough = length_ >= enclosed_->opening.size() + enclosed_->closing.size();

@@ -12,7 +12,7 @@ constexpr bool isMarkupMark(char c) { return c == '=' || c == '-'; }
 
 // Counts them in a document that is passed to it from the first byte on, except those in CDATA
 // sections, which are text. Follows the markup as long as it is well-formed; a parser gets no
-// further. Only for encodings in which ASCII bytes have no other meaning.
+// further. Only for UTF-8.
 class MarkupMarks {
   public:
     // Counts in the document's next bytes.
@@ -35,7 +35,6 @@ class MarkupMarks {
     const Enclosed* enclosed_ = nullptr;  // that contains the last byte, if any
     bool inTag_ = false;                  // also in a declaration
     char quote_ = '\0';                   // of the attribute's value, in a tag
-    bool isAscii_ = true;                 // a zero byte tells of a wider encoding
     std::uint64_t last_ = 0;              // the last 8 bytes
     std::size_t length_ = 0;              // bytes since the last "<"
 };

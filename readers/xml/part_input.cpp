@@ -4,12 +4,10 @@
 #include <unistd.h>
 
 #include <algorithm>
-#include <array>
-#include <cerrno>
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
 #include <memory>
+#include <new>
 #include <optional>
 #include <string_view>
 
@@ -17,32 +15,20 @@
 
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/markup_marks.h"
+#include "dpxlsx/readers/xml/part_text.h"
 #include "dpxlsx/readers/xml/silence.h"
 
 namespace dp {
 
 namespace {
 
-// Whether ASCII bytes have no other meaning in the document's encoding, as in UTF-8, which need not
-// be declared, and in the usual single-byte encodings. UTF-16 need not be declared either, but has
-// zero bytes.
-bool keepsAscii(xmlTextReaderPtr reader) {
-    const xmlNode* node = reader ? xmlTextReaderCurrentNode(reader) : nullptr;
-    if (!node || !node->doc) return false;
-    const xmlChar* encoding = node->doc->encoding;
-    const auto beginsWith = [encoding](const char* name) {
-        return xmlStrncasecmp(encoding, reinterpret_cast<const xmlChar*>(name),
-                              static_cast<int>(std::strlen(name))) == 0;
-    };
-    return !encoding || beginsWith("UTF-8") || beginsWith("US-ASCII") || beginsWith("ISO-8859-") ||
-           beginsWith("windows-125");
-}
-
 // The file behind a reader, and how far libxml2 has come in it.
 class PartInput {
   public:
     PartInput(const std::string& path, const std::uint32_t& moves)
-        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)), moves_(moves) {}
+        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)),
+          moves_(moves),
+          text_(descriptor_) {}
     ~PartInput() {
         if (isOpen()) ::close(descriptor_);
     }
@@ -50,33 +36,25 @@ class PartInput {
     PartInput& operator=(const PartInput&) = delete;
 
     bool isOpen() const { return descriptor_ >= 0; }
+    bool isDecoded() const { return text_.isDecoded(); }
     void watch(xmlTextReaderPtr reader) { reader_ = reader; }
 
     // Reads up to `size` bytes; 0 at the end, -1 on an error and beyond the limits.
     int read(char* bytes, int size) {
         const std::size_t waiting = bytesWaiting();
         if (waiting > kMarkupSize || runSize() > kRunSize) return -1;
-        if (next_ == end_ && !fill()) return -1;
-        const std::ptrdiff_t count = std::min<std::ptrdiff_t>(size, end_ - next_);
-        std::copy_n(next_, count, bytes);
-        next_ += count;
+        if (pending_.empty()) {
+            const auto more = text_.next();
+            if (!more) return -1;
+            pending_ = *more;
+        }
+        const std::string_view supply = pending_.substr(0, static_cast<std::size_t>(size));
+        pending_.remove_prefix(supply.copy(bytes, supply.size()));
         const bool isLong = waiting > kLongMarkup;
-        const std::string_view supply(bytes, static_cast<std::size_t>(count));
-        return countMarks(supply, isLong) ? static_cast<int>(count) : -1;
+        return countMarks(supply, isLong) ? static_cast<int>(supply.size()) : -1;
     }
 
   private:
-    // Buffers the file, because libxml2 asks for few bytes at a time. False on an error; at the end
-    // the buffer is empty.
-    bool fill() {
-        ssize_t count = -1;
-        do count = ::read(descriptor_, buffer_.data(), buffer_.size());
-        while (count < 0 && errno == EINTR);
-        next_ = buffer_.data();
-        end_ = next_ + std::max<ssize_t>(count, 0);
-        return count >= 0;
-    }
-
     // Bytes that libxml2 has received but not consumed. It consumes text as it arrives, but markup
     // only when complete.
     std::size_t bytesWaiting() const {
@@ -107,37 +85,39 @@ class PartInput {
         } else if (isLong) {
             marks_ +=
                 static_cast<std::size_t>(std::count_if(supply.begin(), supply.end(), isMarkupMark));
-            if (marks_ > kLongMarkupMarks && keepsAscii(reader_) && !countExactly()) return false;
+            if (marks_ > kLongMarkupMarks && !countExactly()) return false;
         }
         return marks_ <= kLongMarkupMarks;
     }
     // Reads the document from its beginning again, to count exactly. False when that cannot be
     // done.
     bool countExactly() {
+        const off_t position = ::lseek(descriptor_, 0, SEEK_CUR);
+        if (position < 0 || ::lseek(descriptor_, 0, SEEK_SET) < 0) return false;
+        PartText again(descriptor_);
         exactMarks_.emplace();
-        std::array<char, std::size_t{4} << 10> again;
+        marks_ = 0;
         for (std::int64_t at = 0; at < supplied_;) {
-            const std::int64_t end = at < longStart_ ? longStart_ : supplied_;
-            const std::size_t size =
-                std::min<std::size_t>(again.size(), static_cast<std::size_t>(end - at));
-            const ssize_t count = ::pread(descriptor_, again.data(), size, at);
-            if (count < 0 && errno == EINTR) continue;
-            if (count <= 0) return false;
-            const std::size_t marks =
-                exactMarks_->countIn({again.data(), static_cast<std::size_t>(count)});
-            marks_ = at < longStart_ ? 0 : marks_ + marks;
-            at += count;
+            const auto bytes = again.next();
+            if (!bytes || bytes->empty()) return false;
+            const std::string_view supply = bytes->substr(0, sizeOf(at, supplied_));
+            const std::string_view before = supply.substr(0, sizeOf(at, longStart_));
+            exactMarks_->countIn(before);
+            marks_ += exactMarks_->countIn(supply.substr(before.size()));
+            at += static_cast<std::int64_t>(supply.size());
         }
-        return true;
+        return ::lseek(descriptor_, position, SEEK_SET) >= 0;
+    }
+    static std::size_t sizeOf(std::int64_t begin, std::int64_t end) {
+        return begin < end ? static_cast<std::size_t>(end - begin) : 0;
     }
 
     int descriptor_;
     const std::uint32_t& moves_;
     std::uint32_t movesBefore_ = 0;
     std::int64_t runStart_ = 0;
-    std::array<char, std::size_t{32} << 10> buffer_;
-    const char* next_ = nullptr;  // the next byte for libxml2
-    const char* end_ = nullptr;   // the end of the buffered bytes
+    PartText text_;
+    std::string_view pending_;  // of the text, for libxml2
     xmlTextReaderPtr reader_ = nullptr;
     std::int64_t supplied_ = 0;   // bytes
     std::int64_t longStart_ = 0;  // where the unconsumed markup begins to count as long, in bytes
@@ -148,7 +128,11 @@ class PartInput {
 extern "C" {
 
 int readPart(void* input, char* bytes, int size) {
-    return static_cast<PartInput*>(input)->read(bytes, size);
+    try {
+        return static_cast<PartInput*>(input)->read(bytes, size);
+    } catch (const std::bad_alloc&) {  // may not pass through libxml2
+        return -1;
+    }
 }
 
 int closePart(void* input) {
@@ -168,10 +152,11 @@ xmlTextReaderPtr openDocument(const std::string& path, const std::uint32_t& move
     auto input = std::make_unique<PartInput>(path, moves);
     if (!input->isOpen()) return nullptr;
     PartInput* const watching = input.get();
+    const int options =
+        XML_PARSE_NOERROR | XML_PARSE_NOWARNING | (input->isDecoded() ? XML_PARSE_IGNORE_ENC : 0);
     // The reader closes the input, also when it cannot be made.
     const xmlTextReaderPtr reader =
-        xmlReaderForIO(readPart, closePart, input.release(), nullptr, nullptr,
-                       XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
+        xmlReaderForIO(readPart, closePart, input.release(), nullptr, nullptr, options);
     if (!reader) return nullptr;
     watching->watch(reader);
     // The options alone do not keep libxml2 quiet: it still prints a line for a text of over 10 MB.
