@@ -28,11 +28,12 @@
 #include "dpxlsx/provider/xlsx_data_provider.h"
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
-#include "tests/package_builder.h"
+#include "testkit/package_builder.h"
 
 namespace {
 
 namespace fs = boost::filesystem;
+using testkit::PackageBuilder;
 
 constexpr double kMostSeconds = 1.0;
 constexpr double kMostRatio = 3.0;

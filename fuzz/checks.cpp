@@ -1,6 +1,5 @@
 #include "fuzz/checks.h"
 
-#include <fcntl.h>
 #include <unistd.h>
 
 #include <array>
@@ -17,6 +16,7 @@
 #include <libxml/parser.h>
 
 #include "dpxlsx/readers/xml/silence.h"
+#include "testkit/workspace.h"
 
 namespace fuzz {
 
@@ -37,32 +37,22 @@ extern "C" void onXmlError(void*, dp::XmlErrorPointer) {
 // The directories of this process, and a host's handlers of libxml2.
 class Surroundings {
   public:
-    Surroundings() {
-        const fs::path memory = "/dev/shm";
-        const fs::path base =
-            ::access(memory.c_str(), W_OK) == 0 ? memory : fs::temp_directory_path();
-        root_ = base / fs::unique_path("dpxlsx-fuzz-%%%%-%%%%");
-        for (const char* name : {"tmp", "files", "cwd"}) fs::create_directories(root_ / name);
-        files = (root_ / "files").string();
-        temporary = (root_ / "tmp").string();
-        ::setenv("TMPDIR", temporary.c_str(), 1);
-        fs::current_path(root_ / "cwd");
+    Surroundings()
+        : files(workspace_.files().string()), temporary(workspace_.temporary().string()) {
+        const fs::path directory = workspace_.files().parent_path() / "cwd";
+        fs::create_directory(directory);
+        fs::current_path(directory);
         xmlInitParser();
         xmlSetGenericErrorFunc(this, onXmlMessage);
         xmlSetStructuredErrorFunc(this, onXmlError);
     }
-    ~Surroundings() {
-        boost::system::error_code ignored;
-        fs::remove_all(root_, ignored);
-    }
-    Surroundings(const Surroundings&) = delete;
-    Surroundings& operator=(const Surroundings&) = delete;
-
-    std::string files;
-    std::string temporary;
 
   private:
-    fs::path root_;
+    testkit::Workspace workspace_{testkit::Workspace::Place::Memory};
+
+  public:
+    const std::string files;
+    const std::string temporary;
 };
 
 Surroundings& surroundings() {
@@ -152,13 +142,6 @@ void fail(const std::string& what) {
 }
 
 const std::string& ownFiles() { return surroundings().files; }
-
-void writeFile(const std::string& path, const std::string& content) {
-    const int file = ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0600);
-    const ssize_t size = static_cast<ssize_t>(content.size());
-    require(file >= 0 && ::write(file, content.data(), content.size()) == size, "no file written");
-    ::close(file);
-}
 
 void leavingNothing(const std::function<void()>& work) {
     const Surroundings& here = surroundings();

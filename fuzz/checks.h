@@ -15,9 +15,6 @@ inline void require(bool holds, const char* what) {
 // and the working directory of the process are other ones. Removed when the process ends.
 const std::string& ownFiles();
 
-// Writes a file of the target, replacing it.
-void writeFile(const std::string& path, const std::string& content);
-
 // Runs `work` and checks that it leaves the process as it was: working directory, umask, locale,
 // signal handlers, libxml2's state and handlers, and the lowest free descriptor; that the temporary
 // and the working directory are empty; and that nothing was printed. The last check needs the

@@ -3,8 +3,6 @@
 // opened as a host does and must leave nothing behind. In between, the undamaged workbook must open
 // as before.
 
-#include <malloc.h>
-
 #include <cstdio>
 #include <cstdlib>
 #include <map>
@@ -12,34 +10,29 @@
 
 #include "fuzz/checks.h"
 #include "fuzz/opening.h"
-#include "fuzz/parts.h"
-#include "fuzz/zip_writer.h"
+#include "testkit/allocated_bytes.h"
+#include "testkit/package_builder.h"
+#include "testkit/workspace.h"
 
 namespace {
+
+using testkit::PackageBuilder;
 
 std::map<long, int> results;
 
 long open(const std::string& bytes) {
     static const std::string path = fuzz::ownFiles() + "/book.xlsx";
-    fuzz::writeFile(path, bytes);
+    testkit::writeFile(path, bytes);
     long result = 0;
     fuzz::leavingNothing([&] { result = fuzz::openAsHost(path); });
     ++results[result];
     return result;
 }
 
-using Parts = std::map<std::string, std::string>;
-
-std::string packageOf(const Parts& parts) {
-    fuzz::ZipWriter archive;
-    for (const auto& [name, content] : parts) archive.add({name, content});
-    return archive.finished();
-}
-
 // Calls `use` with every damaged form of `bytes`.
 template <class Use>
 void damage(const std::string& bytes, std::size_t stride, Use use) {
-    const std::string sound = packageOf(fuzz::soundParts());
+    const std::string sound = PackageBuilder::small().bytes();
     for (std::size_t at = 0; at < bytes.size(); at += stride) {
         use(bytes.substr(0, at));
         for (const char other : {'\0', '\xFF', static_cast<char>(bytes[at] ^ 0x80)}) {
@@ -56,11 +49,11 @@ void openOften() {
     constexpr int kTimes = 300;
     constexpr std::size_t kBytes =
         4096;  // of growth that are tolerated: a leak of each open would exceed this
-    const std::string sound = packageOf(fuzz::soundParts());
+    const std::string sound = PackageBuilder::small().bytes();
     open(sound);
-    const std::size_t before = ::mallinfo2().uordblks;
+    const std::size_t before = testkit::allocatedBytes();
     for (int i = 0; i < kTimes; ++i) open(sound);
-    fuzz::require(::mallinfo2().uordblks < before + kBytes, "memory grows from open to open");
+    fuzz::require(testkit::allocatedBytes() < before + kBytes, "memory grows from open to open");
 }
 
 }  // namespace
@@ -68,12 +61,13 @@ void openOften() {
 int main(int argc, char** argv) {
     const int given = argc > 1 ? std::atoi(argv[1]) : 1;
     const auto stride = static_cast<std::size_t>(given > 0 ? given : 1);
-    damage(packageOf(fuzz::soundParts()), stride, open);
-    for (const auto& [name, content] : fuzz::soundParts())
-        damage(content, stride, [&name = name](const std::string& damaged) {
-            Parts parts = fuzz::soundParts();
-            parts[name] = damaged;
-            open(packageOf(parts));
+    const PackageBuilder& sound = PackageBuilder::small();
+    damage(sound.bytes(), stride, open);
+    for (std::size_t part = 0; part < sound.parts.size(); ++part)
+        damage(sound.parts[part].second, stride, [&](const std::string& damaged) {
+            PackageBuilder package = sound;
+            package.parts[part].second = damaged;
+            open(package.bytes());
         });
     openOften();
     for (const auto& [result, count] : results) std::printf("%4ld: %d\n", result, count);

@@ -20,8 +20,8 @@
 #include "dpxlsx/readers/xml/xml_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
-#include "fuzz/parts.h"
-#include "fuzz/zip_writer.h"
+#include "testkit/package_builder.h"
+#include "testkit/workspace.h"
 
 namespace {
 
@@ -78,10 +78,9 @@ constexpr int kNoMemory = 1;
 constexpr int kFileSystem = 2;
 
 std::string makeBook() {
-    fuzz::ZipWriter archive;
-    for (const auto& [name, content] : fuzz::soundParts()) archive.add({name, content});
-    fuzz::writeFile(fuzz::ownFiles() + "/book.xlsx", archive.finished());
-    return fuzz::ownFiles() + "/book.xlsx";
+    const std::string path = fuzz::ownFiles() + "/book.xlsx";
+    testkit::PackageBuilder::small().write(path);
+    return path;
 }
 
 // The result code, or the exception's code.

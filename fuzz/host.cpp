@@ -125,25 +125,4 @@ void takeEverything(dp::IDataProvider& provider) {
     }
 }
 
-void ReadingProvider::read(std::unique_ptr<dp::ExcelXmlReader> reader) {
-    reader_ = std::move(reader);
-    reader_->mReadExcelWorkbook();
-}
-
-long ReadingProvider::GetWorksheets(const char*, std::vector<std::string>&) { return -1; }
-long ReadingProvider::OpenFile(const char*, FileAccess) { return -1; }
-long ReadingProvider::CloseFile() {
-    reader_.reset();
-    return 0;
-}
-
-dp::IVariableFormat* ReadingProvider::CreateVextralNumericFormat(
-    const dp::ExternalDataRecordCell& cell) const {
-    return reader_->createVextralNumericFormat(cell.formatIndex);
-}
-
-bool ReadingProvider::IsDateTimeFormatType(const dp::ExternalDataRecordCell& cell) const {
-    return reader_->IsDateTimeFormatType(reader_->GetExcelFormatType(cell.formatIndex));
-}
-
 }  // namespace fuzz

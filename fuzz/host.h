@@ -1,13 +1,11 @@
 #pragma once
 
 #include <memory>
-#include <string>
-#include <vector>
 
 #include "dpxlsx/formats/date_time_variable_format.h"
+#include "dpxlsx/model/host/i_data_provider.h"
 #include "dpxlsx/model/host/i_finders.h"
-#include "dpxlsx/provider/excel_data_provider_base.h"
-#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
+#include "dpxlsx/model/host/i_resource.h"
 
 // What hosts do with a provider.
 namespace fuzz {
@@ -43,22 +41,5 @@ unsigned long read(dp::IColumn& column);
 // Loads every worksheet, and every column in every kind, reads them and releases them; stops after
 // some ten thousand rows.
 void takeEverything(dp::IDataProvider& provider);
-
-// A provider that reads by a given reader, without a package around the parts.
-class ReadingProvider : public dp::ExcelDataProviderBase {
-  public:
-    // Takes the reader, which borrows this provider and is therefore destroyed first.
-    void read(std::unique_ptr<dp::ExcelXmlReader> reader);
-
-    long GetWorksheets(const char* fileName, std::vector<std::string>& names) override;
-    long OpenFile(const char* fileName, FileAccess access) override;
-    long CloseFile() override;
-    dp::IVariableFormat* CreateVextralNumericFormat(
-        const dp::ExternalDataRecordCell& cell) const override;
-    bool IsDateTimeFormatType(const dp::ExternalDataRecordCell& cell) const override;
-
-  private:
-    std::unique_ptr<dp::ExcelXmlReader> reader_;
-};
 
 }  // namespace fuzz

@@ -13,8 +13,9 @@
 #include "fuzz/checks.h"
 #include "fuzz/input.h"
 #include "fuzz/opening.h"
-#include "fuzz/parts.h"
-#include "fuzz/zip_writer.h"
+#include "testkit/package_builder.h"
+#include "testkit/workspace.h"
+#include "testkit/zip_writer.h"
 
 namespace {
 
@@ -57,9 +58,9 @@ std::string repeated(const std::string& text, unsigned times) {
 
 // Adds the entries that the input describes, in their order; with kMany up to 1,023 more copies of
 // an entry, each with a name of its own.
-void addEntries(Input& input, fuzz::ZipWriter& archive, std::vector<std::string>& names) {
+void addEntries(Input& input, testkit::ZipWriter& archive, std::vector<std::string>& names) {
     for (unsigned left = 1 + input.byte() % 16; left > 0 && !input.empty(); --left) {
-        fuzz::ZipWriter::Entry entry;
+        testkit::ZipWriter::Entry entry;
         entry.name = nameOf(input);
         const unsigned bits = input.byte();
         entry.deflated = (bits & kStored) == 0;
@@ -89,10 +90,10 @@ void overwrite(std::string& bytes, Input& input) {
 
 std::string packageOf(Input input) {
     if (input.flag()) return input.rest();
-    fuzz::ZipWriter archive;
+    testkit::ZipWriter archive;
     std::vector<std::string> names;
     addEntries(input, archive, names);
-    for (const auto& [name, content] : fuzz::soundParts())
+    for (const auto& [name, content] : testkit::PackageBuilder::small().parts)
         if (std::find(names.begin(), names.end(), name) == names.end())
             archive.add({name, content});
     std::string bytes = archive.finished();
@@ -104,7 +105,7 @@ std::string packageOf(Input input) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     static const std::string path = fuzz::ownFiles() + "/book.xlsx";
-    fuzz::writeFile(path, packageOf(Input(data, size)));
+    testkit::writeFile(path, packageOf(Input(data, size)));
     fuzz::leavingNothing([] { fuzz::openAsHost(path); });
     const boost::filesystem::directory_iterator files(fuzz::ownFiles());
     require(std::distance(begin(files), end(files)) == 1, "a file beside the workbook");

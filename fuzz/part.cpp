@@ -7,15 +7,15 @@
 #include <string>
 #include <vector>
 
-#include <boost/filesystem.hpp>
-
 #include "dpxlsx/formats/format_codes.h"
 #include "dpxlsx/provider/package.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/input.h"
-#include "fuzz/parts.h"
+#include "testkit/package_builder.h"
+#include "testkit/providers.h"
+#include "testkit/workspace.h"
 
 namespace {
 
@@ -26,32 +26,23 @@ constexpr const char* kParts[] = {"xl/workbook.xml", "xl/_rels/workbook.xml.rels
 // The directory of the package. Before a part is replaced, the one replaced before is restored.
 class Package {
   public:
-    Package() : directory_(fuzz::ownFiles()) {
-        for (const auto& [name, content] : fuzz::soundParts()) {
-            boost::filesystem::create_directories(path(name).parent_path());
-            fuzz::writeFile(path(name).string(), content);
-        }
-    }
+    Package() { testkit::PackageBuilder::small().unpackTo(directory_); }
     void set(const std::string& name, const std::string& content) {
-        if (name != different_ && !different_.empty())
-            fuzz::writeFile(path(different_).string(), fuzz::soundParts().at(different_));
+        for (const auto& [sound, soundContent] : testkit::PackageBuilder::small().parts)
+            if (sound == different_) testkit::writeFile(directory_ + "/" + sound, soundContent);
         different_ = name;
-        fuzz::writeFile(path(name).string(), content);
+        testkit::writeFile(directory_ + "/" + name, content);
     }
     const std::string& directory() const { return directory_; }
 
   private:
-    boost::filesystem::path path(const std::string& name) const {
-        return boost::filesystem::path(directory_) / name;
-    }
-
-    std::string directory_;
+    std::string directory_ = fuzz::ownFiles();
     std::string different_;
 };
 
 void readPackage(const std::string& directory) {
     dp::checkWorkbook(directory);
-    const auto provider = fuzz::referenceTo(new fuzz::ReadingProvider);
+    const auto provider = fuzz::referenceTo(new testkit::ReadingProvider);
     provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
     try {
         provider->read(std::make_unique<dp::ExcelXLSXReader>(

@@ -16,44 +16,22 @@
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/input.h"
-#include "fuzz/parts.h"
-#include "fuzz/zip_writer.h"
+#include "testkit/package_builder.h"
+#include "testkit/process_settings.h"
 
 namespace {
 
 using fuzz::Input;
 using fuzz::require;
-using Provider = dp::ExcelDataProviderBase;
 
 const std::string& bookPath() {
     static const std::string path = [] {
-        fuzz::ZipWriter archive;
-        for (const auto& [name, content] : fuzz::soundParts()) archive.add({name, content});
-        fuzz::writeFile(fuzz::ownFiles() + "/book.xlsx", archive.finished());
-        return fuzz::ownFiles() + "/book.xlsx";
+        const std::string book = fuzz::ownFiles() + "/book.xlsx";
+        testkit::PackageBuilder::small().write(book);
+        return book;
     }();
     return path;
 }
-
-// Restores the settings of the process when it is destroyed.
-struct KeptSettings {
-    ~KeptSettings() {
-        Provider::_missingValue = missing;
-        std::tie(Provider::_minNumericValue, Provider::_maxNumericValue) = range;
-        Provider::_maxTextLength = textLength;
-        std::tie(Provider::_inputDecimal, Provider::_outputDecimal,
-                 Provider::_outputGroupingSymbol) = symbols;
-        std::tie(Provider::_missingValueText, Provider::_trueValue, Provider::_falseValue) = texts;
-    }
-
-    double missing = Provider::_missingValue;
-    std::pair<double, double> range{Provider::_minNumericValue, Provider::_maxNumericValue};
-    int textLength = Provider::_maxTextLength;
-    std::tuple<char, char, char> symbols{Provider::_inputDecimal, Provider::_outputDecimal,
-                                         Provider::_outputGroupingSymbol};
-    std::tuple<std::string, std::string, std::string> texts{
-        Provider::_missingValueText, Provider::_trueValue, Provider::_falseValue};
-};
 
 class Host {
   public:
@@ -337,7 +315,7 @@ class Host {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     bookPath();
     fuzz::leavingNothing([&] {
-        const KeptSettings settings;
+        const testkit::KeptSettings settings;
         Host(Input(data, size)).run();
     });
     return 0;

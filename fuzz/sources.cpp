@@ -9,10 +9,7 @@
 #include <random>
 #include <string>
 #include <string_view>
-#include <utility>
 #include <vector>
-
-#include <boost/filesystem.hpp>
 
 #include "dpxlsx/formats/format_codes.h"
 #include "dpxlsx/readers/xlsx/cell_assembler.h"
@@ -22,27 +19,11 @@
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "fuzz/input.h"
-#include "fuzz/parts.h"
+#include "testkit/package_builder.h"
+#include "testkit/recording_provider.h"
+#include "testkit/workspace.h"
 
 namespace {
-
-// Notes each record, numbers by their bits.
-class NotingProvider : public fuzz::ReadingProvider {
-  public:
-    void AddExternalDataRecord(const dp::ExternalDataRecord& record) override {
-        const dp::ExternalDataRecordCell& cell = record.cell;
-        std::uint64_t bits = 0;
-        std::memcpy(&bits, &cell.numValue, sizeof bits);
-        const bool text = cell.type == dp::CELL_TEXT;
-        records_.push_back(std::to_string(record.row) + ',' + std::to_string(record.column) + ',' +
-                           std::to_string(cell.type) + ',' + std::to_string(cell.formatIndex) +
-                           ',' + (text ? cell.textValue : std::to_string(bits)));
-    }
-    std::vector<std::string> taken() { return std::exchange(records_, {}); }
-
-  private:
-    std::vector<std::string> records_;
-};
 
 enum class End { Whole, NotPlain, Error };
 
@@ -55,21 +36,20 @@ struct Outcome {
 // refer to.
 class Package {
   public:
-    Package() : provider_(fuzz::referenceTo(new NotingProvider)) {
+    Package() : provider_(fuzz::referenceTo(new testkit::RecordingProvider)) {
         const std::string directory = fuzz::ownFiles() + "/package";
-        for (const auto& [name, content] : fuzz::soundParts()) {
-            const auto path = boost::filesystem::path(directory) / name;
-            boost::filesystem::create_directories(path.parent_path());
-            fuzz::writeFile(path.string(), content);
-        }
+        testkit::PackageBuilder::small().unpackTo(directory);
         reader_ = std::make_unique<dp::ExcelXLSXReader>(directory, true, dp::GetShortDateMask(),
                                                         0.0, provider_.get(), nullptr);
         reader_->mReadExcelWorkbook();
-        provider_->taken();
     }
 
     template <class Read>
     Outcome readWorksheet(const Read& read) {
+        provider_->ClearWorksheets();
+        provider_->AddWorksheet("S");
+        provider_->SetWorksheetIndex(0);
+        provider_->takenCalls();
         End end = End::Error;
         try {
             dp::CellAssembler cells(*reader_);
@@ -77,11 +57,11 @@ class Package {
         } catch (const CmXmlException& e) {
             fuzz::require(e.code() == kXmlError, "another code");
         }
-        return {end, provider_->taken()};
+        return {end, provider_->takenCalls()};
     }
 
   private:
-    fuzz::Reference<NotingProvider> provider_;
+    fuzz::Reference<testkit::RecordingProvider> provider_;
     std::unique_ptr<dp::ExcelXLSXReader> reader_;
 };
 
@@ -140,7 +120,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     fuzz::Input input(data, size);
     const bool strings = input.flag();
     const std::size_t step = input.byte();
-    fuzz::writeFile(path, input.rest());
+    testkit::writeFile(path, input.rest());
     readBothWays(strings, step == 0 ? dp::PlainXml::kWindow : step, path);
     return 0;
 }

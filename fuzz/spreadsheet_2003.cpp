@@ -10,11 +10,13 @@
 #include "dpxlsx/formats/format_codes.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
+#include "testkit/providers.h"
+#include "testkit/workspace.h"
 
 namespace {
 
 void readDocument(const std::string& path) {
-    const auto provider = fuzz::referenceTo(new fuzz::ReadingProvider);
+    const auto provider = fuzz::referenceTo(new testkit::ReadingProvider);
     provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
     try {
         provider->read(std::make_unique<dp::ExcelXmlReader>(
@@ -33,7 +35,7 @@ void readDocument(const std::string& path) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     static const std::string path = fuzz::ownFiles() + "/book.xml";
-    fuzz::writeFile(path, {reinterpret_cast<const char*>(data), size});
+    testkit::writeFile(path, {reinterpret_cast<const char*>(data), size});
     fuzz::leavingNothing([] { readDocument(path); });
     return 0;
 }

@@ -117,7 +117,7 @@ TEST_F(ProviderContract, WriteSideIsRefused) {
 }
 
 TEST_F(ProviderContract, SettingsLandWhereTheyBelong) {
-    const dp::KeptSettings kept;
+    const testkit::KeptSettings kept;
     EXPECT_EQ(processSettings(), "1.23456e+30 * -1.001e+18 1.001e+18 2.147e+09 80 . . , TRUE FALSE");
     op<void>("SetMissingValue", -99.0);
     EXPECT_EQ(op<double>("GetMissingVxlValue"), -99.0);

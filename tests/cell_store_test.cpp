@@ -17,7 +17,7 @@
 #include "dpxlsx/store/blank_rows.h"
 #include "dpxlsx/store/row_layout.h"
 #include "dpxlsx/store/worksheet_cells.h"
-#include "tests/allocated_bytes.h"
+#include "testkit/allocated_bytes.h"
 
 namespace dp {
 namespace {
@@ -218,18 +218,18 @@ TEST(CellStore, DeliversTextsBeforeTheirCellsGo) {
 
 TEST(CellStore, CellsThatAreFiledAgainTakeNoMemory) {
     WorksheetCells cells;
-    const std::size_t before = allocatedBytes();
+    const std::size_t before = testkit::allocatedBytes();
     for (unsigned i = 0; i < 100000; ++i)
         cells.add(recordOf(i / 2 % 3, i % 7 ? 0 : 1, cellOf(CELL_TEXT, 1, 2, 3.0, "rare", -7)));
-    EXPECT_LT(allocatedBytes() - before, 100000U);
+    EXPECT_LT(testkit::allocatedBytes() - before, 100000U);
 }
 
 TEST(TextPool, KeepsManyTextsInLittleMemory) {
     TextPool pool;
-    const std::size_t before = allocatedBytes();
+    const std::size_t before = testkit::allocatedBytes();
     for (int i = 0; i < 400000; ++i)
         pool.intern("a text of forty-two bytes, the last ones " + std::to_string(100000 + i));
-    EXPECT_LT(allocatedBytes() - before, 30'000'000U);
+    EXPECT_LT(testkit::allocatedBytes() - before, 30'000'000U);
     EXPECT_EQ(pool.size(), 400000U);
 }
 

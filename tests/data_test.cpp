@@ -17,8 +17,7 @@
 #include "dpxlsx/model/host/i_finders.h"
 #include "dpxlsx/model/host/i_string.h"
 #include "dpxlsx/model/host/i_worksheet.h"
-#include "dpxlsx/provider/xlsx_data_provider.h"
-#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
+#include "testkit/providers.h"
 #include "tests/temporary_files.h"
 
 namespace {
@@ -45,25 +44,6 @@ class Calendar : public dp::DateTimeVariableFormat {
         return static_cast<double>((date.time_since_epoch() + days(25569)).count()) +
                static_cast<double>(time.count()) / 86400000.0;
     }
-};
-
-// A provider for an XML Spreadsheet 2003 document, with the formats of the document's styles.
-class DocumentProvider : public dp::xlsxDataProvider {
-  public:
-    void read(const std::string& path) {
-        reader_ = std::make_unique<dp::ExcelXmlReader>(path, "m/d/yy", GetMissingVxlValue(), this, &calendar_);
-        reader_->mReadExcelWorkbook();
-    }
-    dp::IVariableFormat* CreateVextralNumericFormat(const dp::ExternalDataRecordCell& cell) const override {
-        return reader_->createVextralNumericFormat(cell.formatIndex);
-    }
-    bool IsDateTimeFormatType(const dp::ExternalDataRecordCell& cell) const override {
-        return reader_->IsDateTimeFormatType(reader_->GetExcelFormatType(cell.formatIndex));
-    }
-
-  private:
-    Calendar calendar_;
-    std::unique_ptr<dp::ExcelXmlReader> reader_;
 };
 
 void addNumbers(const dp::INumericColumn& column, json& shown) {
@@ -119,9 +99,11 @@ json contents(dp::IDataProvider& provider) {
 
 json imported(const std::string& path) {
     if (path.ends_with(".xml")) {
-        const auto provider = held(new DocumentProvider);
+        Calendar calendar;
+        const auto provider = held(new testkit::ReadingProvider);
         try {
-            provider->read(path);
+            provider->read(std::make_unique<dp::ExcelXmlReader>(path, "m/d/yy", provider->GetMissingVxlValue(),
+                                                                provider.get(), &calendar));
         } catch (const CmXmlException& error) {
             return {{"error", error.code()}};
         }

@@ -12,8 +12,9 @@
 #include "dpxlsx/provider/unpacking_limits.h"
 #include "dpxlsx/provider/xlsx_data_provider.h"
 #include "dpxlsx/readers/xml/file_copy.h"
-#include "fuzz/zip_writer.h"
-#include "tests/package_builder.h"
+#include "testkit/package_builder.h"
+#include "testkit/process_settings.h"
+#include "testkit/zip_writer.h"
 #include "tests/temporary_files.h"
 
 // Simulated faults of the machine: this program replaces functions of the C library that the library calls. Whatever
@@ -88,13 +89,11 @@ extern "C" [[gnu::visibility("default")]] ssize_t sendfile(int out, int in, off_
 namespace {
 
 namespace fs = boost::filesystem;
+using testkit::PackageBuilder;
 
 class Faults : public TemporaryFiles {
   protected:
-    void SetUp() override {
-        TemporaryFiles::SetUp();
-        PackageBuilder::of({"<row><c><v>1</v></c></row>"}).write(good());
-    }
+    void SetUp() override { PackageBuilder::of({"<row><c><v>1</v></c></row>"}).write(good()); }
     std::string good() const { return file("good.xlsx"); }
 
     // The result code; 2 for the file system's exception.
@@ -133,9 +132,10 @@ class Faults : public TemporaryFiles {
 
 TEST_F(Faults, OfTemporaryDirectories) {
     for (const auto& [directory, result] : {std::pair{file("nowhere"), 2}, {good(), 2}, {"/proc", -18}}) {
-        ::setenv("TMPDIR", directory.c_str(), 1);
-        EXPECT_EQ(open(good()), result) << directory;
-        ::setenv("TMPDIR", temporary().c_str(), 1);
+        {
+            const testkit::EnvironmentVariable elsewhere("TMPDIR", directory);
+            EXPECT_EQ(open(good()), result) << directory;
+        }
         expectRecovery();
     }
 }
@@ -190,11 +190,11 @@ TEST_F(Faults, OfSlowAndBadDisks) {
 }
 
 TEST_F(Faults, OfPackagesBeyondTheLimits) {
-    fuzz::ZipWriter growth;
+    testkit::ZipWriter growth;
     growth.add({"bomb", "", true, false, 0xFFFFFFFF});
-    fuzz::ZipWriter entries;
+    testkit::ZipWriter entries;
     for (std::uint64_t i = 0; i <= dp::kPackageEntries; ++i) entries.add({"e", "", false});
-    for (const fuzz::ZipWriter* archive : {&growth, &entries}) {
+    for (const testkit::ZipWriter* archive : {&growth, &entries}) {
         EXPECT_EQ(open(write("large.xlsx", archive->finished())), -1);
         EXPECT_FALSE(fs::exists(provider.GetTempDirectoryPath()));
         expectRecovery();

@@ -173,7 +173,7 @@ class Round {
         }
     }
 
-    KeptSettings settings_;
+    testkit::KeptSettings settings_;
     std::mt19937 random_;
     HandFilledProvider provider_;
     naive::Provider naive_;

@@ -9,9 +9,9 @@
 #include "dpxlsx/provider/temporary_directory.h"
 #include "dpxlsx/readers/xml/file_copy.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
+#include "testkit/package_builder.h"
+#include "testkit/recording_provider.h"
 #include "tests/case_table.h"
-#include "tests/package_builder.h"
-#include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
 
 // Entry points, unpacking, and what is left on disk.
@@ -19,6 +19,8 @@ namespace {
 
 namespace fs = boost::filesystem;
 using Access = dp::IDataProvider::FileAccess;
+using testkit::EnvironmentVariable;
+using testkit::PackageBuilder;
 
 const std::string kRow = "<row><c><v>1</v></c></row>";
 
@@ -80,7 +82,7 @@ class Opening : public TemporaryFiles {
         TemporaryFiles::TearDown();
     }
 
-    RecordingProvider provider;
+    testkit::RecordingProvider provider;
 };
 
 TEST_F(Opening, AnswersResultCodes) {
@@ -139,14 +141,13 @@ TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
 TEST_F(Opening, ResolvesRelativeNames) {
     sound().write(file("BOOK.XLSX"));
     fs::current_path(files());
-    ::setenv("TMPDIR", "../tmp", 1);
+    const EnvironmentVariable relative("TMPDIR", "../tmp");
     EXPECT_EQ(open("BOOK.XLSX"), 0);
     EXPECT_EQ(fs::current_path(), files());
     const fs::path directory = provider.GetTempDirectoryPath();
     EXPECT_TRUE(directory.is_absolute());
     EXPECT_TRUE(fs::exists(directory / "BOOK.XLSX"));
     fs::current_path(workingDirectory());
-    ::setenv("TMPDIR", temporary().c_str(), 1);
     provider.CloseFile();
 }
 
@@ -225,7 +226,7 @@ TEST_F(Opening, NeedsNoWorkingDirectory) {
     fs::copy_file(file("book.xlsx"), file("c:/book.xlsx"));
     const fs::path address = temporary() / "a:/b";
     fs::create_directories(address);
-    ::setenv("TMPDIR", (temporary().string() + "/a://b").c_str(), 1);
+    const EnvironmentVariable likeAnAddress("TMPDIR", temporary().string() + "/a://b");
     fs::create_directory(file("gone"));
     fs::current_path(file("gone"));
     fs::remove(file("gone"));
@@ -243,10 +244,9 @@ TEST_F(Opening, NeedsNoWorkingDirectory) {
     }
     EXPECT_EQ(open("//no-such-book.xlsx"), -17);
     EXPECT_THROW(open("book.xlsx"), fs::filesystem_error) << "a relative name has nothing to be relative to";
-    ::setenv("TMPDIR", ".", 1);
+    const EnvironmentVariable relative("TMPDIR", ".");
     EXPECT_THROW(open(file("book.xlsx")), fs::filesystem_error);
     fs::current_path(workingDirectory());
-    ::setenv("TMPDIR", temporary().c_str(), 1);
     EXPECT_TRUE(fs::is_empty(address));
     fs::remove_all(temporary() / "a:");
 }
@@ -256,10 +256,9 @@ TEST_F(Opening, CopiesAcrossFileSystems) {
     boost::system::error_code error;
     if (!fs::create_directory(other, error)) GTEST_SKIP() << "no second file system to write to";
     sound().write(file("book.xlsx"));
-    ::setenv("TMPDIR", other.c_str(), 1);
+    const EnvironmentVariable elsewhere("TMPDIR", other.string());
     EXPECT_EQ(open(file("book.xlsx")), 0);
     provider.CloseFile();
-    ::setenv("TMPDIR", temporary().c_str(), 1);
     EXPECT_TRUE(fs::remove(other)) << "and nothing is left in it";
 }
 

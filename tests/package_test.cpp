@@ -2,15 +2,17 @@
 #include <regex>
 
 #include "dpxlsx/readers/xml/xml_reader.h"
+#include "testkit/package_builder.h"
+#include "testkit/recording_provider.h"
 #include "tests/case_table.h"
-#include "tests/package_builder.h"
-#include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
 
 // Packages of literal parts, read into a provider that records the calls it receives.
 namespace {
 
 using Access = dp::IDataProvider::FileAccess;
+using testkit::PackageBuilder;
+using testkit::RecordingProvider;
 
 class Packages : public TemporaryFiles {
   protected:
@@ -82,7 +84,7 @@ TEST_F(Packages, StepsOfAReading) {
         using ExcelXLSXReader::styles;
     };
     const std::string cells = "<row><c s='0'><v>1</v></c><c s='1'><v>2</v></c><c t='s'><v>0</v></c></row>";
-    for (const auto& [name, content] : PackageBuilder::of({cells}).parts) write(name, content);
+    PackageBuilder::of({cells}).unpackTo(files().string());
     write("xl/styles.xml", "<styleSheet><cellXfs><xf numFmtId='14'/><xf numFmtId='164'/></cellXfs></styleSheet>");
     RecordingProvider provider;
     Reader reader(files().string(), true, "m/d/yy", 0, &provider, nullptr);

@@ -4,7 +4,6 @@
 #include <optional>
 #include <sstream>
 #include <string>
-#include <tuple>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -13,7 +12,8 @@
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/percentage_variable_format.h"
 #include "dpxlsx/model/host/i_string.h"
-#include "dpxlsx/provider/excel_data_provider_base.h"
+#include "testkit/process_settings.h"
+#include "testkit/providers.h"
 
 namespace dp {
 
@@ -62,23 +62,15 @@ class HandHelper : public DateTimeVariableFormat {
     std::string taken_;
 };
 
-// A provider whose worksheets are filed cell by cell, without a file.
-class HandFilledProvider : public ExcelDataProviderBase {
+// A provider with the formats of these styles.
+class HandFilledProvider : public testkit::FilingProvider {
   public:
-    long GetWorksheets(const char*, std::vector<std::string>&) override { return -1; }
-    long OpenFile(const char*, FileAccess) override { return -1; }
-    long CloseFile() override { return 0; }
     IVariableFormat* CreateVextralNumericFormat(const ExternalDataRecordCell& cell) const override {
         ++formatsMade;
         return formatOfStyle(cell.formatIndex).release();
     }
     bool IsDateTimeFormatType(const ExternalDataRecordCell& cell) const override {
         return isDateStyle(cell.formatIndex);
-    }
-    void file(unsigned row, unsigned column, const ExternalDataRecordCell& cell) {
-        ExternalDataRecord record(0, 0, row, column);
-        record.cell = cell;
-        AddExternalDataRecord(record);
     }
 
     using ExcelDataProviderBase::_blankRows;
@@ -183,25 +175,9 @@ inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key, Colum
     return facts;
 }
 
-inline auto processSettings() {
-    using Settings = ExcelDataProviderBase;
-    return std::tie(Settings::_missingValue, Settings::_minNumericValue, Settings::_maxNumericValue,
-                    Settings::_maxTextLength, Settings::_inputDecimal, Settings::_outputDecimal,
-                    Settings::_outputGroupingSymbol, Settings::_missingValueText, Settings::_trueValue,
-                    Settings::_falseValue);
-}
-
-// Restores the settings of the process when it is destroyed.
-struct KeptSettings {
-    ~KeptSettings() { processSettings() = before; }
-
-    std::tuple<double, double, double, int, char, char, char, std::string, std::string, std::string> before{
-        processSettings()};
-};
-
 class ProviderTest : public testing::Test {
   protected:
-    KeptSettings settings;
+    testkit::KeptSettings settings;
     HandFilledProvider provider;
 };
 

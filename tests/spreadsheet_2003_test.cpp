@@ -4,8 +4,8 @@
 
 #include "dpxlsx/formats/date_time_variable_format.h"
 #include "dpxlsx/readers/xml2003/excel_xml_reader.h"
+#include "testkit/recording_provider.h"
 #include "tests/case_table.h"
-#include "tests/recording_provider.h"
 #include "tests/temporary_files.h"
 
 // XML Spreadsheet 2003 documents of literal parts, read into a provider that records the calls it receives.
@@ -58,7 +58,7 @@ class Spreadsheet2003 : public TemporaryFiles {
         return calls;
     }
 
-    RecordingProvider provider;
+    testkit::RecordingProvider provider;
     FieldsHelper helper;
 };
 

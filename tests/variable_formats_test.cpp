@@ -22,7 +22,7 @@
 #include "dpxlsx/formats/percentage_variable_format.h"
 #include "dpxlsx/formats/text_variable_format.h"
 #include "dpxlsx/provider/excel_data_provider_base.h"
-#include "tests/allocated_bytes.h"
+#include "testkit/allocated_bytes.h"
 
 namespace dp {
 namespace {
@@ -286,11 +286,11 @@ TEST_F(VariableFormats, OneFormatterServesAFormatAndGoesWithIt) {
     const DateTimeVariableFormat kept("M/d/yyyy");
     std::size_t before = 0;
     for (int i = 0; i < 300; ++i) {
-        if (i == 100) before = allocatedBytes();
+        if (i == 100) before = testkit::allocatedBytes();
         rendered(kept, i);
         rendered(DateTimeVariableFormat("M/d/yy"), i);
     }
-    EXPECT_LT(allocatedBytes() - before, 100000U);
+    EXPECT_LT(testkit::allocatedBytes() - before, 100000U);
 }
 
 TEST_F(VariableFormats, DateTimeParameters) {

@@ -11,6 +11,7 @@
 
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
+#include "testkit/process_settings.h"
 #include "tests/case_table.h"
 #include "tests/temporary_files.h"
 
