@@ -17,6 +17,7 @@
 #include "bench/workbooks.h"
 #include "dpxlsx/model/host/i_column.h"
 #include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/provider/xlsx_data_provider.h"
 
 namespace {
@@ -41,13 +42,6 @@ int write(const std::string& directory, unsigned part) {
 // Columns that a host holds, all at once.
 class Columns {
   public:
-    Columns() = default;
-    ~Columns() {
-        for (dp::IColumn* column : held_) column->Release();
-    }
-    Columns(const Columns&) = delete;
-    Columns& operator=(const Columns&) = delete;
-
     void pull(dp::IDataProvider& provider) {
         bench::forEachColumn(provider, [this](dp::IColumn& column) { hold(column); });
     }
@@ -57,8 +51,7 @@ class Columns {
 
   private:
     void hold(dp::IColumn& column) {
-        column.AddRef();
-        held_.push_back(&column);
+        held_.emplace_back(&column);
         values_ += bench::valuesOf(column);
         if (column.GetStorageType() == dp::IVariable::StorageType::Text)
             look(*static_cast<const dp::ITextColumn&>(column).GetTextValues());
@@ -75,7 +68,7 @@ class Columns {
         for (int row = 0; row < count; ++row) sum_ += numbers[row];
     }
 
-    std::vector<dp::IColumn*> held_;
+    std::vector<dp::Reference<dp::IColumn>> held_;
     unsigned long values_ = 0;  // those that are not missing
     double sum_ = 0;            // of the numbers and the texts' bytes
 };

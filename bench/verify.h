@@ -9,6 +9,7 @@
 #include "dpxlsx/model/host/i_column.h"
 #include "dpxlsx/model/host/i_data_provider.h"
 #include "dpxlsx/model/host/i_finders.h"
+#include "dpxlsx/model/host/reference.h"
 
 // A benchmark reports a figure only if the work was done: the values behind every figure are
 // counted.
@@ -46,9 +47,7 @@ void forEachColumn(dp::IDataProvider& provider, const Use& use) {
         for (unsigned long key = 0; key < keys.Count(); ++key) {
             dp::IColumn* column = nullptr;
             if (!finder.FindColumn(keys.Item(key), &column, false)) continue;
-            column->AddRef();
-            use(*column);
-            column->Release();
+            use(*dp::Reference(column));
         }
     }
 }

@@ -17,6 +17,7 @@
 
 #include "dpxlsx/model/host/entry_points.h"
 #include "dpxlsx/model/host/i_column.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
@@ -100,7 +101,7 @@ void loadColumns(const dp::IVariableFinder& finder) {
     for (int key = 1; key <= 5; ++key) {
         try {
             dp::IColumn* column = nullptr;
-            if (finder.FindColumn(key, &column, false)) fuzz::referenceTo(column);
+            if (finder.FindColumn(key, &column, false)) dp::Reference<dp::IColumn>{column};
         } catch (const std::bad_alloc&) {
         }
     }
@@ -121,7 +122,7 @@ void recover(dp::IDataProvider& provider, const std::string& path) {
 
 // The result while the allocation after `count` fails; `failed` says whether one did.
 long openAtAllocation(const std::string& path, long count, bool& failed) {
-    const auto provider = fuzz::referenceTo(newProvider());
+    const dp::Reference provider(newProvider());
     allocationsLeft = count;
     const long result = open(*provider, path);
     loadColumns(*provider->GetVariableFinder());
@@ -132,7 +133,7 @@ long openAtAllocation(const std::string& path, long count, bool& failed) {
 }
 
 long openWithDescriptors(const std::string& path, rlim_t most) {
-    const auto provider = fuzz::referenceTo(newProvider());
+    const dp::Reference provider(newProvider());
     rlimit before{};
     ::getrlimit(RLIMIT_NOFILE, &before);
     const rlimit less{most, before.rlim_max};

@@ -3,10 +3,13 @@
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
+#include <memory>
+#include <vector>
 
 #include "dpxlsx/model/host/i_column.h"
 #include "dpxlsx/model/host/i_string.h"
 #include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/model/host/reference.h"
 #include "fuzz/checks.h"
 
 namespace fuzz {
@@ -64,7 +67,7 @@ class Taking {
   private:
     void take(dp::IColumn* column) {
         require(column != nullptr, "found and not given");
-        rows_ += read(*referenceTo(column));
+        rows_ += read(*dp::Reference(column));
     }
     static unsigned long read(dp::IColumn& column) { return fuzz::read(column); }
 
@@ -118,7 +121,7 @@ void takeEverything(dp::IDataProvider& provider) {
     for (const int key : keys) {
         dp::IWorksheet* worksheet = nullptr;
         require(finder.FindWorksheet(key, &worksheet), "a worksheet without its key");
-        const auto reference = referenceTo(worksheet);
+        const dp::Reference reference(worksheet);
         require(worksheet->GetPrimeKey() == key, "another worksheet");
         read(worksheet->GetView()->GetMissingValue());
         if (!taking.enough()) taking.columns(key);

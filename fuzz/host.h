@@ -1,28 +1,11 @@
 #pragma once
 
-#include <memory>
-
 #include "dpxlsx/formats/date_time_variable_format.h"
 #include "dpxlsx/model/host/i_data_provider.h"
 #include "dpxlsx/model/host/i_finders.h"
-#include "dpxlsx/model/host/i_resource.h"
 
 // What hosts do with a provider.
 namespace fuzz {
-
-// Deletes by Release.
-struct Releasing {
-    void operator()(dp::IResource* object) const { object->Release(); }
-};
-template <class T>
-using Reference = std::unique_ptr<T, Releasing>;
-
-// Takes the first reference of a new object.
-template <class T>
-Reference<T> referenceTo(T* object) {
-    if (object) object->AddRef();
-    return Reference<T>(object);
-}
 
 // A host's date-time helper, which reads texts that begin with a number.
 class Helper : public dp::DateTimeVariableFormat {

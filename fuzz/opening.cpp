@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
@@ -23,7 +24,7 @@ bool isResultOfOpening(long result) {
 long openAsHost(const std::string& path) {
     dp::IDataProvider* created = nullptr;
     require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
-    const auto provider = referenceTo(created);
+    const dp::Reference provider(created);
     provider->SetDateTimeVariableFormatHelper(new Helper);
     std::vector<std::string> names;
     require(isResultOfOpening(provider->GetWorksheets(path.c_str(), names)), "another result");

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/provider/package.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "fuzz/checks.h"
@@ -42,7 +43,7 @@ class Package {
 
 void readPackage(const std::string& directory) {
     dp::checkWorkbook(directory);
-    const auto provider = fuzz::referenceTo(new testkit::ReadingProvider);
+    const dp::Reference provider(new testkit::ReadingProvider);
     provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
     try {
         provider->read(std::make_unique<dp::ExcelXLSXReader>(

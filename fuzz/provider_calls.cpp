@@ -11,6 +11,7 @@
 #include "dpxlsx/model/host/entry_points.h"
 #include "dpxlsx/model/host/i_column.h"
 #include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/readers/worksheet_size.h"
 #include "dpxlsx/store/external_data_record.h"
 #include "fuzz/checks.h"
@@ -39,7 +40,7 @@ class Host {
         dp::IDataProvider* created = nullptr;
         require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
         // The provider with all its operations, including those for readers.
-        provider_ = fuzz::referenceTo(dynamic_cast<dp::IExcelDataProvider*>(created));
+        provider_.reset(dynamic_cast<dp::IExcelDataProvider*>(created));
     }
 
     void run() {
@@ -259,14 +260,14 @@ class Host {
                           : finder.FindColumn(column_key, &column, storage, &type, input_.flag());
         require(found == (column != nullptr), "found and not given, or the other way round");
         if (!found) return;
-        auto reference = fuzz::referenceTo(column);
+        dp::Reference reference(column);
         constexpr unsigned long kKeptRows = 1000;
         if (fuzz::read(*column) < kKeptRows) columns_.push_back(std::move(reference));
     }
     void findWorksheet() {
         dp::IWorksheet* worksheet = nullptr;
         if (provider_->GetWorksheetFinder()->FindWorksheet(anyKey(), &worksheet))
-            worksheets_.push_back(fuzz::referenceTo(worksheet));
+            worksheets_.emplace_back(worksheet);
     }
     void askKeys() {
         const dp::IVariableFinder& finder = *provider_->GetVariableFinder();
@@ -305,9 +306,9 @@ class Host {
     }
 
     Input input_;
-    fuzz::Reference<dp::IExcelDataProvider> provider_;
-    std::vector<fuzz::Reference<dp::IColumn>> columns_;  // released before the provider
-    std::vector<fuzz::Reference<dp::IWorksheet>> worksheets_;
+    dp::Reference<dp::IExcelDataProvider> provider_;
+    std::vector<dp::Reference<dp::IColumn>> columns_;  // released before the provider
+    std::vector<dp::Reference<dp::IWorksheet>> worksheets_;
 };
 
 }  // namespace

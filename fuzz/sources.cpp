@@ -12,12 +12,12 @@
 #include <vector>
 
 #include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/readers/xlsx/cell_assembler.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "dpxlsx/readers/xlsx/shared_string_entries.h"
 #include "dpxlsx/readers/xlsx/worksheet_sources.h"
 #include "fuzz/checks.h"
-#include "fuzz/host.h"
 #include "fuzz/input.h"
 #include "testkit/package_builder.h"
 #include "testkit/recording_provider.h"
@@ -36,7 +36,7 @@ struct Outcome {
 // refer to.
 class Package {
   public:
-    Package() : provider_(fuzz::referenceTo(new testkit::RecordingProvider)) {
+    Package() : provider_(new testkit::RecordingProvider) {
         const std::string directory = fuzz::ownFiles() + "/package";
         testkit::PackageBuilder::small().unpackTo(directory);
         reader_ = std::make_unique<dp::ExcelXLSXReader>(directory, true, dp::GetShortDateMask(),
@@ -61,7 +61,7 @@ class Package {
     }
 
   private:
-    fuzz::Reference<testkit::RecordingProvider> provider_;
+    dp::Reference<testkit::RecordingProvider> provider_;
     std::unique_ptr<dp::ExcelXLSXReader> reader_;
 };
 

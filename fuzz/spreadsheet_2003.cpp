@@ -8,6 +8,7 @@
 #include <boost/lexical_cast.hpp>
 
 #include "dpxlsx/formats/format_codes.h"
+#include "dpxlsx/model/host/reference.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
 #include "testkit/providers.h"
@@ -16,7 +17,7 @@
 namespace {
 
 void readDocument(const std::string& path) {
-    const auto provider = fuzz::referenceTo(new testkit::ReadingProvider);
+    const dp::Reference provider(new testkit::ReadingProvider);
     provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
     try {
         provider->read(std::make_unique<dp::ExcelXmlReader>(

@@ -4,6 +4,7 @@
 #include <functional>
 #include <sstream>
 
+#include "dpxlsx/model/host/reference.h"
 #include "tests/provider_fixture.h"
 
 // Columns as a host asks for them, from cells filed by hand.
@@ -258,9 +259,7 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     EXPECT_EQ(factsOf(provider, 1).rows(), "4");
     IColumn* column = nullptr;
     ASSERT_TRUE(provider.GetVariableFinder()->FindColumn(2, &column, true));
-    EXPECT_EQ(column->GetPrimeKey(), 2);
-    column->AddRef();
-    column->Release();
+    EXPECT_EQ(Reference(column)->GetPrimeKey(), 2);
     provider.ClearWorksheets();
     EXPECT_FALSE(factsOf(provider, 1).found);
 }
@@ -299,11 +298,8 @@ TEST_F(ColumnsOnDemand, ForgetsEverythingWithItsWorksheets) {
         file(p, 1, "'d|@3");
         file(p, 2, "'t|'a  b");
         IWorksheet* worksheet = nullptr;
-        for (unsigned long n = p.GetWorksheetPrimeKeys()->Count(); n > 0 && p.FindWorksheet(1, &worksheet); n = 0) {
-            worksheet->AddRef();
-            out << worksheet->GetTitle();
-            worksheet->Release();
-        }
+        for (unsigned long n = p.GetWorksheetPrimeKeys()->Count(); n > 0 && p.FindWorksheet(1, &worksheet); n = 0)
+            out << Reference(worksheet)->GetTitle();
         const auto columns = [&] {
             p.GetWorksheetPrimeKeys();
             for (int key = 1; key <= 3; ++key) out << ", " << factsOf(p, key).name << ": " << factsOf(p, key).rows();

@@ -17,19 +17,13 @@
 #include "dpxlsx/model/host/i_finders.h"
 #include "dpxlsx/model/host/i_string.h"
 #include "dpxlsx/model/host/i_worksheet.h"
+#include "dpxlsx/model/host/reference.h"
 #include "testkit/providers.h"
 #include "tests/temporary_files.h"
 
 namespace {
 
 using nlohmann::json;
-
-// Owns one reference to a counted object.
-template <class T>
-std::shared_ptr<T> held(T* object) {
-    object->AddRef();
-    return {object, [](T* released) { released->Release(); }};
-}
 
 std::string taken(dp::IString* text) { return std::unique_ptr<dp::IString>(text)->database_str(); }
 
@@ -90,9 +84,9 @@ json contents(dp::IDataProvider& provider) {
         for (unsigned long j = 0; j < keys.Count(); ++j) {
             dp::IColumn* column = nullptr;
             EXPECT_TRUE(provider.GetVariableFinder()->FindColumn(keys.Item(j), &column, false));
-            columns.push_back(contents(*held(column)));
+            columns.push_back(contents(*dp::Reference(column)));
         }
-        sheets.push_back({{"name", held(found)->GetTitle()}, {"columns", columns}});
+        sheets.push_back({{"name", dp::Reference(found)->GetTitle()}, {"columns", columns}});
     }
     return {{"sheets", sheets}};
 }
@@ -100,7 +94,7 @@ json contents(dp::IDataProvider& provider) {
 json imported(const std::string& path) {
     if (path.ends_with(".xml")) {
         Calendar calendar;
-        const auto provider = held(new testkit::ReadingProvider);
+        const dp::Reference provider(new testkit::ReadingProvider);
         try {
             provider->read(std::make_unique<dp::ExcelXmlReader>(path, "m/d/yy", provider->GetMissingVxlValue(),
                                                                 provider.get(), &calendar));
@@ -111,7 +105,7 @@ json imported(const std::string& path) {
     }
     dp::IDataProvider* made = nullptr;
     EXPECT_EQ(dp::CreateDataProvider("xlsx", &made), 0);
-    const auto provider = held(made);
+    const dp::Reference provider(made);
     EXPECT_EQ(provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read), 0);
     const json all = contents(*provider);
     EXPECT_EQ(provider->CloseFile(), 0);

@@ -4,6 +4,7 @@
 #include <sys/stat.h>
 
 #include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/provider/entry_name.h"
 #include "dpxlsx/provider/package.h"
 #include "dpxlsx/provider/temporary_directory.h"
@@ -133,9 +134,7 @@ TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
     EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 2UL) << "the cells stay";
     dp::IColumn* column = nullptr;
     ASSERT_TRUE(provider.GetVariableFinder()->FindColumn(1, &column, false));
-    column->AddRef();
-    EXPECT_TRUE(column->GetFormat()->GetAuto()) << "and load without the file";
-    column->Release();
+    EXPECT_TRUE(dp::Reference(column)->GetFormat()->GetAuto()) << "and load without the file";
 }
 
 TEST_F(Opening, ResolvesRelativeNames) {
