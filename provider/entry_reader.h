@@ -10,7 +10,8 @@ namespace dp {
 
 // The bytes of an archive's entries. minizip finds the entry and checks its headers; ISA-L, where
 // the library is built with it, inflates several times as fast as zlib does. The results are the
-// same.
+// same, with one exception: ISA-L takes incomplete Huffman codes, which zlib refuses and no program
+// writes. A damaged entry that has them still fails, by its size or sum.
 class EntryReader {
   public:
     explicit EntryReader(unzFile archive);
