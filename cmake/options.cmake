@@ -7,7 +7,8 @@ file(CREATE_LINK ${PROJECT_SOURCE_DIR} ${PROJECT_BINARY_DIR}/include/dpxlsx SYMB
 target_include_directories(dpxlsx_options INTERFACE
     ${PROJECT_BINARY_DIR}/include ${PROJECT_SOURCE_DIR})
 target_compile_options(dpxlsx_options INTERFACE
-    -Wall -Wextra -Wpedantic -Wshadow -Wconversion
+    -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wsign-conversion -Wold-style-cast -Wcast-qual
+    -Wundef -Wdouble-promotion -Wnon-virtual-dtor
     # g++ 12 sees overlapping copies in the standard library's own string concatenation.
     $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict>
     $<$<BOOL:${DPXLSX_WERROR}>:-Werror>)

@@ -250,7 +250,7 @@ TEST(BlankRows, AreCountedAsInASet) {
         for (unsigned i = 0; i < 100; ++i) {
             const unsigned from = random.below(height), end = random.below(height + 100);
             unsigned expected = 0;
-            for (unsigned row = from; row < std::min(end, last + 1); ++row) expected += occupied.count(row) ? 0 : 1;
+            for (unsigned row = from; row < std::min(end, last + 1); ++row) expected += occupied.count(row) ? 0U : 1U;
             ASSERT_EQ(blank.countBetween(from, end), expected) << from << " to " << end;
         }
     }

@@ -376,7 +376,7 @@ TEST_F(ColumnsOnDemand, PassesOverBlankRowsForItsHost) {
         const CellColumn& cells = provider._cells[0].nth(0).second;
         const unsigned slots = provider.HandleBlankRows(&column, 1, 2, 4, cells.lower_bound(4));
         std::string text = std::to_string(slots) + ":";
-        for (int row = 0; row < 4; ++row) text += " " + std::to_string(static_cast<int>(column.values[row]));
+        for (std::size_t row = 0; row < 4; ++row) text += " " + std::to_string(static_cast<int>(column.values[row]));
         return text;
     };
     fileSheet("'n|1|||4|5", {});

@@ -110,7 +110,7 @@ TEST_F(Opening, AnswersResultCodes) {
 }
 
 TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
-    for (const mode_t mask : {0, 0777}) {
+    for (const mode_t mask : {0U, 0777U}) {
         const mode_t before = ::umask(mask);
         const long result = openPackage(
             sound().add("docs/", "").add("docs/deep/er/a.txt", "a").add("xl/../C:/b:c", "b").add("xl/..", ""));

@@ -35,7 +35,7 @@ class PlainXmlNodes : public TemporaryFiles {
 // However the bytes arrive.
 TEST_F(PlainXmlNodes, AreThoseOfTheDocument) {
     for (const auto& c : caseTable("plain_xml.txt"))
-        for (const std::size_t chunk : {1, 2, 3, 5, 7, 64, 1 << 20})
+        for (const std::size_t chunk : {1U, 2U, 3U, 5U, 7U, 64U, 1U << 20})
             EXPECT_EQ(read(c[1], chunk), c[2]) << c[0] << ", " << chunk << " bytes at a time";
 }
 

@@ -59,8 +59,9 @@ bool isValidSerial(double serial) { return serial >= 0 && serial <= kLastSerial;
 double serialOf(const CalendarTime& time) {
     if (time.month < 1 || time.month > 12 || time.day < 1 || time.day > 31) return kNoSerial;
     const bool fictitious = time.year == 1900 && time.month == 2 && time.day == 29;
+    const auto month = static_cast<unsigned>(time.month);
     const auto first =
-        calendar::sys_days{calendar::year{time.year} / static_cast<unsigned>(time.month) / 1};
+        calendar::sys_days{calendar::year{time.year} / calendar::month{month} / calendar::day{1}};
     const double days = static_cast<double>((first - kDayZero).count() + time.day - 1);
     const double day = fictitious ? kFictitiousDay : serialDay(days);
     const double seconds = time.hour * 3600.0 + time.minute * 60.0 + time.second;
