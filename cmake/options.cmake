@@ -12,6 +12,8 @@ target_compile_options(dpxlsx_options INTERFACE
     # g++ 12 sees overlapping copies in the standard library's own string concatenation.
     $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict>
     $<$<BOOL:${DPXLSX_WERROR}>:-Werror>)
+# The standard library checks indexes and preconditions.
+target_compile_definitions(dpxlsx_options INTERFACE $<$<CONFIG:Debug>:_GLIBCXX_ASSERTIONS>)
 if(DPXLSX_SANITIZE)
     target_compile_options(dpxlsx_options INTERFACE
         -fsanitize=${DPXLSX_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer
