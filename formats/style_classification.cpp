@@ -1,13 +1,12 @@
 #include "dpxlsx/formats/style_classification.h"
 
 #include <algorithm>
-#include <memory>
 #include <utility>
 
+#include "dpxlsx/formats/automatic_format.h"
 #include "dpxlsx/formats/date_time_variable_format.h"
 #include "dpxlsx/formats/excel_to_icu.h"
 #include "dpxlsx/formats/format_codes.h"
-#include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/percentage_variable_format.h"
 
 namespace dp {
@@ -34,12 +33,6 @@ constexpr LocaleStyle kLocaleStyles[] = {
     {"22", DATE_PART | TIME_PART},
 };
 
-IVariableFormat* createAutomaticFormat() {
-    auto format = std::make_unique<NumericVariableFormat>();
-    format->autoFormat = true;
-    return format.release();
-}
-
 IVariableFormat* createDateTimeFormat(std::string& code) {
     removeBackslashes(code);
     const std::string* pattern = icuPatternOf(code);
@@ -49,9 +42,9 @@ IVariableFormat* createDateTimeFormat(std::string& code) {
 IVariableFormat* createNumberFormat(std::string& code) {
     if (parseDecimalFormat(code)) return createVextralDecimalFormat(code);
     if (parsePercentageFormat(code)) return createVextralPercentageFormat(code);
-    if (parseCurrencyFormat(code)) return createAutomaticFormat();
+    if (parseCurrencyFormat(code)) return createAutomaticFormat().release();
     if (parseScientficFormat(code)) return createVextralScientificFormat(code);
-    return createAutomaticFormat();
+    return createAutomaticFormat().release();
 }
 
 }  // namespace
@@ -125,7 +118,7 @@ bool DateTimeFormatEqualCode::operator()(const xStyle& style) const {
 
 IVariableFormat* createStyleFormat(std::vector<xStyle>& styles, int styleIndex, bool isDateTime) {
     if (styleIndex < 0 || static_cast<std::size_t>(styleIndex) >= styles.size())
-        return createAutomaticFormat();
+        return createAutomaticFormat().release();
     std::string& code = styles[static_cast<std::size_t>(styleIndex)].formatCode;
     return isDateTime ? createDateTimeFormat(code) : createNumberFormat(code);
 }

@@ -1,17 +1,10 @@
 #include "dpxlsx/provider/excel_data_provider_base.h"
 
 #include "dpxlsx/model/reference_count.h"
+#include "dpxlsx/store/conversion.h"
 
 // Construction, reference counting and destruction of the provider.
 namespace dp {
-
-namespace {
-
-// The initial value of both numbers of SetMissingNumeric: the initial missing value, whatever
-// SetMissingValue has set since.
-constexpr double kInitialMissingNumeric = 1.23456e30;
-
-}  // namespace
 
 ExcelDataProviderBase::ExcelDataProviderBase() { ResetInternalData(); }
 
@@ -35,8 +28,9 @@ void ExcelDataProviderBase::ResetInternalData() {
     _allWorksheetKeys.items.clear();
     _worksheetKeys.items.clear();
     _writeVariableNames = true;
-    _missingNumericFrom = kInitialMissingNumeric;
-    _missingNumericTo = kInitialMissingNumeric;
+    // Whatever SetMissingValue has set since.
+    _missingNumericFrom = kInitialMissingValue;
+    _missingNumericTo = kInitialMissingValue;
     _alphaMissingNumericSet = false;
     _sheetReadOptions.clear();
     _ignoreBlankRows = false;

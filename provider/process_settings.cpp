@@ -1,11 +1,12 @@
 #include "dpxlsx/formats/input_decimal.h"
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/conversion.h"
 #include "dpxlsx/store/number_recognition.h"
 
 namespace dp {
 
-double ExcelDataProviderBase::_missingValue = 1.23456e30;
+double ExcelDataProviderBase::_missingValue = kInitialMissingValue;
 double ExcelDataProviderBase::_minNumericValue = -1.001e18;
 double ExcelDataProviderBase::_maxNumericValue = 1.001e18;
 double ExcelDataProviderBase::_maxNumericInt = 2147000000.0;

@@ -6,8 +6,8 @@
 
 #include <boost/filesystem.hpp>
 
+#include "dpxlsx/formats/automatic_format.h"
 #include "dpxlsx/formats/format_codes.h"
-#include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/provider/file_type.h"
 #include "dpxlsx/provider/temporary_directory.h"
@@ -92,9 +92,7 @@ std::string xlsxDataProvider::GetTempDirectoryPath() const { return _tempDirecto
 IVariableFormat* xlsxDataProvider::CreateVextralNumericFormat(
     const ExternalDataRecordCell& cell) const {
     if (_reader) return _reader->createVextralNumericFormat(cell.formatIndex);
-    auto format = std::make_unique<NumericVariableFormat>();
-    format->autoFormat = true;
-    return format.release();
+    return createAutomaticFormat().release();
 }
 
 bool xlsxDataProvider::IsDateTimeFormatType(const ExternalDataRecordCell& cell) const {

@@ -15,10 +15,22 @@ namespace dp {
 
 // How a column identifies itself to the host.
 struct ColumnIdentity {
+    template <class Column>
+    void applyTo(Column& column) const {
+        column.name = name;
+        column.primeKey = column.variableBodyPrimeKey = key;
+        column.useDefaultVariableBody = key == 0;
+        column.position = static_cast<std::int32_t>(position + 1);
+    }
+
     std::string name;
     int key;
     std::uint32_t position;  // 0-based
 };
+
+// A preview converts the first 101 values of a column, up to this slot. Later ones are the initial
+// missing value, whatever the host has set since, or empty texts.
+inline constexpr std::uint32_t kLastPreviewSlot = 100;
 
 // How a column is to be read. Texts and formats are borrowed for the duration of a load.
 struct LoadSettings {

@@ -19,6 +19,9 @@ namespace dp {
 DPXLSX_API bool IsDateTime(const IDateTimeVariableFormat* helper, const IString* format,
                            IString* text, double& value);
 
+// The initial missing value, which marks a missing value until the host sets another.
+inline constexpr double kInitialMissingValue = 1.23456e30;
+
 // The host's settings that decide how cells become values. Texts are borrowed.
 struct ConversionSettings {
     double missingValue;

@@ -1,7 +1,7 @@
 #include <algorithm>
 
+#include "dpxlsx/formats/automatic_format.h"
 #include "dpxlsx/formats/date_time_variable_format.h"
-#include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/store/column_loading.h"
 
 namespace dp {
@@ -11,21 +11,9 @@ namespace {
 using BasicDataType = IVariable::BasicDataType;
 using FormatType = IVariableFormat::FormatType;
 
-// A preview converts the first 101 values, up to this slot, and fills the rest with the missing
-// value that is set initially, whatever missing value the host has set since.
-constexpr std::uint32_t kLastPreviewSlot = 100;
-constexpr double kPreviewFiller = 1.23456e30;
-
-std::unique_ptr<IVariableFormat> automaticNumericFormat() {
-    auto format = std::make_unique<NumericVariableFormat>();
-    format->autoFormat = true;
-    return format;
-}
-
-std::unique_ptr<IVariableFormat> automaticDateTimeFormat() {
-    auto format = std::make_unique<DateTimeVariableFormat>();
-    format->autoFormat = true;
-    return format;
+std::unique_ptr<IVariableFormat> automaticFormat(BasicDataType requested) {
+    if (requested == BasicDataType::DateTime) return std::make_unique<DateTimeVariableFormat>();
+    return createAutomaticFormat();
 }
 
 // The format of a column by the first cell that has a value.
@@ -35,13 +23,13 @@ std::unique_ptr<IVariableFormat> inferFormat(const CellContent& cell, BasicDataT
         if (cell.formatIndex >= 0)
             if (auto format = formats.create(cell); format->GetType() == FormatType::Numeric)
                 return format;
-        return automaticNumericFormat();
+        return automaticFormat(requested);
     }
     if (requested == BasicDataType::DateTime) {
         if (cell.formatIndex != -1)
             if (auto format = formats.create(cell); format->GetType() == FormatType::DateTime)
                 return format;
-        return automaticDateTimeFormat();
+        return automaticFormat(requested);
     }
     return formats.create(cell);
 }
@@ -67,32 +55,17 @@ class NumericLoad {
 
     // Whether any cell was handled.
     bool run(const CellColumn& cells) {
-        const std::uint32_t firstRow = settings_.layout.firstDataRow;
-        std::uint32_t expectedRow = firstRow;
-        std::uint32_t slot = 0;
-        bool handled = false;
-        const auto end = cells.end();
-        for (auto cell = cells.lower_bound(firstRow); cell != end && slot < settings_.rowCount;
-             ++cell) {
-            const auto [row, content] = *cell;
-            if (row != expectedRow) slot += passGap(expectedRow, row);
-            if (slot >= settings_.rowCount) break;
-            expectedRow = row + 1;
-            handled = true;
-            store(content, slot);
-            ++slot;
-        }
-        return handled;
+        return walkDataCells(
+            cells, settings_.layout, settings_.rowCount, [this](const Gap& gap) { passGap(gap); },
+            [this](CellView cell, std::uint32_t slot) { store(cell, slot); });
     }
 
   private:
-    std::uint32_t passGap(std::uint32_t expectedRow, std::uint32_t row) {
-        const Gap gap = gapBefore(settings_.layout, expectedRow, row);
-        if (replacesMissing_)
-            fillGap(gap, settings_.rowCount, [&](std::size_t slot) {
-                column_.values[slot] = settings_.conversion.missingNumericTo;
-            });
-        return gap.slots;
+    void passGap(const Gap& gap) {
+        if (!replacesMissing_) return;
+        fillGap(gap, settings_.rowCount, [&](std::size_t slot) {
+            column_.values[slot] = settings_.conversion.missingNumericTo;
+        });
     }
 
     // CellView is passed by value to stay in registers: passed by reference it costs more than the
@@ -106,7 +79,7 @@ class NumericLoad {
     }
 
     double valueOf(CellView cell, std::uint32_t slot) {
-        if (settings_.previewing && slot > kLastPreviewSlot) return kPreviewFiller;
+        if (settings_.previewing && slot > kLastPreviewSlot) return kInitialMissingValue;
         bool converted = false;
         const double value = plainNumbers_ && isNumber(cell.type())
                                  ? plainNumber(cell.numValue(), converted)
@@ -157,10 +130,7 @@ std::unique_ptr<NumericColumn> loadNumericColumn(const CellColumn& cells,
                                                  BasicDataType requested,
                                                  FormatType firstCellType) {
     auto column = std::make_unique<NumericColumn>();
-    column->name = identity.name;
-    column->primeKey = column->variableBodyPrimeKey = identity.key;
-    column->useDefaultVariableBody = identity.key == 0;
-    column->position = static_cast<std::int32_t>(identity.position + 1);
+    identity.applyTo(*column);
     column->dataType =
         requested == BasicDataType::DateTime ? NumericColumn::kDateTimes : NumericColumn::kNumbers;
     column->formatDirty = true;
@@ -174,9 +144,7 @@ std::unique_ptr<NumericColumn> loadNumericColumn(const CellColumn& cells,
     NumericLoad load(*column, settings, requested, firstCellType);
     const bool handled = load.run(cells);
 
-    if (!column->format)
-        column->format = column->dataType == NumericColumn::kDateTimes ? automaticDateTimeFormat()
-                                                                       : automaticNumericFormat();
+    if (!column->format) column->format = automaticFormat(requested);
     if (column->format->GetType() == FormatType::DateTime)
         column->dataType = NumericColumn::kDateTimes;
     if (identity.name.empty() && !handled) column->rowCount = column->missingCount = 0;

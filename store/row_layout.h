@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 
 #include "dpxlsx/store/blank_rows.h"
@@ -53,6 +54,32 @@ void fillGap(const Gap& gap, std::uint32_t rowCount, Fill fill) {
     const std::uint64_t end =
         std::min(std::uint64_t{gap.firstSlot} + gap.emptyRows, std::uint64_t{rowCount});
     for (std::uint64_t slot = gap.firstSlot; slot < end; ++slot) fill(slot);
+}
+
+// Calls `onCell(cell, slot)` for the cells from the first data row on, in row order, as long as
+// their slots lie below `rowCount`, and `onGap(gap)` between cells of rows that are not adjacent.
+// Returns whether any cell was handled.
+template <class OnGap, class OnCell>
+bool walkDataCells(const CellColumn& cells, const RowLayout& layout, std::uint32_t rowCount,
+                   OnGap onGap, OnCell onCell) {
+    std::uint32_t expectedRow = layout.firstDataRow;
+    std::uint32_t slot = 0;
+    bool handled = false;
+    const auto end = cells.end();
+    for (auto cell = cells.lower_bound(expectedRow); cell != end && slot < rowCount; ++cell) {
+        const auto [row, content] = *cell;
+        if (row != expectedRow) {
+            const Gap gap = gapBefore(layout, expectedRow, row);
+            onGap(gap);
+            slot += gap.slots;
+            if (slot >= rowCount) break;
+        }
+        expectedRow = row + 1;
+        handled = true;
+        onCell(content, slot);
+        ++slot;
+    }
+    return handled;
 }
 
 }  // namespace dp

@@ -8,9 +8,6 @@ namespace dp {
 
 namespace {
 
-// A preview renders the first 101 texts, up to this slot.
-constexpr std::uint32_t kLastPreviewSlot = 100;
-
 class TextLoad {
   public:
     TextLoad(TextColumn& column, TextVariableFormat& format, const LoadSettings& settings)
@@ -18,30 +15,18 @@ class TextLoad {
 
     // Whether any cell was handled.
     bool run(const CellColumn& cells) {
-        const std::uint32_t firstRow = settings_.layout.firstDataRow;
-        std::uint32_t expectedRow = firstRow;
-        std::uint32_t slot = 0;
-        const auto end = cells.end();
-        for (auto cell = cells.lower_bound(firstRow); cell != end && slot < settings_.rowCount;
-             ++cell) {
-            slot += passGap(expectedRow, cell->first);
-            if (slot >= settings_.rowCount) break;
-            expectedRow = cell->first + 1;
-            store(cell->second, slot);
-            ++slot;
-        }
-        return expectedRow != firstRow;
+        return walkDataCells(
+            cells, settings_.layout, settings_.rowCount, [this](const Gap& gap) { passGap(gap); },
+            [this](const CellView& cell, std::uint32_t slot) { store(cell, slot); });
     }
 
   private:
     std::string& textAt(std::size_t slot) { return column_.textValues.items[slot].text(); }
 
-    std::uint32_t passGap(std::uint32_t expectedRow, std::uint32_t row) {
-        const Gap gap = gapBefore(settings_.layout, expectedRow, row);
-        if (settings_.missingTextFrom.empty())
-            fillGap(gap, settings_.rowCount,
-                    [&](std::size_t slot) { textAt(slot) = settings_.missingTextTo; });
-        return gap.slots;
+    void passGap(const Gap& gap) {
+        if (!settings_.missingTextFrom.empty()) return;
+        fillGap(gap, settings_.rowCount,
+                [&](std::size_t slot) { textAt(slot) = settings_.missingTextTo; });
     }
 
     void store(const CellView& cell, std::uint32_t slot) {
@@ -69,10 +54,7 @@ class TextLoad {
 std::unique_ptr<TextColumn> loadTextColumn(const CellColumn& cells, const ColumnIdentity& identity,
                                            const LoadSettings& settings) {
     auto column = std::make_unique<TextColumn>();
-    column->name = identity.name;
-    column->primeKey = column->variableBodyPrimeKey = identity.key;
-    column->useDefaultVariableBody = identity.key == 0;
-    column->position = static_cast<std::int32_t>(identity.position + 1);
+    identity.applyTo(*column);
     column->formatDirty = true;
     auto format = std::make_unique<TextVariableFormat>();
     format->characterCount = 1;
