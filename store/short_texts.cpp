@@ -1,5 +1,7 @@
 #include "dpxlsx/store/short_texts.h"
 
+#include <xxhash.h>
+
 #include <algorithm>
 #include <chrono>
 #include <cstring>
@@ -12,20 +14,6 @@ namespace {
 
 constexpr std::size_t kFirstSlots = 64;
 constexpr std::size_t kFirstPage = 512;  // bytes; few texts take little room
-__extension__ using Product = unsigned __int128;
-
-// All 128 bits of the product, folded: every bit of both factors reaches every bit of the result.
-std::uint64_t mix(std::uint64_t left, std::uint64_t right) {
-    const Product product = static_cast<Product>(left) * right;
-    return static_cast<std::uint64_t>(product) ^ static_cast<std::uint64_t>(product >> 64);
-}
-
-template <class Word = std::uint64_t>
-std::uint64_t load(const char* bytes) {
-    Word word;
-    std::memcpy(&word, bytes, sizeof word);
-    return word;
-}
 
 // Never 0, which marks a free slot, and taken from other bits than those that choose the first
 // slot.
@@ -42,37 +30,14 @@ std::string_view textAt(const char* stored) {
 
 }  // namespace
 
-TextHash::TextHash() : secret_{} {
-    if (::getrandom(secret_.data(), sizeof secret_, GRND_NONBLOCK) == sizeof secret_) return;
+TextHash::TextHash() {
+    if (::getrandom(&seed_, sizeof seed_, GRND_NONBLOCK) == sizeof seed_) return;
     const auto now = std::chrono::steady_clock::now().time_since_epoch().count();
-    secret_ = {static_cast<std::uint64_t>(now), reinterpret_cast<std::uintptr_t>(this),
-               reinterpret_cast<std::uintptr_t>(&now)};
+    seed_ = static_cast<std::uint64_t>(now) ^ reinterpret_cast<std::uintptr_t>(this);
 }
 
 std::uint64_t TextHash::operator()(std::string_view text) const {
-    const std::size_t length = text.size();
-    const char* bytes = text.data();
-    std::uint64_t hash = secret_[0];
-    std::uint64_t first = 0;
-    std::uint64_t last = 0;
-    if (length >= 16) {
-        for (const char* end = bytes + length - 16; bytes < end; bytes += 16)
-            hash = mix(load(bytes) ^ secret_[1], load(bytes + 8) ^ hash);
-        bytes = text.data() + length - 16;  // the last 16 may overlap those before
-        first = load(bytes);
-        last = load(bytes + 8);
-    } else if (length >= 8) {
-        first = load(bytes);
-        last = load(bytes + length - 8);
-    } else if (length >= 4) {
-        first = load<std::uint32_t>(bytes);
-        last = load<std::uint32_t>(bytes + length - 4);
-    } else if (length > 0) {
-        first = load<std::uint8_t>(bytes) | load<std::uint8_t>(bytes + length / 2) << 8;
-        last = load<std::uint8_t>(bytes + length - 1);
-    }
-    hash = mix(first ^ secret_[1], last ^ hash);
-    return mix(hash ^ secret_[2], secret_[1] ^ length);
+    return XXH3_64bits_withSeed(text.data(), text.size(), seed_);
 }
 
 std::size_t ShortTexts::Table::candidate(std::size_t slot, std::uint8_t tag) const {

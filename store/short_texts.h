@@ -9,7 +9,7 @@
 
 namespace dp {
 
-// A hash of texts that differs from table to table, so that nobody can write a workbook whose texts
+// A hash of texts, seeded at random for each table, so that nobody can write a workbook whose texts
 // all collide.
 class TextHash {
   public:
@@ -18,7 +18,7 @@ class TextHash {
     std::uint64_t operator()(std::string_view text) const;
 
   private:
-    std::array<std::uint64_t, 3> secret_;
+    std::uint64_t seed_;
 };
 
 // A set of texts of up to kLongest bytes, which keeps every distinct text once, until the set is
