@@ -141,7 +141,7 @@ bool ShortTexts::makeRoom(std::size_t size) {
     if (fits()) return true;
     settle();
     if (fits()) return true;
-    if (pages_.size() == kMostPages) return false;
+    if (pages_.size() == mostPages_) return false;
     const std::size_t pageSize = std::clamp(pageSize_ * 2, kFirstPage, kPage);
     pages_.push_back({std::make_unique_for_overwrite<char[]>(pageSize), 0});
     pageSize_ = pageSize;

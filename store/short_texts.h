@@ -28,7 +28,17 @@ class ShortTexts {
   public:
     static constexpr std::size_t kLongest = 254;  // bytes
 
-    ShortTexts() = default;
+    // A text's address in 32 bits: the number of its page, of kPage bytes, and its offset there in
+    // units of kUnit bytes.
+    using Id = std::uint32_t;
+    static constexpr std::size_t kUnit = 4;
+    static constexpr std::size_t kPage = std::size_t{1} << 20;
+    static constexpr unsigned kUnitBits = 18;
+    static_assert(kUnit << kUnitBits == kPage);
+    static constexpr std::size_t kMostPages = std::size_t{1} << (32 - kUnitBits);
+
+    // Keeps texts in at most `mostPages` pages, of up to kPage bytes.
+    explicit ShortTexts(std::size_t mostPages = kMostPages) : mostPages_(mostPages) {}
     ShortTexts(const ShortTexts&) = delete;
     ShortTexts& operator=(const ShortTexts&) = delete;
 
@@ -52,14 +62,6 @@ class ShortTexts {
     std::size_t size() const { return size_; }
 
   private:
-    // A text's address in 32 bits: the number of its page, of kPage bytes, and its offset there in
-    // units of kUnit bytes.
-    using Id = std::uint32_t;
-    static constexpr std::size_t kUnit = 4;
-    static constexpr std::size_t kPage = std::size_t{1} << 20;
-    static constexpr unsigned kUnitBits = 18;
-    static_assert(kUnit << kUnitBits == kPage);
-    static constexpr std::size_t kMostPages = std::size_t{1} << (32 - kUnitBits);
     // Lookups in a batch: more than a processor can have cache misses in flight.
     static constexpr std::size_t kMostWaiting = 32;
     // After this many further lookups have begun, the first slots of a lookup have arrived in the
@@ -103,6 +105,7 @@ class ShortTexts {
     TextHash hash_;
     Table table_;
     std::size_t size_ = 0;
+    std::size_t mostPages_;
     std::vector<Page> pages_;      // texts lie back to back in each
     std::size_t pageSize_ = 0;     // bytes of the last page
     std::size_t waitingSize_ = 0;  // bytes of waiting texts, behind the used bytes of the last page

@@ -36,7 +36,7 @@ void TextPool::begin(std::string_view text) {
     const bool isShort = text.size() <= ShortTexts::kLongest;
     isRecent_ = !isShort || !short_.begin(text);
     if (!isRecent_) return;
-    // When the 16 GB that short_ can address are full, further short texts are kept with the long
+    // When the pages of short_ are full (16 GB), further short texts are kept with the long
     // ones; those that short_ already has are still found there.
     const char* kept = isShort ? short_.find(text) : nullptr;
     recent_ = kept ? PooledText(kept) : internLong(text);

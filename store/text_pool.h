@@ -42,7 +42,8 @@ class DPXLSX_API PooledText {
 // Keeps every distinct text once, until the pool is destroyed. Not thread-safe.
 class TextPool {
   public:
-    TextPool() = default;
+    // Only tests set the limit on the pages of short texts: all of them is 16 GB.
+    explicit TextPool(std::size_t mostPages = ShortTexts::kMostPages) : short_(mostPages) {}
     TextPool(const TextPool&) = delete;
     TextPool& operator=(const TextPool&) = delete;
 

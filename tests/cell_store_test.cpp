@@ -269,22 +269,34 @@ TEST(RowLayout, DecidesAtItsLimits) {
     EXPECT_EQ(options.variableNameRow, 0U) << "whatever it was";
 }
 
+// Also of short texts that the pages for them have no room for.
 TEST(TextPool, TellsTextsApartAtAnyLength) {
-    TextPool pool;
-    std::map<std::string, PooledText> texts;
-    for (const std::size_t length : {1U, 7U, 8U, 15U, 16U, 17U, 33U, 254U, 255U, 256U, 5000U, 70000U}) {
-        for (std::size_t place = 0; place < std::min<std::size_t>(length, 40); ++place) {
-            std::string text(length, '\0');
-            text[length - 1 - place] = 'x';
-            texts.emplace(text, pool.intern(text));
+    for (const std::size_t mostPages : {ShortTexts::kMostPages, std::size_t{2}}) {
+        TextPool pool(mostPages);
+        std::map<std::string, PooledText> texts;
+        for (const std::size_t length : {1U, 7U, 8U, 15U, 16U, 17U, 33U, 254U, 255U, 256U, 5000U, 70000U}) {
+            for (std::size_t place = 0; place < std::min<std::size_t>(length, 40); ++place) {
+                std::string text(length, '\0');
+                text[length - 1 - place] = 'x';
+                texts.emplace(text, pool.intern(text));
+            }
         }
+        for (const auto& [text, kept] : texts) {
+            EXPECT_EQ(kept.view(), text);
+            EXPECT_EQ(pool.intern(text), kept);
+        }
+        EXPECT_EQ(pool.size(), texts.size());
+        EXPECT_EQ(pool.intern(""), PooledText());
     }
-    EXPECT_EQ(pool.size(), texts.size());
-    for (const auto& [text, kept] : texts) {
-        EXPECT_EQ(kept.view(), text);
-        EXPECT_EQ(pool.intern(text), kept);
-    }
-    EXPECT_EQ(pool.intern(""), PooledText());
+}
+
+TEST(ShortTexts, FillTheirPagesAndNoMore) {
+    ShortTexts texts(2);
+    unsigned begun = 0;
+    while (begun < 1000 && texts.begin(std::to_string(100 + begun))) ++begun;
+    EXPECT_EQ(begun, (512U + 1024U) / 4);
+    EXPECT_FALSE(texts.begin("one")) << "again";
+    EXPECT_NE(texts.find("100"), nullptr);
 }
 
 TEST(ExternalDataRecord, CopiesAllAndInitializesAll) {

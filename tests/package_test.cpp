@@ -1,6 +1,9 @@
 #include <algorithm>
 #include <regex>
+#include <string>
+#include <vector>
 
+#include "dpxlsx/readers/xlsx/shared_string_table.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 #include "testkit/package_builder.h"
 #include "testkit/recording_provider.h"
@@ -142,6 +145,17 @@ TEST_F(Packages, SharedStringTables) {
         for (const std::string& comment : {std::string(), std::string("<!---->")})
             EXPECT_EQ(readCells(PackageBuilder(package).set("xl/sharedStrings.xml", comment + c[1])), c[2])
                 << c[0] << comment;
+}
+
+TEST(SharedStringTable, KeepsTextsBehindWhatAnEndCanHold) {
+    dp::SharedStringTable table(4);
+    for (const std::size_t step : {1U, 7U}) {
+        table.clear();
+        std::vector<std::string> texts;
+        for (std::size_t i = 0; i < 60; ++i)
+            table.add(texts.emplace_back(i * step % 41, static_cast<char>('a' + i % 26)));
+        for (std::size_t i = 0; i < texts.size(); ++i) EXPECT_EQ(table[i], texts[i]) << i;
+    }
 }
 
 // A provider that runs out of memory does not receive the cells that were still waiting.

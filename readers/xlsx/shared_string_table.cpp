@@ -4,19 +4,18 @@
 
 namespace dp {
 
-void SharedStringTable::clear() { *this = {}; }
+void SharedStringTable::clear() { *this = SharedStringTable(endBits_); }
 
 void SharedStringTable::add(std::string_view text) {
-    constexpr unsigned kHalf = 32;
-    const std::size_t carries = ((bytes_.size() + text.size()) >> kHalf) - carries_.size();
-    carries_.insert(carries_.end(), carries, ends_.size());
+    const std::size_t end = bytes_.size() + text.size();
+    carries_.resize(end >> endBits_, ends_.size());
     bytes_ += text;
-    ends_.push_back(static_cast<std::uint32_t>(bytes_.size()));
+    ends_.push_back(static_cast<std::uint32_t>(end & ((std::size_t{1} << endBits_) - 1)));
 }
 
 std::size_t SharedStringTable::farEndOf(std::size_t index) const {
     const auto carries = std::upper_bound(carries_.begin(), carries_.end(), index);
-    return static_cast<std::size_t>(carries - carries_.begin()) << 32 | ends_[index];
+    return static_cast<std::size_t>(carries - carries_.begin()) << endBits_ | ends_[index];
 }
 
 }  // namespace dp

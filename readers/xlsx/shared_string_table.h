@@ -13,6 +13,10 @@ namespace dp {
 // Texts by index, stored back to back in memory, and four bytes more for each.
 class DPXLSX_API SharedStringTable {
   public:
+    SharedStringTable() = default;
+    // Keeps only `endBits` bits of a text's end in place; tests set fewer than the usual 32.
+    explicit SharedStringTable(unsigned endBits) : endBits_(endBits) {}
+
     void clear();
     // Throws std::bad_alloc.
     void reserve(std::size_t count) { ends_.reserve(count); }
@@ -39,8 +43,9 @@ class DPXLSX_API SharedStringTable {
     std::size_t farEndOf(std::size_t index) const;
 
     std::string bytes_;
-    std::vector<std::uint32_t> ends_;   // the low halves; carries_ knows the rest
-    std::vector<std::size_t> carries_;  // the indexes before which the ends went beyond 4 GiB again
+    unsigned endBits_ = 32;
+    std::vector<std::uint32_t> ends_;   // the low bits, endBits_ of them
+    std::vector<std::size_t> carries_;  // per unit of the high bits, the first index that has it
 };
 
 }  // namespace dp
