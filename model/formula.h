@@ -1,7 +1,6 @@
 #pragma once
 
 #include <map>
-#include <memory>
 #include <vector>
 
 #include "dpxlsx/model/host/i_formula.h"

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
 
 #include <dpxlsx/model/host/i_data_provider.h>
