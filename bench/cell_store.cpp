@@ -1,32 +1,23 @@
-// Compares the cell store with plain maps of maps: time and resident memory, each measured in a
-// process of its own, the best of several runs. Cells are filed as a reader files them, through one
-// record that is reused. The exit code is 1 when a goal is missed, and 2 when a measurement fails
-// or does not see every cell.
+// Compares the cell store with plain maps of maps: time and resident memory. Cells are filed as a
+// reader files them, through one record that is reused.
 
 #include <unistd.h>
 
-#include <algorithm>
-#include <array>
-#include <chrono>
-#include <cstdio>
-#include <cstdlib>
 #include <fstream>
 #include <map>
 #include <memory>
 #include <string>
-#include <sys/wait.h>
 #include <vector>
 
-#include "bench/verify.h"
+#include "bench/harness.h"
 #include "dpxlsx/store/worksheet_cells.h"
 
 namespace {
 
-using bench::require;
+using bench::kNoGoal;
+using bench::secondsOf;
 using dp::ExternalDataRecord;
 using dp::WorksheetCells;
-
-constexpr int kRuns = 3;
 
 class PlainCells : public std::map<unsigned, std::map<unsigned, dp::ExternalDataRecordCell>> {
   public:
@@ -38,21 +29,12 @@ double valueOf(const dp::ExternalDataRecordCell& cell) { return cell.numValue; }
 
 // Seconds, and bytes per cell.
 struct Figures {
-    double file = 1e9;
-    double bytes = 1e9;
-    double walk = 1e9;
-    double destroy = 1e9;
-    double sum = 0.0;
-    unsigned long cells = 0;  // counted by the walk
-
-    void keepBest(const Figures& other) {
-        file = std::min(file, other.file);
-        bytes = std::min(bytes, other.bytes);
-        walk = std::min(walk, other.walk);
-        destroy = std::min(destroy, other.destroy);
-        sum = other.sum;
-        cells = other.cells;
-    }
+    double file;
+    double bytes;
+    double walk;
+    double destroy;
+    double sum;
+    double cells;  // counted by the walk
 };
 
 double residentBytes() {
@@ -61,32 +43,6 @@ double residentBytes() {
     double resident = 0;
     statm >> total >> resident;
     return resident * static_cast<double>(sysconf(_SC_PAGESIZE));
-}
-
-template <typename Work>
-double secondsOf(const Work& work) {
-    const auto start = std::chrono::steady_clock::now();
-    work();
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
-
-template <typename Measure>
-Figures inOwnProcess(const Measure& measure) {
-    std::array<int, 2> ends{};
-    require(pipe(ends.data()) == 0, "pipe");
-    const pid_t child = fork();
-    require(child >= 0, "fork");
-    if (child == 0) {
-        const Figures figures = measure();
-        const bool written = write(ends[1], &figures, sizeof figures) == sizeof figures;
-        _exit(written ? 0 : 2);
-    }
-    Figures figures;
-    close(ends[1]);
-    require(read(ends[0], &figures, sizeof figures) == sizeof figures, "measurement");
-    close(ends[0]);
-    waitpid(child, nullptr, 0);
-    return figures;
 }
 
 template <typename Cells>
@@ -102,7 +58,7 @@ void walk(const Cells& cells, Figures& figures) {
 // cells filed out of order.
 template <typename Cells, typename Fill>
 Figures measure(unsigned count, const Fill& fill) {
-    Figures figures;
+    Figures figures{};
     const double before = residentBytes();
     auto cells = std::make_unique<Cells>();
     figures.file = secondsOf([&] {
@@ -119,63 +75,32 @@ Figures measure(unsigned count, const Fill& fill) {
     return figures;
 }
 
-struct Pair {
-    Figures ours;
-    Figures plain;
+struct CellGoals {
+    double file = kNoGoal;
+    double bytes = kNoGoal;
+    double walk = kNoGoal;
+    double destroy = kNoGoal;
+    double mostBytes = kNoGoal;
 };
 
+// Files `count` records made by a new `makeFill()` into each of the two stores.
 template <typename MakeFill>
-Pair compare(unsigned count, const MakeFill& makeFill) {
-    Pair best;
-    for (int run = 0; run < kRuns; ++run) {
-        best.ours.keepBest(
-            inOwnProcess([&] { return measure<WorksheetCells>(count, makeFill()); }));
-        best.plain.keepBest(inOwnProcess([&] { return measure<PlainCells>(count, makeFill()); }));
-    }
-    require(best.ours.sum == best.plain.sum, "the two stores differ");
-    require(best.ours.cells == count && best.plain.cells == count, "cells are missing");
-    return best;
-}
-
-bool allReached = true;
-
-void printHead() {
-    std::printf("%-44s %10s %10s %7s %7s\n", "", "ours", "std::map", "ratio", "goal");
-}
-
-// A goal of 0 means that there is none.
-void printRow(const std::string& what, double ours, double plain, double goal) {
-    const double ratio = ours / plain;
-    const bool reached = goal == 0.0 || ratio <= goal;
-    allReached = allReached && reached;
-    std::printf("%-44s %10.2f %10.2f %7.3f ", what.c_str(), ours, plain, ratio);
-    if (goal != 0.0) std::printf("%7.2f%s", goal, reached ? "" : "  MISSED");
-    std::printf("\n");
-}
-
-void printLimit(const std::string& what, double ours, double limit) {
-    const bool reached = ours <= limit;
-    allReached = allReached && reached;
-    std::printf("%-44s %10.2f %10s %7s %7.2f%s\n", what.c_str(), ours, "", "", limit,
-                reached ? "" : "  MISSED");
-}
-
-struct Goals {
-    double file;
-    double bytes;
-    double walk;
-    double destroy;
-};
-
-void printPair(const std::string& what, const Pair& pair, unsigned count, const Goals& goals) {
+void compare(bench::Report& report, const std::string& name, unsigned count, const CellGoals& goals,
+             const MakeFill& makeFill) {
+    if (!report.wants(name)) return;
+    const auto [ours, plain] = bench::compare(
+        report.rounds(), [&] { return measure<WorksheetCells>(count, makeFill()); },
+        [&] { return measure<PlainCells>(count, makeFill()); });
+    bench::require(ours.sum == plain.sum, "the two stores differ");
+    bench::require(ours.cells == count && plain.cells == count, "cells are missing");
     const double nanoseconds = 1e9 / count;
-    printRow(what + ": file, ns", pair.ours.file * nanoseconds, pair.plain.file * nanoseconds,
-             goals.file);
-    printRow(what + ": resident bytes", pair.ours.bytes, pair.plain.bytes, goals.bytes);
-    printRow(what + ": walk, ns", pair.ours.walk * nanoseconds, pair.plain.walk * nanoseconds,
-             goals.walk);
-    printRow(what + ": destroy, ns", pair.ours.destroy * nanoseconds,
-             pair.plain.destroy * nanoseconds, goals.destroy);
+    report.add(
+        {name + ": file, ns", ours.file * nanoseconds, plain.file * nanoseconds, goals.file});
+    report.add({name + ": resident bytes", ours.bytes, plain.bytes, goals.bytes, goals.mostBytes});
+    report.add(
+        {name + ": walk, ns", ours.walk * nanoseconds, plain.walk * nanoseconds, goals.walk});
+    report.add({name + ": destroy, ns", ours.destroy * nanoseconds, plain.destroy * nanoseconds,
+                goals.destroy});
 }
 
 void setNumber(ExternalDataRecord& record, unsigned row, unsigned column) {
@@ -186,19 +111,15 @@ void setNumber(ExternalDataRecord& record, unsigned row, unsigned column) {
     record.cell.formatIndex = static_cast<int>(column % 7);
 }
 
-void numbers() {
-    constexpr unsigned kCells = 2'000'000;
-    for (const unsigned columns : {20U, 1U, 16384U}) {
-        const Pair pair = compare(kCells, [=] {
-            return [=](ExternalDataRecord& record, unsigned i) {
-                setNumber(record, i / columns, i % columns);
-            };
-        });
-        const bool main = columns == 20;
-        printPair(std::to_string(columns) + " columns, row by row", pair, kCells,
-                  main ? Goals{0.3, 0.25, 0.1, 0.1} : Goals{});
-        if (main) printLimit("20 columns, row by row: bytes a cell", pair.ours.bytes, 28.0);
-    }
+void numbers(bench::Report& report) {
+    constexpr CellGoals kUsual{0.3, 0.25, 0.1, 0.1, 28.0};
+    for (const unsigned columns : {20U, 1U, 16384U})
+        compare(report, std::to_string(columns) + " columns, row by row", 2'000'000,
+                columns == 20 ? kUsual : CellGoals{}, [=] {
+                    return [=](ExternalDataRecord& record, unsigned i) {
+                        setNumber(record, i / columns, i % columns);
+                    };
+                });
 }
 
 // The rows in pseudo-random order: a full-period generator modulo a power of two, without the
@@ -213,18 +134,16 @@ std::vector<unsigned> shuffledRows(unsigned count) {
     return rows;
 }
 
-void outOfOrder() {
+void outOfOrder(bench::Report& report) {
     constexpr unsigned kRows = 300'000;
-    const Pair descending = compare(kRows, [] {
+    compare(report, "descending rows", kRows, {1.0}, [] {
         return [](ExternalDataRecord& record, unsigned i) { setNumber(record, kRows - i, 0); };
     });
-    printPair("descending rows", descending, kRows, {1.0, 0, 0, 0});
-    const Pair random = compare(kRows, [] {
+    compare(report, "random rows", kRows, {1.0}, [] {
         return [rows = shuffledRows(kRows)](ExternalDataRecord& record, unsigned i) {
             setNumber(record, rows[i], 0);
         };
     });
-    printPair("random rows", random, kRows, {1.0, 0, 0, 0});
 }
 
 // Sets one of `distinct` texts, composed in a local buffer, as a parser would deliver it.
@@ -241,51 +160,48 @@ void setText(ExternalDataRecord& record, unsigned i, std::uint64_t step, unsigne
 
 // Every text twice: the second time in the order of the first time, or scattered, which is the
 // worst case for all caches.
-void texts() {
+void texts(bench::Report& report) {
     constexpr unsigned kCells = 1'000'000;
     constexpr unsigned kDistinct = kCells / 2;
-    const auto filled = [](std::uint64_t secondStep) {
-        return compare(kCells, [=] {
+    const auto filled = [&report](const std::string& name, std::uint64_t secondStep) {
+        compare(report, name, kCells, {0.6, 0.5}, [=] {
             return [=](ExternalDataRecord& record, unsigned i) {
                 setText(record, i, i < kDistinct ? 7919 : secondStep, kDistinct);
             };
         });
     };
-    printPair("texts of 26 bytes, half distinct", filled(7919), kCells, {0.6, 0.5, 0, 0});
-    printPair("same texts, scattered repeats", filled(104'729), kCells, {0.6, 0.5, 0, 0});
+    filled("texts of 26 bytes, half distinct", 7919);
+    filled("same texts, scattered repeats", 104'729);
 }
 
 // A shared string of 1 MB in 100,000 cells.
-void bigText() {
+void bigText(bench::Report& report) {
     constexpr unsigned kCells = 100'000;
-    const Figures figures = inOwnProcess([] {
+    const std::string name = "1 MB text in 100,000 cells";
+    if (!report.wants(name)) return;
+    const Figures figures = bench::inChild([] {
         ExternalDataRecord record(0, 0, 0, 0);
         record.cell.type = dp::CELL_TEXT;
         record.cell.textValue.assign(1'000'000, 'x');
-        Figures measured;
+        Figures measured{};
         const double before = residentBytes();
         WorksheetCells cells;
         measured.file = secondsOf([&] {
             for (; record.row < kCells; ++record.row) cells.add(record);
         });
         measured.bytes = residentBytes() - before;
-        measured.cells = cells.begin()->second.size();
+        measured.cells = static_cast<double>(cells.begin()->second.size());
         return measured;
     });
-    require(figures.cells == kCells, "cells are missing");
-    printLimit("1 MB text in 100,000 cells: MB", figures.bytes / 1e6, 8.0);
-    std::printf("%-44s %10.2f\n", "  ns a cell", figures.file / kCells * 1e9);
+    bench::require(figures.cells == kCells, "cells are missing");
+    report.add({name + ": MB", figures.bytes / 1e6, {}, kNoGoal, 8.0});
+    report.add({name + ": file, ns a cell", figures.file / kCells * 1e9, {}});
+}
+
+void measureAll(bench::Report& report) {
+    for (const auto topic : {numbers, texts, bigText, outOfOrder}) topic(report);
 }
 
 }  // namespace
 
-int main() {
-    return bench::resultOf([] {
-        printHead();
-        numbers();
-        texts();
-        bigText();
-        outOfOrder();
-        return allReached ? 0 : 1;
-    });
-}
+int main(int argc, char** argv) { return bench::run(argc, argv, measureAll); }

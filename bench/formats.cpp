@@ -1,12 +1,7 @@
-// The cost of number formats, each figure beside its floor. Prints a table; the exit code is 1 when
-// a goal is missed, and 2 when a call did not do its work.
+// The cost of number formats.
 
-#include <algorithm>
-#include <chrono>
 #include <cmath>
-#include <cstdio>
 #include <iomanip>
-#include <limits>
 #include <locale>
 #include <memory>
 #include <random>
@@ -17,7 +12,7 @@
 #include <unicode/smpdtfmt.h>
 #include <unicode/timezone.h>
 
-#include "bench/verify.h"
+#include "bench/harness.h"
 #include "dpxlsx/formats/date_time_variable_format.h"
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/style_classification.h"
@@ -28,39 +23,6 @@ namespace {
 using Type = dp::IVariableFormat::FormatType;
 
 constexpr char kPattern[] = "M/d/yyyy H:mm";
-
-// The least time of one call over several rounds, in nanoseconds. Every call returns whether it did
-// its work; using the result also keeps the compiler from removing the call.
-template <typename Call>
-double nanoseconds(int calls, Call call) {
-    double least = std::numeric_limits<double>::max();
-    for (int round = 0; round < 7; ++round) {
-        const auto start = std::chrono::steady_clock::now();
-        int done = 0;
-        for (int i = 0; i < calls; ++i) done += call(i) ? 1 : 0;
-        const std::chrono::duration<double, std::nano> taken =
-            std::chrono::steady_clock::now() - start;
-        bench::require(done == calls, "a call did nothing");
-        least = std::min(least, taken.count() / calls);
-    }
-    return least;
-}
-
-struct Figure {
-    const char* name;
-    double ours;   // nanoseconds
-    double floor;  // nanoseconds
-    double mostRatio;
-    double mostNanoseconds = 0;  // alternatively, this time suffices
-};
-
-bool report(const Figure& figure) {
-    const double ratio = figure.ours / figure.floor;
-    const bool reached = ratio <= figure.mostRatio || figure.ours <= figure.mostNanoseconds;
-    std::printf("%-44s %9.1f ns %9.1f ns %7.3f  <= %5.3f  %s\n", figure.name, figure.ours,
-                figure.floor, ratio, figure.mostRatio, reached ? "reached" : "MISSED");
-    return reached;
-}
 
 std::vector<double> displayedValues() {
     std::mt19937_64 random(1);
@@ -95,16 +57,17 @@ bool renders(const dp::IVariableFormat& format, double value) {
     return *text->database_str() != '\0';
 }
 
-bool reportAutomaticFormat() {
+void automaticFormat(bench::Report& report) {
     const std::vector<double> values = displayedValues();
     const auto value = [&values](int i) {
         return values[static_cast<std::size_t>(i) % values.size()];
     };
     dp::NumericVariableFormat format;
     format.autoFormat = true;
-    const double ours = nanoseconds(100000, [&](int i) { return renders(format, value(i)); });
-    const double floor = nanoseconds(20000, [&](int i) { return streams(value(i)); });
-    return report({"automatic rendering / through streams", ours, floor, 1.0 / 8});
+    bench::addLoops(
+        report, "automatic rendering / through streams, ns", {1.0 / 8},
+        [&] { return bench::times(100000, [&](int i) { return renders(format, value(i)); }); },
+        [&] { return bench::times(20000, [&](int i) { return streams(value(i)); }); });
 }
 
 std::unique_ptr<icu::DateFormat> icuFormatter() {
@@ -115,54 +78,60 @@ std::unique_ptr<icu::DateFormat> icuFormatter() {
     return formatter;
 }
 
-bool reportMaking() {
-    const std::string pattern = kPattern;
-    const double ours = nanoseconds(200000, [&](int) {
-        const auto format = std::make_unique<dp::DateTimeVariableFormat>(pattern);
-        return format->GetType() == Type::DateTime;
-    });
-    const double floor = nanoseconds(2000, [](int) { return icuFormatter() != nullptr; });
-    return report({"making a date-time format / SimpleDateFormat", ours, floor, 0.02, 200});
+double makeIcuFormatters() {
+    return bench::times(2000, [](int) { return icuFormatter() != nullptr; });
 }
 
-bool reportDateTimeRendering() {
+void making(bench::Report& report) {
+    const std::string pattern = kPattern;
+    const auto ours = [&pattern](int) {
+        const auto format = std::make_unique<dp::DateTimeVariableFormat>(pattern);
+        return format->GetType() == Type::DateTime;
+    };
+    bench::addLoops(
+        report, "making a date-time format / SimpleDateFormat, ns", {0.02},
+        [&] { return bench::times(200000, ours); }, makeIcuFormatters);
+}
+
+void dateTimeRendering(bench::Report& report) {
     const dp::DateTimeVariableFormat format{std::string(kPattern)};
     const auto icuFormat = icuFormatter();
-    const double ours =
-        nanoseconds(20000, [&](int i) { return renders(format, 40000 + i * 0.125); });
     icu::UnicodeString output;
     std::string utf8;
-    const double floor = nanoseconds(20000, [&](int i) {
+    const auto floor = [&](int i) {
         output.remove();
         utf8.clear();
         icuFormat->format((40000 + i * 0.125 - 25569) * 86400000, output);
         output.toUTF8String(utf8);
         return !utf8.empty();
-    });
-    return report({"date-time rendering / ICU alone", ours, floor, 1.3});
+    };
+    bench::addLoops(
+        report, "date-time rendering / ICU alone, ns", {1.3},
+        [&] {
+            return bench::times(20000, [&](int i) { return renders(format, 40000 + i * 0.125); });
+        },
+        [&] { return bench::times(20000, floor); });
 }
 
 // The cost of the format of a cell's style, including lookup and parsing.
-bool reportStyleFormats() {
+void styleFormats(bench::Report& report) {
     std::vector<dp::xStyle> styles = {{"164", "#,##0.00", dp::EXCEL_FORMAT_NONE},
                                       {"165", "m/d/yy h:mm AM/PM", dp::EXCEL_FORMAT_DATETIME}};
-    const double ours = nanoseconds(200000, [&](int i) {
+    const auto ours = [&styles](int i) {
         const std::unique_ptr<dp::IVariableFormat> format(
             dp::createStyleFormat(styles, i % 2, i % 2 == 1));
         return format->GetType() == (i % 2 == 1 ? Type::DateTime : Type::Numeric);
-    });
-    const double floor = nanoseconds(2000, [](int) { return icuFormatter() != nullptr; });
-    return report({"a style's format / SimpleDateFormat", ours, floor, 0.02, 200});
+    };
+    bench::addLoops(
+        report, "a style's format / SimpleDateFormat, ns", {0.02},
+        [&] { return bench::times(200000, ours); }, makeIcuFormatters);
 }
 
-int reportAll() {
-    std::printf("%-44s %12s %12s %7s  %8s\n", "", "ours", "floor", "ratio", "goal");
-    const bool reached[] = {reportAutomaticFormat(), reportMaking(), reportDateTimeRendering(),
-                            reportStyleFormats()};
-    return std::all_of(std::begin(reached), std::end(reached), [](bool each) { return each; }) ? 0
-                                                                                               : 1;
+void measureAll(bench::Report& report) {
+    for (const auto topic : {automaticFormat, making, dateTimeRendering, styleFormats})
+        topic(report);
 }
 
 }  // namespace
 
-int main() { return bench::resultOf(reportAll); }
+int main(int argc, char** argv) { return bench::run(argc, argv, measureAll); }

@@ -1,58 +1,36 @@
 // Workbooks that could cause disproportionate work: cells in far corners, thousands of worksheets,
-// relationships and styles, long format codes. Each is opened and its columns are loaded at full
-// and at half size: a ratio far above 2 indicates quadratic time. Each must take less than a
-// second. Then a workbook is opened many times in a row, which must leave memory, descriptors and
-// the temporary directory as they were. Ends with 1 when a goal is missed, and with 2 when not all
-// values were loaded.
-//
-// hostile [OPENS]: the number of opens in a row, 10,000 by default. The files are made on a file
-// system in memory if there is one: on a disk, 10,000 files take longer than everything else.
+// relationships and styles, long format codes. Each is opened and its columns are loaded; the floor
+// is the same at half the size, twice: a ratio far above 1 indicates quadratic time. Then a
+// workbook is opened many times in a row, which must leave memory, descriptors and the temporary
+// directory as they were. The files are made on a file system in memory if there is one: on a disk,
+// 10,000 files take longer than everything else.
 
-#include <malloc.h>
-#include <unistd.h>
-
-#include <algorithm>
-#include <chrono>
-#include <cstdio>
-#include <cstdlib>
 #include <functional>
 #include <string>
-#include <sys/resource.h>
-#include <sys/wait.h>
 #include <vector>
 
 #include <boost/filesystem.hpp>
 
-#include "bench/verify.h"
-#include "dpxlsx/model/host/i_column.h"
+#include "bench/harness.h"
+#include "bench/workbooks.h"
 #include "dpxlsx/provider/xlsx_data_provider.h"
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
+#include "testkit/allocated_bytes.h"
 #include "testkit/package_builder.h"
+#include "testkit/workspace.h"
 
 namespace {
 
 namespace fs = boost::filesystem;
+using bench::columnName;
+using bench::kNoGoal;
 using testkit::PackageBuilder;
+using testkit::Workspace;
 
-constexpr double kMostSeconds = 1.0;
-constexpr double kMostRatio = 3.0;
-
-struct Measurement {
-    double seconds = 0;
-    double megabytes = 0;  // the peak of the process beyond its initial memory
-    unsigned long values = 0;
-};
-
-double peakMegabytes() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return static_cast<double>(usage.ru_maxrss) / 1024;
-}
-
-// Opens the workbook as a host that skips blank rows and pads columns, and loads all columns;
-// returns the number of values.
-unsigned long openAndLoad(const std::string& path) {
+// Opens the workbook as a host that skips blank rows and pads columns, and loads all columns, which
+// must have that many values.
+void openAndLoad(const std::string& path, unsigned long expected) {
     dp::xlsxDataProvider provider;
     provider.SetReadOptionIgnoreBlankRows(true);
     provider.SetReadOptionPadColumnsWithMissingValues(true);
@@ -65,40 +43,7 @@ unsigned long openAndLoad(const std::string& path) {
     unsigned long values = 0;
     bench::forEachColumn(provider,
                          [&](const dp::IColumn& column) { values += bench::valuesOf(column); });
-    return values;
-}
-
-// Measures in a process of its own, so that runs do not affect each other's memory.
-Measurement measure(const std::string& path) {
-    int ends[2];
-    if (pipe(ends) != 0) std::abort();
-    const pid_t child = fork();
-    if (child == 0) {
-        Measurement result;
-        const double before = peakMegabytes();
-        const auto start = std::chrono::steady_clock::now();
-        if (bench::resultOf([&] { return result.values = openAndLoad(path), 0; }) != 0) _exit(2);
-        result.seconds =
-            std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-        result.megabytes = peakMegabytes() - before;
-        _exit(write(ends[1], &result, sizeof result) == sizeof result ? 0 : 1);
-    }
-    Measurement result;
-    const bool complete = read(ends[0], &result, sizeof result) == sizeof result;
-    waitpid(child, nullptr, 0);
-    close(ends[0]);
-    close(ends[1]);
-    bench::require(complete, "a run failed");
-    return result;
-}
-
-Measurement bestOf(int runs, const std::string& path) {
-    Measurement best = measure(path);
-    for (; runs > 1; --runs) {
-        const Measurement other = measure(path);
-        if (other.seconds < best.seconds) best = other;
-    }
-    return best;
+    bench::requireCount(values, expected, "values");
 }
 
 // --- the workbooks ---
@@ -110,11 +55,6 @@ std::string repeat(unsigned count, const std::function<std::string(const std::st
     std::string all;
     for (unsigned i = 0; i < count; ++i) all += piece(std::to_string(i));
     return all;
-}
-
-std::string columnName(unsigned column) {
-    std::string name(1, static_cast<char>('A' + column % 26));
-    return column < 26 ? name : columnName(column / 26 - 1) + name;
 }
 
 PackageBuilder farCorners(unsigned columns) {
@@ -247,21 +187,31 @@ constexpr Case kCases[] = {
     {"500 x 500 cells backwards", backwards, 500, 4, allButFirstRow},
 };
 
-bool missed = false;
+struct Figures {
+    double seconds;
+    double bytes;  // the peak of the process beyond its initial memory
+};
 
-void run(const Case& c, const std::string& path) {
-    c.build(c.size / 2).write(path);
-    const Measurement half = bestOf(3, path);
-    bench::requireCount(half.values, c.values(c.size / 2), std::string(c.name) + ", half of it");
-    c.build(c.size).write(path);
-    const Measurement whole = bestOf(3, path);
-    bench::requireCount(whole.values, c.values(c.size), c.name);
-    const double ratio = whole.seconds / half.seconds / (c.scale / 2);
-    const bool slow = whole.seconds > kMostSeconds || (whole.seconds > 0.05 && ratio > kMostRatio);
-    missed = missed || slow;
-    std::printf("%-34s %9.1f %9.1f %7.2f %9.1f %10lu%s\n", c.name, half.seconds * 1e3,
-                whole.seconds * 1e3, ratio, whole.megabytes, whole.values, slow ? "  missed" : "");
-    std::fflush(stdout);
+void run(bench::Report& report, const Case& c) {
+    constexpr double kMostMilliseconds = 1000;
+    constexpr double kShort = 50;  // milliseconds, below which a ratio says little
+    if (!report.wants(c.name)) return;
+    const Workspace workspace(Workspace::Place::Memory);
+    const auto opening = [&](unsigned size, const char* name) {
+        const std::string path = workspace.file(name);
+        c.build(size).write(path);
+        return [path, values = c.values(size)] {
+            const double before = bench::peakBytes();
+            const double seconds = bench::secondsOf([&] { openAndLoad(path, values); });
+            return Figures{seconds, bench::peakBytes() - before};
+        };
+    };
+    const auto [whole, half] = bench::compare(report.rounds(), opening(c.size, "whole.xlsx"),
+                                              opening(c.size / 2, "half.xlsx"));
+    const double milliseconds = whole.seconds * 1e3;
+    report.add({c.name + std::string(", ms"), milliseconds, half.seconds * 1e3 * c.scale,
+                milliseconds > kShort ? 1.5 : kNoGoal, kMostMilliseconds});
+    report.add({c.name + std::string(": peak, MB"), whole.bytes / 1e6, {}});
 }
 
 // --- many opens ---
@@ -271,44 +221,46 @@ long openDescriptors() {
     return std::distance(begin(entries), end(entries));
 }
 
-void openOften(unsigned times, const std::string& path, const fs::path& temporary) {
+void openOften(bench::Report& report) {
+    constexpr int kTimes = 10'000;
+    const std::string name = std::to_string(kTimes) + " opens";
+    if (!report.wants(name)) return;
+    struct Often {
+        double seconds;
+        double bytes;
+        double peak;
+        double descriptors;
+        double files;
+    };
+    const Workspace workspace(Workspace::Place::Memory);
+    const std::string path = workspace.file("book.xlsx");
     PackageBuilder::of({kNamedValue, kNamedValue}).write(path);
-    openAndLoad(path);
-    const long descriptors = openDescriptors();
-    const std::size_t memory = ::mallinfo2().uordblks;
-    const double peak = peakMegabytes();
-    const auto start = std::chrono::steady_clock::now();
-    for (unsigned i = 0; i < times; ++i) bench::requireCount(openAndLoad(path), 2, "values");
-    const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - start;
-    const auto bytes = static_cast<long>(::mallinfo2().uordblks - memory);
-    const long more = openDescriptors() - descriptors;
-    const bool clean = fs::is_empty(temporary);
-    std::printf(
-        "%u opens: %.2f ms each, %ld bytes and %ld descriptors more, peak %.1f MB more, "
-        "temporary directory %s\n",
-        times, taken.count() * 1e3 / times, bytes, more, peakMegabytes() - peak,
-        clean ? "empty" : "not empty");
-    missed = missed || bytes > 4096 || more != 0 || !clean;
+    const Often often = bench::inChild([&] {
+        openAndLoad(path, 2);
+        const long descriptors = openDescriptors();
+        const auto bytes = static_cast<double>(testkit::allocatedBytes());
+        const double peak = bench::peakBytes();
+        const double seconds = bench::secondsOf([&] {
+            for (int i = 0; i < kTimes; ++i) openAndLoad(path, 2);
+        });
+        const fs::directory_iterator left(workspace.temporary());
+        return Often{seconds, static_cast<double>(testkit::allocatedBytes()) - bytes,
+                     bench::peakBytes() - peak,
+                     static_cast<double>(openDescriptors() - descriptors),
+                     static_cast<double>(std::distance(begin(left), end(left)))};
+    });
+    report.add({name + ": each, ms", often.seconds * 1e3 / kTimes, {}});
+    report.add({name + ": allocated bytes more", often.bytes, {}, kNoGoal, 4096});
+    report.add({name + ": peak, MB more", often.peak / 1e6, {}});
+    report.add({name + ": descriptors more", often.descriptors, {}, kNoGoal, 0});
+    report.add({name + ": temporary files left", often.files, {}, kNoGoal, 0});
+}
+
+void measureAll(bench::Report& report) {
+    for (const Case& c : kCases) run(report, c);
+    openOften(report);
 }
 
 }  // namespace
 
-int main(int argc, char** argv) {
-    const unsigned opens = argc > 1 ? static_cast<unsigned>(std::atoi(argv[1])) : 10000;
-    const fs::path memory = "/dev/shm";
-    const fs::path base = ::access(memory.c_str(), W_OK) == 0 ? memory : fs::temp_directory_path();
-    const fs::path root = base / fs::unique_path("bench-%%%%-%%%%");
-    const fs::path temporary = root / "tmp";
-    fs::create_directories(temporary);
-    ::setenv("TMPDIR", temporary.c_str(), 1);
-    const std::string path = (root / "book.xlsx").string();
-    std::printf("%-34s %9s %9s %7s %9s %10s\n", "open and load", "half ms", "whole ms", "ratio",
-                "MB more", "values");
-    const int result = bench::resultOf([&] {
-        for (const Case& c : kCases) run(c, path);
-        openOften(opens, path, temporary);
-        return missed ? 1 : 0;
-    });
-    fs::remove_all(root);
-    return result;
-}
+int main(int argc, char** argv) { return bench::run(argc, argv, measureAll); }

@@ -1,25 +1,13 @@
 // Opening, closing and clearing of workbooks beside a floor: copy and unpack the package, pull
 // every node of its parts with libxml2's reader, and append the values to one vector per column.
-// Each run is a process of its own; runs of the library and of the floor alternate, and their
-// medians are compared.
-//
-// open [RUNS] [WORKLOAD]: RUNS runs (5 by default) of all workloads but the largest, or of those
-// whose names contain WORKLOAD; "large" selects the largest. Ends with 1 when a goal is missed, and
-// with 2 when a run did not do all of its work.
-
-#include <unistd.h>
 
 #include <algorithm>
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <deque>
-#include <functional>
 #include <optional>
 #include <string>
-#include <sys/resource.h>
-#include <sys/wait.h>
 #include <utility>
 #include <vector>
 
@@ -27,70 +15,72 @@
 #include <libxml/xmlreader.h>
 #include <minizip/unzip.h>
 
-#include "bench/verify.h"
+#include "bench/harness.h"
 #include "bench/workbooks.h"
 #include "dpxlsx/provider/xlsx_data_provider.h"
 #include "dpxlsx/readers/xml2003/excel_xml_reader.h"
+#include "testkit/workspace.h"
 
 namespace {
 
 namespace fs = boost::filesystem;
+using bench::Comment;
 using bench::Content;
+using bench::kNoGoal;
+using bench::Order;
+using bench::Report;
 using bench::Workload;
 
-struct Goal {
+struct Opening {
     Workload workload;
-    double ratio;             // to the floor; 0 for none
-    double bytesPerCell;      // 0 for none
-    double milliseconds = 0;  // 0 for none
+    double goal;  // ratio to the floor
+    double mostBytesPerCell;
 };
 
-const Goal kGoals[] = {
-    {{"numbers 100,000 x 20", Content::Numbers, 1, 100000, 20}, 0.92, 30},
-    {{"texts 100,000 x 10", Content::Texts, 1, 100000, 10}, 0.82, 70},
-    {{"mixed 100,000 x 10", Content::Mixed, 1, 100000, 10}, 1.00, 40},
-    {{"wide 1,000 x 2,000", Content::Numbers, 1, 1000, 2000}, 0.92, 30},
-    {{"100 sheets of 1,000 x 10", Content::Mixed, 100, 1000, 10}, 0.95, 40},
-    {{"small 20 x 5", Content::Mixed, 1, 20, 5}, 0, 0, 2.0},
-    {{"large 1,000,000 x 10", Content::Numbers, 1, 1000000, 10},
-     0.95,
-     40},  // only when named on the command line
-};
+constexpr Opening kOpenings[] = {
+    {{"numbers 100,000 x 20", Content::Numbers, 1, 100000, 20}, 0.29, 30},
+    {{"texts 100,000 x 10", Content::Texts, 1, 100000, 10}, 0.30, 70},
+    {{"mixed 100,000 x 10", Content::Mixed, 1, 100000, 10}, 0.32, 40},
+    {{"wide 1,000 x 2,000", Content::Numbers, 1, 1000, 2000}, 0.31, 30},
+    {{"100 sheets of 1,000 x 10", Content::Mixed, 100, 1000, 10}, 0.36, 40},
+    {{"numbers 1,000,000 x 10", Content::Numbers, 1, 1000000, 10}, 0.32, 40}};
+constexpr Workload kNumbers = kOpenings[0].workload;
+constexpr Workload kTexts = kOpenings[1].workload;
+constexpr Workload kMixed = kOpenings[2].workload;
+constexpr Workload kSmall = {"small 20 x 5", Content::Mixed, 1, 20, 5};
 
-struct Measurement {
+struct Figures {
     double seconds;
-    double closing;  // seconds from closing the file to the end
+    double closing;  // the part of closing the file, clearing and releasing
     double bytes;    // the process's peak
 };
 
-double secondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+// Measures `work`, which returns how long closing took.
+template <class Work>
+auto measured(const Work& work) {
+    return [&work] {
+        Figures figures{};
+        figures.seconds = bench::secondsOf([&] { figures.closing = work(); });
+        figures.bytes = bench::peakBytes();
+        return figures;
+    };
 }
 
-// Runs `work`, which returns how long closing took, in a process of its own, so that runs do not
-// affect each other's memory.
-Measurement inProcess(const std::function<double()>& work) {
-    int ends[2];
-    if (pipe(ends) != 0) std::abort();
-    const pid_t child = fork();
-    if (child == 0) {
-        const auto start = std::chrono::steady_clock::now();
-        double closing = 0;
-        if (bench::resultOf([&] { return closing = work(), 0; }) != 0) _exit(2);
-        const double seconds = secondsSince(start);
-        rusage usage{};
-        getrusage(RUSAGE_SELF, &usage);
-        const Measurement result{seconds, closing, static_cast<double>(usage.ru_maxrss) * 1024};
-        _exit(write(ends[1], &result, sizeof result) == sizeof result ? 0 : 1);
-    }
-    Measurement result{};
-    int status = 0;
-    const bool complete = read(ends[0], &result, sizeof result) == sizeof result;
-    waitpid(child, &status, 0);
-    close(ends[0]);
-    close(ends[1]);
-    bench::require(complete && status == 0, "a run failed");
-    return result;
+template <class Ours, class Floor>
+auto compare(const Report& report, const Ours& ours, const Floor& floor) {
+    return bench::compare(report.rounds(), measured(ours), measured(floor));
+}
+
+// Writes a workbook in a process of its own, so that this one, with whose memory all runs begin,
+// stays small.
+std::string written(const testkit::Workspace& workspace, const Workload& workload,
+                    const char* name = "book.xlsx") {
+    std::string path = workspace.file(name);
+    bench::inChild([&] {
+        bench::writeWorkbook(path, workload);
+        return Figures{};
+    });
+    return path;
 }
 
 class Provider : public dp::xlsxDataProvider {
@@ -112,25 +102,27 @@ double openOurs(const std::string& path, unsigned long cells, const Look& look) 
                    "the workbook does not open");
     bench::requireCount(provider->cells(), cells, "cells");
     look(*provider);
-    const auto start = std::chrono::steady_clock::now();
-    provider->CloseFile();
-    provider->ClearWorksheets();
-    provider.reset();
-    return secondsSince(start);
+    return bench::secondsOf([&] {
+        provider->CloseFile();
+        provider->ClearWorksheets();
+        provider.reset();
+    });
 }
 
 double openOurs(const std::string& path, unsigned long cells) {
     return openOurs(path, cells, [](const auto&) {});
 }
 
+void pullColumns(Provider& provider, unsigned long cells) {
+    unsigned long values = 0;
+    bench::forEachColumn(provider,
+                         [&](const dp::IColumn& column) { values += bench::valuesOf(column); });
+    bench::requireCount(values, cells, "values");
+}
+
 // Loads columns too, because cells filed out of order are merged when columns are first loaded.
 double openAndLoadOurs(const std::string& path, unsigned long cells) {
-    return openOurs(path, cells, [cells](Provider& provider) {
-        unsigned long values = 0;
-        bench::forEachColumn(provider,
-                             [&](const dp::IColumn& column) { values += bench::valuesOf(column); });
-        bench::requireCount(values, cells, "values");
-    });
+    return openOurs(path, cells, [cells](Provider& provider) { pullColumns(provider, cells); });
 }
 
 double listOurs(const std::string& path, unsigned sheets) {
@@ -269,160 +261,148 @@ double passFloor2003(const std::string& path, unsigned long cells) {
     return 0;
 }
 
-// --- the table ---
+// --- the rows ---
 
-struct Medians {
-    Measurement ours;
-    Measurement floor;
-};
-
-Measurement medianOf(std::vector<Measurement> runs) {
-    const auto middle = runs.begin() + static_cast<std::ptrdiff_t>(runs.size() / 2);
-    std::nth_element(runs.begin(), middle, runs.end(),
-                     [](const auto& a, const auto& b) { return a.seconds < b.seconds; });
-    return *middle;
+void openings(Report& report) {
+    const testkit::Workspace workspace;
+    const std::string small = written(workspace, kSmall);
+    const auto openSmall = [&] { return openOurs(small, kSmall.cells()); };
+    const double idle = bench::inChild(measured(openSmall)).bytes;
+    for (const auto& [workload, goal, mostBytes] : kOpenings) {
+        const std::string name = workload.name;
+        if (!report.wants(name)) continue;
+        const std::string book = written(workspace, workload);
+        const unsigned long cells = workload.cells();
+        const auto [ours, floor] = compare(
+            report, [&] { return openOurs(book, cells); }, [&] { return openFloor(book, cells); });
+        report.add({name + ", ms", ours.seconds * 1e3, floor.seconds * 1e3, goal});
+        report.add({name + ": closing / the whole floor, ms", ours.closing * 1e3,
+                    floor.seconds * 1e3, 0.05});
+        report.add({name + ": bytes a cell",
+                    (ours.bytes - idle) / static_cast<double>(cells),
+                    {},
+                    kNoGoal,
+                    mostBytes});
+    }
 }
 
-using Work = std::function<double()>;
-
-Medians measure(int runs, const Work& ours, const Work& floor) {
-    std::vector<Measurement> oursRuns;
-    std::vector<Measurement> floorRuns;
-    for (int run = 0; run < runs; ++run) {
-        oursRuns.push_back(inProcess(ours));
-        floorRuns.push_back(inProcess(floor));
-    }
-    return {medianOf(oursRuns), medianOf(floorRuns)};
+// In a process that has opened a workbook before, as a host has that imports more than one.
+void openSmall(Report& report) {
+    const std::string name = std::string(kSmall.name) + ", ms";
+    if (!report.wants(name)) return;
+    constexpr int kTimes = 50;
+    const testkit::Workspace workspace;
+    const std::string book = written(workspace, kSmall);
+    const auto often = [](const auto& open) {
+        return [&open] {
+            open();
+            return Figures{bench::secondsOf([&] {
+                               for (int i = 0; i < kTimes; ++i) open();
+                           }) / kTimes,
+                           0, 0};
+        };
+    };
+    const auto [ours, floor] =
+        bench::compare(report.rounds(), often([&] { return openOurs(book, kSmall.cells()); }),
+                       often([&] { return openFloor(book, kSmall.cells()); }));
+    report.add({name, ours.seconds * 1e3, floor.seconds * 1e3, kNoGoal, 1.2});
 }
 
-bool missed = false;  // any goal
-
-// Prints a value beside its goal; 0 means that there is none.
-void printFigure(int width, int digits, double value, double goal) {
-    missed = missed || (goal > 0 && value > goal);
-    std::printf(" %*.*f", width, digits, value);
-    goal > 0 ? std::printf(" %5.2f", goal) : std::printf(" %5s", "-");
+// Parts that the reader of plain parts reads to their very end, before it leaves them to libxml2,
+// beside the sum of both ways: the same workbook once with plain parts, and once with parts that
+// are left to libxml2 from the beginning.
+void plainToTheEnd(Report& report) {
+    for (Workload workload : {kNumbers, kTexts}) {
+        const std::string name = std::string(workload.name) + ", not plain at the end / both, ms";
+        if (!report.wants(name)) continue;
+        const testkit::Workspace workspace;
+        const std::string plain = written(workspace, workload, "plain.xlsx");
+        workload.comment = Comment::First;
+        const std::string any = written(workspace, workload, "any.xlsx");
+        workload.comment = Comment::Last;
+        const std::string late = written(workspace, workload, "late.xlsx");
+        const unsigned long cells = workload.cells();
+        const auto [ours, floor] = compare(
+            report, [&] { return openOurs(late, cells); },
+            [&] { return openOurs(plain, cells) + openOurs(any, cells); });
+        report.add({name, ours.seconds * 1e3, floor.seconds * 1e3, 1.0});
+    }
 }
 
-void printTimes(const std::string& name, const Medians& medians, double goal) {
-    std::printf("%-36s %9.1f %9.1f", name.c_str(), medians.ours.seconds * 1e3,
-                medians.floor.seconds * 1e3);
-    printFigure(6, 2, medians.ours.seconds / medians.floor.seconds, goal);
+// All columns of a workbook that has just been opened.
+void pulling(Report& report) {
+    for (const auto& [workload, limit] : {std::pair{kNumbers, 10.0}, {kTexts, 130.0}}) {
+        const std::string name = std::string(workload.name) + ", columns pulled, ns a value";
+        if (!report.wants(name)) continue;
+        const testkit::Workspace workspace;
+        const std::string book = written(workspace, workload);
+        const unsigned long cells = workload.cells();
+        const auto pull = [&] {
+            Figures figures{};
+            openOurs(book, cells, [&](Provider& provider) {
+                figures.seconds = bench::secondsOf([&] { pullColumns(provider, cells); });
+            });
+            return figures;
+        };
+        const double seconds = bench::measure(report.rounds(), pull).seconds;
+        report.add({name, seconds * 1e9 / static_cast<double>(cells), {}, kNoGoal, limit});
+    }
 }
 
-void endRow() {
-    std::printf("\n");
-    std::fflush(stdout);
+void listing(Report& report) {
+    const std::string name = "worksheet names of the mixed workbook, ms";
+    if (!report.wants(name)) return;
+    const testkit::Workspace workspace;
+    const std::string book = written(workspace, kMixed);
+    const auto [ours, floor] = compare(
+        report, [&] { return listOurs(book, kMixed.sheets); }, [&] { return listFloor(book); });
+    report.add({name, ours.seconds * 1e3, floor.seconds * 1e3, 1.1});
 }
 
-// The runs, workloads and files of one invocation of the program.
-class Program {
-  public:
-    Program(int runs, std::string only, const fs::path& directory)
-        : runs_(runs),
-          only_(std::move(only)),
-          book_((directory / "book.xlsx").string()),
-          document_((directory / "book.xml").string()) {}
+void older(Report& report) {
+    const std::string name = "XML 2003, 100,000 x 10 / bare pass, ms";
+    if (!report.wants(name)) return;
+    constexpr unsigned kRows = 100'000;
+    constexpr unsigned kColumns = 10;
+    constexpr unsigned kCells = kRows * kColumns;
+    const testkit::Workspace workspace;
+    const std::string document = workspace.file("book.xml");
+    bench::writeSpreadsheet2003(document, kRows, kColumns);
+    const auto [ours, floor] = compare(
+        report, [&] { return readOurs2003(document, kCells); },
+        [&] { return passFloor2003(document, kCells); });
+    report.add({name, ours.seconds * 1e3, floor.seconds * 1e3, 1.5});
+}
 
-    void openings() {
-        bench::writeWorkbook(book_, kGoals[5].workload);
-        const unsigned long few = kGoals[5].workload.cells();
-        const double idle = inProcess([&] { return openOurs(book_, few); }).bytes;
-        std::printf("%-36s %9s %9s %6s %5s %6s %5s %6s %5s\n", "open, close and clear", "ours ms",
-                    "floor ms", "ratio", "goal", "close", "goal", "B/cell", "goal");
-        for (const Goal& goal : kGoals) {
-            const bool large = goal.workload.rows > 100000;
-            if (large ? only_ != "large" : !isWanted(goal.workload.name)) continue;
-            bench::writeWorkbook(book_, goal.workload);
-            const unsigned long cells = goal.workload.cells();
-            const Medians medians = measure(
-                runs_, [&] { return openOurs(book_, cells); },
-                [&] { return openFloor(book_, cells); });
-            printTimes(goal.workload.name, medians, goal.ratio);
-            if (goal.bytesPerCell > 0) {
-                const double bytes = medians.ours.bytes - idle;
-                printFigure(6, 3, medians.ours.closing / medians.floor.seconds, 0.05);
-                printFigure(6, 1, bytes / static_cast<double>(cells), goal.bytesPerCell);
-            }
-            if (goal.milliseconds > 0) {
-                std::printf("  ms:");
-                printFigure(4, 1, medians.ours.seconds * 1e3, goal.milliseconds);
-            }
-            endRow();
-        }
+// Compares rows out of order with the same rows in order.
+void order(Report& report, Workload workload, Order other, const std::string& what, double goal) {
+    const std::string name = what + workload.name + ", ms";
+    if (!report.wants(name)) return;
+    const testkit::Workspace workspace;
+    const unsigned long cells = workload.cells();
+    const std::string ordered = written(workspace, workload, "ordered.xlsx");
+    workload.order = other;
+    const std::string book = written(workspace, workload);
+    const auto [ours, floor] = compare(
+        report, [&] { return openAndLoadOurs(book, cells); },
+        [&] { return openAndLoadOurs(ordered, cells); });
+    report.add({name, ours.seconds * 1e3, floor.seconds * 1e3, goal});
+}
+
+void orders(Report& report) {
+    constexpr Workload kInOrder[] = {{"100,000 x 10", Content::Numbers, 1, 100000, 10},
+                                     {"1,000,000 x 2", Content::Numbers, 1, 1000000, 2}};
+    for (const Workload& workload : kInOrder) {
+        order(report, workload, Order::Descending, "rows descending, ", 1.2);
+        order(report, workload, Order::Random, "rows in random order, ", 1.5);
     }
+}
 
-    void listing() {
-        const std::string name = "worksheet names of the mixed workbook";
-        if (!isWanted(name)) return;
-        bench::writeWorkbook(book_, kGoals[2].workload);
-        const Medians medians = measure(
-            runs_, [this] { return listOurs(book_, kGoals[2].workload.sheets); },
-            [this] { return listFloor(book_); });
-        printTimes(name, medians, 1.1);
-        endRow();
-    }
-
-    void older() {
-        const std::string name = "XML 2003, 100,000 x 10 / bare pass";
-        if (!isWanted(name)) return;
-        constexpr unsigned kRows = 100'000;
-        constexpr unsigned kColumns = 10;
-        bench::writeSpreadsheet2003(document_, kRows, kColumns);
-        const Medians medians = measure(
-            runs_, [this] { return readOurs2003(document_, kRows * kColumns); },
-            [this] { return passFloor2003(document_, kRows * kColumns); });
-        printTimes(name, medians, 1.5);
-        endRow();
-    }
-
-    // Compares rows out of order with the same rows in order.
-    void orders() {
-        const Workload inOrder[] = {{"100,000 x 10", Content::Numbers, 1, 100000, 10},
-                                    {"1,000,000 x 2", Content::Numbers, 1, 1000000, 2}};
-        for (const Workload& workload : inOrder) {
-            order(workload, bench::Order::Descending, "rows descending, ", 1.2);
-            order(workload, bench::Order::Random, "rows in random order, ", 1.5);
-        }
-    }
-
-  private:
-    bool isWanted(const std::string& name) const { return name.find(only_) != name.npos; }
-
-    void order(Workload workload, bench::Order other, const std::string& what, double goal) const {
-        const std::string name = what + workload.name;
-        if (!isWanted(name)) return;
-        const std::string ordered = book_ + ".ordered.xlsx";
-        bench::writeWorkbook(ordered, workload);
-        workload.order = other;
-        bench::writeWorkbook(book_, workload);
-        const Medians medians = measure(
-            runs_, [&] { return openAndLoadOurs(book_, workload.cells()); },
-            [&] { return openAndLoadOurs(ordered, workload.cells()); });
-        printTimes(name, medians, goal);
-        endRow();
-    }
-
-    int runs_;
-    std::string only_;
-    std::string book_;
-    std::string document_;
-};
+void measureAll(Report& report) {
+    for (const auto topic : {openings, openSmall, plainToTheEnd, pulling, listing, older, orders})
+        topic(report);
+}
 
 }  // namespace
 
-int main(int argc, char** argv) {
-    const fs::path directory = fs::temp_directory_path() / fs::unique_path("bench-%%%%-%%%%");
-    fs::create_directory(directory);
-    const int result = bench::resultOf([&] {
-        Program program(argc > 1 ? std::max(1, std::atoi(argv[1])) : 5, argc > 2 ? argv[2] : "",
-                        directory);
-        program.openings();
-        program.listing();
-        program.older();
-        program.orders();
-        return missed ? 1 : 0;
-    });
-    fs::remove_all(directory);
-    return result;
-}
+int main(int argc, char** argv) { return bench::run(argc, argv, measureAll); }

@@ -10,11 +10,14 @@
 #include <utility>
 #include <vector>
 
-#include <minizip/zip.h>
+#include "testkit/workspace.h"
+#include "testkit/zip_writer.h"
 
 namespace bench {
 
 namespace {
+
+using testkit::ZipWriter;
 
 constexpr std::string_view kHead =
     "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"yes\"?>\n";
@@ -33,13 +36,6 @@ class Random {
     std::uint64_t state_ = 42;
 };
 
-std::string columnName(unsigned column) {
-    std::string name;
-    for (unsigned n = column + 1; n > 0; n = (n - 1) / 26)
-        name.insert(name.begin(), static_cast<char>('A' + (n - 1) % 26));
-    return name;
-}
-
 std::string number(std::uint32_t random) {
     char text[32];
     std::snprintf(text, sizeof text, "%u.%03u", random % 100000, random / 7 % 1000);
@@ -53,50 +49,10 @@ std::string textOf(unsigned index) {
     return text;
 }
 
-class Package {
-  public:
-    explicit Package(const std::string& path)
-        : zip_(zipOpen64(path.c_str(), APPEND_STATUS_CREATE)) {
-        if (!zip_) std::abort();
-    }
-    ~Package() { zipClose(zip_, nullptr); }
-    Package(const Package&) = delete;
-    Package& operator=(const Package&) = delete;
-
-    void begin(const std::string& name) {
-        zip_fileinfo info{};
-        if (zipOpenNewFileInZip(zip_, name.c_str(), &info, nullptr, 0, nullptr, 0, nullptr,
-                                Z_DEFLATED, Z_BEST_SPEED) != ZIP_OK)
-            std::abort();
-    }
-    void write(std::string_view text) {
-        buffer_ += text;
-        if (buffer_.size() > 1 << 20) flush();
-    }
-    void end() {
-        flush();
-        zipCloseFileInZip(zip_);
-    }
-    void add(const std::string& name, std::string_view text) {
-        begin(name);
-        write(text);
-        end();
-    }
-
-  private:
-    void flush() {
-        zipWriteInFileInZip(zip_, buffer_.data(), static_cast<unsigned>(buffer_.size()));
-        buffer_.clear();
-    }
-
-    zipFile zip_;
-    std::string buffer_;
-};
-
 constexpr std::string_view kRelations =
     "<Relationships xmlns=\"http://schemas.openxmlformats.org/package/2006/relationships\">";
 
-void addStyles(Package& package) {
+void addStyles(ZipWriter& package) {
     std::string styles(kHead);
     styles.append("<styleSheet ").append(kMain).append(">");
     styles += "<numFmts count=\"1\"><numFmt numFmtId=\"164\" formatCode=\"#,##0.000\"/></numFmts>";
@@ -107,7 +63,7 @@ void addStyles(Package& package) {
     for (const char* format : {"0", "2", "14", "164"})
         styles.append("<xf numFmtId=\"").append(format) +=
             "\" fontId=\"0\" fillId=\"0\" borderId=\"0\" xfId=\"0\" applyNumberFormat=\"1\"/>";
-    package.add("xl/styles.xml", styles + "</cellXfs></styleSheet>");
+    package.add({"xl/styles.xml", styles + "</cellXfs></styleSheet>"});
 }
 
 std::string relation(const std::string& id, const char* type, const std::string& target) {
@@ -123,7 +79,7 @@ std::string contentType(const std::string& part, const char* type) {
 }
 
 // Adds the parts that link the others: content types, relationships, the workbook part.
-void addWorkbook(Package& package, unsigned sheets, bool sharedStrings) {
+void addWorkbook(ZipWriter& package, unsigned sheets, bool sharedStrings) {
     std::string workbook(kHead);
     std::string relations = std::string(kHead).append(kRelations);
     std::string types(kHead);
@@ -147,21 +103,29 @@ void addWorkbook(Package& package, unsigned sheets, bool sharedStrings) {
         relations += relation("rId" + n, "worksheet", part);
         types += contentType(part, "worksheet");
     }
-    package.add("[Content_Types].xml", types + "</Types>");
-    package.add("_rels/.rels", std::string(kHead).append(kRelations) +
-                                   relation("rId1", "officeDocument", "xl/workbook.xml") +
-                                   "</Relationships>");
-    package.add("xl/workbook.xml", workbook + "</sheets></workbook>");
-    package.add("xl/_rels/workbook.xml.rels", relations + "</Relationships>");
+    package.add({"[Content_Types].xml", types + "</Types>"});
+    package.add({"_rels/.rels", std::string(kHead).append(kRelations) +
+                                    relation("rId1", "officeDocument", "xl/workbook.xml") +
+                                    "</Relationships>"});
+    package.add({"xl/workbook.xml", workbook + "</sheets></workbook>"});
+    package.add({"xl/_rels/workbook.xml.rels", relations + "</Relationships>"});
 }
 
-void addSharedStrings(Package& package, unsigned count) {
+// The comment, if it is there.
+const char* commentAt(Comment place, const Workload& workload) {
+    return workload.comment == place ? "<!-- -->" : "";
+}
+
+void addSharedStrings(ZipWriter& package, const Workload& workload, unsigned count) {
     const std::string n = std::to_string(count);
     package.begin("xl/sharedStrings.xml");
-    package.write(std::string(kHead).append("<sst ").append(kMain).append(
-        " count=\"" + n + "\" uniqueCount=\"" + n + "\">"));
+    package.write(std::string(kHead)
+                      .append(commentAt(Comment::First, workload))
+                      .append("<sst ")
+                      .append(kMain)
+                      .append(" count=\"" + n + "\" uniqueCount=\"" + n + "\">"));
     for (unsigned i = 0; i < count; ++i) package.write("<si><t>" + textOf(i) + "</t></si>");
-    package.write("</sst>");
+    package.write(std::string(commentAt(Comment::Last, workload)) + "</sst>");
     package.end();
 }
 
@@ -199,34 +163,46 @@ std::vector<unsigned> rowsOf(const Workload& workload) {
     return rows;
 }
 
-void addWorksheet(Package& package, unsigned sheet, const Workload& workload, unsigned strings,
+void addWorksheet(ZipWriter& package, unsigned sheet, const Workload& workload, unsigned strings,
                   Random& random) {
     package.begin("xl/worksheets/sheet" + std::to_string(sheet) + ".xml");
-    package.write(std::string(kHead).append("<worksheet ").append(kMain).append("><sheetData>"));
+    package.write(std::string(kHead)
+                      .append(commentAt(Comment::First, workload))
+                      .append("<worksheet ")
+                      .append(kMain)
+                      .append("><sheetData>"));
     for (const unsigned row : rowsOf(workload)) {
         const std::string r = std::to_string(row);
-        package.write("<row r=\"" + r + "\">");
+        std::string cells = "<row r=\"" + r + "\">";
         for (unsigned column = 0; column < workload.columns; ++column)
-            package.write("<c r=\"" + columnName(column) + r + "\"" +
-                          cellRest(workload.content, column, random.next(), strings));
-        package.write("</row>");
+            cells += "<c r=\"" + columnName(column) + r + "\"" +
+                     cellRest(workload.content, column, random.next(), strings);
+        package.write(cells + "</row>");
     }
-    package.write("</sheetData></worksheet>");
+    package.write(std::string(commentAt(Comment::Last, workload)) + "</sheetData></worksheet>");
     package.end();
 }
 
 }  // namespace
 
+std::string columnName(unsigned column) {
+    std::string name;
+    for (unsigned n = column + 1; n > 0; n = (n - 1) / 26)
+        name.insert(name.begin(), static_cast<char>('A' + (n - 1) % 26));
+    return name;
+}
+
 void writeWorkbook(const std::string& path, const Workload& workload) {
-    Package package(path);
+    ZipWriter package;
     Random random;
     const auto strings = static_cast<unsigned>(workload.cells() / 2 + 1);
     const bool sharedStrings = workload.content != Content::Numbers;
     addWorkbook(package, workload.sheets, sharedStrings);
     addStyles(package);
-    if (sharedStrings) addSharedStrings(package, strings);
+    if (sharedStrings) addSharedStrings(package, workload, strings);
     for (unsigned sheet = 1; sheet <= workload.sheets; ++sheet)
         addWorksheet(package, sheet, workload, strings, random);
+    testkit::writeFile(path, package.finished());
 }
 
 void writeSpreadsheet2003(const std::string& path, unsigned rows, unsigned columns) {

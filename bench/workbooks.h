@@ -8,6 +8,9 @@ namespace bench {
 enum class Content { Numbers, Texts, Mixed };
 // In which order the rows stand in the worksheet part.
 enum class Order { Ascending, Descending, Random };
+// Where the worksheet and shared-string parts have a comment, which the reader of plain parts
+// leaves to libxml2.
+enum class Comment { None, First, Last };
 
 struct Workload {
     const char* name;
@@ -16,9 +19,13 @@ struct Workload {
     unsigned rows;
     unsigned columns;
     Order order = Order::Ascending;
+    Comment comment = Comment::None;
 
-    unsigned long cells() const { return 1UL * sheets * rows * columns; }
+    constexpr unsigned long cells() const { return 1UL * sheets * rows * columns; }
 };
+
+// The letters of a column, by its 0-based index.
+std::string columnName(unsigned column);
 
 // Writes a package of that shape.
 void writeWorkbook(const std::string& path, const Workload& workload);
