@@ -11,7 +11,8 @@ PackageBuilder PackageBuilder::of(const std::vector<std::string>& sheets) {
     std::string relations;
     for (std::size_t i = 1; i <= sheets.size(); ++i) {
         const std::string n = std::to_string(i);
-        list += "<sheet name='S" + n + "' sheetId='" + n + "' r:id='r" + n + "'/>";
+        list.append("<sheet name='S").append(n).append("' sheetId='").append(n);
+        list.append("' r:id='r").append(n).append("'/>");
         relations += relation("r" + n, "worksheet", "worksheets/sheet" + n + ".xml");
         package.set("xl/worksheets/sheet" + n + ".xml", worksheet(sheets[i - 1]));
     }
@@ -86,7 +87,8 @@ std::string PackageBuilder::bytes() const {
 void PackageBuilder::write(const std::string& path) const { writeFile(path, bytes()); }
 
 void PackageBuilder::unpackTo(const std::string& directory) const {
-    for (const auto& [name, content] : parts) writeFile(directory + "/" + name, content);
+    const boost::filesystem::path root(directory);
+    for (const auto& [name, content] : parts) writeFile((root / name).string(), content);
 }
 
 }  // namespace testkit
