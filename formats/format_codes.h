@@ -6,7 +6,8 @@
 #include "dpxlsx/model/host/export.h"
 
 // Recognisers of Excel number-format codes. They accept the plain shapes that Excel's built-in
-// formats use and reject everything else; none of them fails on any text.
+// formats use and reject everything else; none of them fails on any text. Those of date-times are
+// in date_time_code.cpp, all others in format_codes.cpp.
 namespace dp {
 
 class NumericVariableFormat;

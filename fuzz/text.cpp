@@ -10,6 +10,7 @@
 #include "dpxlsx/readers/worksheet_size.h"
 #include "dpxlsx/readers/xlsx/cell_reference.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
+#include "dpxlsx/readers/xlsx/relationships.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
 #include "dpxlsx/store/conversion.h"
 #include "dpxlsx/store/number_recognition.h"

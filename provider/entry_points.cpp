@@ -1,11 +1,6 @@
 #include "dpxlsx/model/host/entry_points.h"
 
-#include <algorithm>
-#include <cctype>
 #include <cstring>
-#include <string>
-
-#include <boost/filesystem/path.hpp>
 
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/provider/file_type.h"
@@ -18,13 +13,6 @@ namespace {
 constexpr char kTypeName[] = "xlsx";
 
 }  // namespace
-
-bool hasXlsxExtension(const std::string& path) {
-    std::string extension = boost::filesystem::path(path).extension().string();
-    std::transform(extension.begin(), extension.end(), extension.begin(),
-                   [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
-    return extension == ".xlsx";
-}
 
 bool IsMicrosoftXLSXFile(const char* fileName) { return hasXlsxExtension(textOrEmpty(fileName)); }
 

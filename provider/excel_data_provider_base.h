@@ -13,13 +13,16 @@
 #include "dpxlsx/model/host/i_variable_format.h"
 #include "dpxlsx/model/host/i_worksheet.h"
 #include "dpxlsx/store/blank_rows.h"
-#include "dpxlsx/store/column_loading.h"
-#include "dpxlsx/store/conversion.h"
 #include "dpxlsx/store/external_data_record.h"
 #include "dpxlsx/store/read_options.h"
 #include "dpxlsx/store/worksheet_cells.h"
 
 namespace dp {
+
+class CellFormats;
+struct ConversionSettings;
+struct LoadSettings;
+struct RowLayout;
 
 // The kind in which a column is requested; Automatic is the kind of its first data cell.
 enum class ColumnType : int { Numeric = 0, Text = 1, Automatic = 2 };
@@ -28,7 +31,18 @@ enum class ColumnType : int { Numeric = 0, Text = 1, Automatic = 2 };
 // their cells, and the columns made of them on demand. Providers that open files derive from it.
 //
 // The order of the virtual operations and of the members is part of the binary contract; the
-// banners give the slots. One provider is used by one thread at a time; the static settings are
+// banners give the slots. Their definitions are in
+//
+//   excel_data_provider_base.cpp  life, and what remains when worksheets are cleared
+//   unsupported.cpp               the write side, and the queries that never find anything
+//   settings.cpp                  the settings of one provider, and those that are ignored
+//   process_settings.cpp          the settings of the process
+//   read_options.cpp              read options
+//   worksheet_registry.cpp        the worksheets, and the cells that a reader delivers
+//   rows.cpp                      row layout
+//   columns.cpp                   columns on demand, and conversion
+//
+// One provider is used by one thread at a time; the static settings are
 // shared by all providers of the process, without locks.
 class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
                                          public IWorksheetFinder,

@@ -2,7 +2,6 @@
 
 #include <string>
 
-// Unpacking of .xlsx packages.
 namespace dp {
 
 // How a step of opening ended.
@@ -19,12 +18,6 @@ enum class PackageStatus : int {
 
 // The result code that the host gets.
 long resultCode(PackageStatus status);
-
-// Unpacks the archive at `archive` into `directory`, an absolute path that exists. Entries are
-// streamed; nothing outside the directory is written, and the archive itself is not overwritten.
-// What was written stays there after a failure. A package that claims more bytes or entries than
-// the limits or the free space allow is refused before anything is written.
-PackageStatus unpackArchive(const std::string& archive, const std::string& directory);
 
 // Whether the unpacked package in `directory` is a workbook. Throws the file system's error when
 // its parts cannot be looked up.

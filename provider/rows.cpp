@@ -1,5 +1,6 @@
 #include "dpxlsx/model/columns.h"
 #include "dpxlsx/provider/excel_data_provider_base.h"
+#include "dpxlsx/store/column_loading.h"
 #include "dpxlsx/store/row_layout.h"
 
 // Derives the rows of a worksheet from read options and stored cells. The results are kept: cells

@@ -1,3 +1,5 @@
+#include "dpxlsx/provider/unpacking.h"
+
 #include <fcntl.h>
 #include <unistd.h>
 
@@ -15,7 +17,6 @@
 #include "dpxlsx/provider/archive.h"
 #include "dpxlsx/provider/entry_name.h"
 #include "dpxlsx/provider/entry_reader.h"
-#include "dpxlsx/provider/package.h"
 #include "dpxlsx/provider/temporary_directory.h"
 #include "dpxlsx/provider/unpacking_limits.h"
 

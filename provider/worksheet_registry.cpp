@@ -7,6 +7,7 @@
 #include "dpxlsx/model/worksheet.h"
 #include "dpxlsx/provider/excel_data_provider_base.h"
 #include "dpxlsx/store/text_cleaning.h"
+#include "dpxlsx/store/text_pool.h"
 
 // The worksheets that a reader announced: names, keys, positions, and their cells.
 namespace dp {

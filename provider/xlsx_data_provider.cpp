@@ -10,7 +10,10 @@
 #include "dpxlsx/formats/format_codes.h"
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/provider/file_type.h"
+#include "dpxlsx/provider/package.h"
 #include "dpxlsx/provider/temporary_directory.h"
+#include "dpxlsx/provider/unpacking.h"
+#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "dpxlsx/readers/xml/file_copy.h"
 
 namespace dp {

@@ -5,10 +5,11 @@
 #include <vector>
 
 #include "dpxlsx/provider/excel_data_provider_base.h"
-#include "dpxlsx/provider/package.h"
-#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 
 namespace dp {
+
+class ExcelXLSXReader;
+enum class PackageStatus : int;
 
 // The provider of .xlsx files. Opening copies the workbook into a private temporary directory,
 // unpacks it there and reads it whole; closing removes the directory. Unpacking leaves the

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "dpxlsx/readers/xlsx/shared_string_table.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 #include "testkit/package_builder.h"

@@ -28,7 +28,7 @@ long sharedStringIndex(std::string_view text) {
 }  // namespace
 
 CellAssembler::CellAssembler(ExcelXLSXReader& owner, std::size_t passedOver)
-    : owner_(owner), passedOver_(passedOver) {
+    : owner_(owner), package_(*owner.opened_), passedOver_(passedOver) {
     text_.cell.type = CELL_TEXT;
 }
 
@@ -82,8 +82,8 @@ void CellAssembler::inlineText(std::string_view text) {
 
 void CellAssembler::deliverNumber(std::string_view text) {
     WaitingCell cell{place_.row(), place_.column(), -1, 0.0, {}};
-    if (style_ >= 0 && static_cast<std::size_t>(style_) < owner_.numberKinds.size())
-        cell.kind = owner_.numberKinds[static_cast<std::size_t>(style_)];
+    if (style_ >= 0 && static_cast<std::size_t>(style_) < package_.numberKinds.size())
+        cell.kind = package_.numberKinds[static_cast<std::size_t>(style_)];
     CmXmlCast::instance().mCast(cell.number, text.data());
     if (waitingCount_ == 0)
         deliver(cell);
@@ -92,8 +92,8 @@ void CellAssembler::deliverNumber(std::string_view text) {
 }
 
 void CellAssembler::deliverSharedString(long index) {
-    if (index < 0 || static_cast<std::size_t>(index) >= owner_.sharedStrings.size()) return;
-    owner_.sharedStrings.fetchPlace(static_cast<std::size_t>(index));
+    if (index < 0 || static_cast<std::size_t>(index) >= package_.sharedStrings.size()) return;
+    package_.sharedStrings.fetchPlace(static_cast<std::size_t>(index));
     wait({place_.row(), place_.column(), index, 0.0, {}});
 }
 
@@ -115,7 +115,7 @@ void CellAssembler::wait(const WaitingCell& cell) {
     if (waitingCount_ <= kWaiting / 2) return;
     const WaitingCell& between = waiting_[(oldest_ + waitingCount_ - kWaiting / 2) % kWaiting];
     if (between.sharedString >= 0)
-        owner_.sharedStrings.fetchText(static_cast<std::size_t>(between.sharedString));
+        package_.sharedStrings.fetchText(static_cast<std::size_t>(between.sharedString));
 }
 
 void CellAssembler::deliverWaiting() {
@@ -139,12 +139,12 @@ void CellAssembler::deliver(const WaitingCell& cell) {
         return deliverAt(cell.row, cell.column, number_);
     }
     const auto index = static_cast<std::size_t>(cell.sharedString);
-    text_.cell.textValue = owner_.sharedStrings[index];
+    text_.cell.textValue = package_.sharedStrings[index];
     if (!text_.cell.textValue.empty()) deliverTextAt(cell.row, cell.column);
 }
 
 void CellAssembler::deliverTextAt(unsigned row, unsigned column) {
-    if (delivered_ >= passedOver_) owner_.textBudget.spend(text_.cell.textValue.size());
+    if (delivered_ >= passedOver_) package_.textBudget.spend(text_.cell.textValue.size());
     deliverAt(row, column, text_);
 }
 

@@ -8,6 +8,7 @@
 #include "dpxlsx/readers/worksheet_size.h"
 #include "dpxlsx/readers/xlsx/cell_reference.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
+#include "dpxlsx/readers/xlsx/opened_package.h"
 #include "dpxlsx/store/external_data_record.h"
 
 namespace dp {
@@ -72,6 +73,7 @@ class CellAssembler {
     static constexpr std::size_t kWaiting = 16;
 
     ExcelXLSXReader& owner_;
+    ExcelXLSXReader::OpenedPackage& package_;
     const std::size_t passedOver_;
     std::size_t delivered_ = 0;
     CellPlace place_;

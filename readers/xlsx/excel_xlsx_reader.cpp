@@ -1,8 +1,11 @@
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 
+#include <string_view>
 #include <unordered_map>
 #include <utility>
 
+#include "dpxlsx/formats/style_classification.h"
+#include "dpxlsx/readers/xlsx/opened_package.h"
 #include "dpxlsx/readers/xml/silence.h"
 
 // The workbook: which worksheets there are, and in which order their parts are read.
@@ -14,7 +17,9 @@ ExcelXLSXReader::ExcelXLSXReader(const std::string& dir, bool sharedStringsPrese
     : ExcelXmlReader(dir + "/xl/workbook.xml", std::move(shortDate), missing, receiver, helper),
       hasSharedStrings(sharedStringsPresent),
       xlDir(dir + "/xl/"),
-      packageDir(dir) {}
+      opened_(std::make_unique<OpenedPackage>()) {
+    opened_->dir = dir;
+}
 
 ExcelXLSXReader::~ExcelXLSXReader() = default;
 
@@ -23,7 +28,7 @@ void ExcelXLSXReader::mReadExcelWorkbook() {
     mReadExcel2007Styles();
     mReadSharedStrings();
     mReadWorkbookRelationships(xlDir, relationshipIds, relationshipTargets);
-    relationshipIndex = RelationshipIndex(relationshipIds);
+    opened_->relationships = RelationshipIndex(relationshipIds);
     readSheets();
 }
 
@@ -46,12 +51,12 @@ void ExcelXLSXReader::readSheet(std::vector<unsigned>& emptySheets) {
     mSearchWorkbookRelationships(id, target);
     if (target.empty()) return;  // a chart sheet, say
     beginWorksheet(name);
-    readWorksheet(*this, target);
+    readWorksheet(target);
     if (worksheetEmpty) emptySheets.push_back(static_cast<unsigned>(worksheetIndex - 1));
 }
 
 void ExcelXLSXReader::mSearchWorkbookRelationships(const std::string& id, std::string& target) {
-    const std::ptrdiff_t index = relationshipIndex.find(id);
+    const std::ptrdiff_t index = opened_->relationships.find(id);
     if (index >= 0) target = relationshipTargets[static_cast<std::size_t>(index)];
 }
 
@@ -60,6 +65,7 @@ void ExcelXLSXReader::resolveNumberKinds() {
     for (std::size_t i = 0; i < styles.size(); ++i)
         firstById.try_emplace(styles[i].styleId, static_cast<int>(i));
     firstById.erase("");  // a cell format without an id has no number format
+    std::vector<NumberKind>& numberKinds = opened_->numberKinds;
     numberKinds.clear();
     numberKinds.reserve(cellXfNumFmtIds.size());
     for (const std::string& id : cellXfNumFmtIds) {

@@ -1,24 +1,16 @@
 #pragma once
 
+#include <memory>
 #include <string>
 #include <vector>
 
-#include "dpxlsx/readers/xlsx/relationships.h"
-#include "dpxlsx/readers/xlsx/repeated_parts.h"
-#include "dpxlsx/readers/xlsx/shared_string_table.h"
-#include "dpxlsx/readers/xlsx/text_budget.h"
 #include "dpxlsx/readers/xml2003/excel_xml_reader.h"
 
 namespace dp {
 
-// The kind of a number cell according to its style.
-struct NumberKind {
-    ExternalCellType type = CELL_NUMBER;
-    int formatIndex = -1;
-};
-
 // Reads an unpacked .xlsx package: styles, shared strings, relationships, then the worksheets of
-// the workbook's list in order.
+// the workbook's list in order. Defined in excel_xlsx_reader.cpp (the workbook),
+// shared_strings.cpp, styles.cpp and worksheet.cpp.
 class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
   public:
     // `dir` is the directory of the unpacked package, and `hasSharedStrings` tells whether it has
@@ -50,25 +42,21 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
 
   private:
     friend class CellAssembler;
-    // Like mReadExcel2007Worksheet, but with the number kinds determined before.
-    friend void readWorksheet(ExcelXLSXReader& reader, const std::string& target);
+    struct OpenedPackage;
 
     void readSheets();
     void readSheet(std::vector<unsigned>& emptySheets);
     void resolveNumberKinds();
+    // Like mReadExcel2007Worksheet, but with the number kinds determined before.
+    void readWorksheet(const std::string& target);
 
     bool hasSharedStrings;
     std::string xlDir;
     std::vector<std::string> relationshipIds;
     std::vector<std::string> relationshipTargets;
-    SharedStringTable sharedStrings;  // decoded; blank texts, which cells do not deliver, are empty
+    std::vector<std::string> sharedStrings;  // stays empty: opened_ has the texts
     std::vector<std::string> cellXfNumFmtIds;
-
-    std::string packageDir;
-    RelationshipIndex relationshipIndex;
-    std::vector<NumberKind> numberKinds;  // by position in cellXfNumFmtIds
-    TextBudget textBudget;
-    RepeatedParts repeatedParts;
+    std::unique_ptr<OpenedPackage> opened_;  // what only the library's own code needs
 };
 
 namespace excel_xlsx {

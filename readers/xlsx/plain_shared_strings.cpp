@@ -1,3 +1,5 @@
+#include "dpxlsx/readers/xlsx/plain_shared_strings.h"
+
 #include <cstddef>
 #include <cstring>
 #include <string_view>

@@ -1,10 +1,11 @@
+#include "dpxlsx/readers/xlsx/plain_worksheet.h"
+
 #include <cstddef>
 #include <cstring>
 #include <optional>
 #include <string_view>
 
 #include "dpxlsx/readers/xlsx/cell_assembler.h"
-#include "dpxlsx/readers/xlsx/worksheet_sources.h"
 
 namespace dp {
 

@@ -1,11 +1,9 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
 #include <string_view>
 
 #include "dpxlsx/readers/xlsx/shared_string_table.h"
-#include "dpxlsx/readers/xml/plain_xml.h"
 
 namespace dp {
 
@@ -30,14 +28,5 @@ class SharedStringEntries {
     const std::string& path_;
     std::string text_;
 };
-
-// The two ways to read a shared-string part into an empty table.
-
-// The fast one, for plain parts. False, and the table is of no use, when the part is not plain.
-bool readPlainSharedStrings(const std::string& path, SharedStringTable& table,
-                            std::size_t chunk = PlainXml::kWindow);
-
-// By libxml2's text reader, for any part. Throws CmXmlException when it cannot be read.
-void readAnySharedStrings(const std::string& path, SharedStringTable& table);
 
 }  // namespace dp

@@ -6,12 +6,10 @@
 #include <string_view>
 #include <vector>
 
-#include "dpxlsx/model/host/export.h"
-
 namespace dp {
 
 // Texts by index, stored back to back in memory, and four bytes more for each.
-class DPXLSX_API SharedStringTable {
+class SharedStringTable {
   public:
     SharedStringTable() = default;
     // Keeps only `endBits` bits of a text's end in place; tests set fewer than the usual 32.

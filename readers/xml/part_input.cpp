@@ -25,10 +25,8 @@ namespace {
 // The file behind a reader, and how far libxml2 has come in it.
 class PartInput {
   public:
-    PartInput(const std::string& path, const std::uint32_t& moves)
-        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)),
-          moves_(moves),
-          text_(descriptor_) {}
+    explicit PartInput(const std::string& path)
+        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)), text_(descriptor_) {}
     ~PartInput() {
         if (isOpen()) ::close(descriptor_);
     }
@@ -64,9 +62,10 @@ class PartInput {
     // Bytes that libxml2 has received during the current move; 0 while a host moves the reader
     // itself.
     std::int64_t runSize() {
-        const bool moves = moves_ % 2 == 1;
-        if (!moves || moves_ != movesBefore_) runStart_ = supplied_;
-        movesBefore_ = moves_;
+        const std::uint32_t steps = DocumentMove::steps();
+        const bool moves = steps % 2 == 1;
+        if (!moves || steps != stepsBefore_) runStart_ = supplied_;
+        stepsBefore_ = steps;
         return supplied_ - runStart_;
     }
 
@@ -113,8 +112,7 @@ class PartInput {
     }
 
     int descriptor_;
-    const std::uint32_t& moves_;
-    std::uint32_t movesBefore_ = 0;
+    std::uint32_t stepsBefore_ = 0;
     std::int64_t runStart_ = 0;
     PartText text_;
     std::string_view pending_;  // of the text, for libxml2
@@ -148,8 +146,8 @@ void noteText(void* payload, void* found, const xmlChar*) {
 
 }  // namespace
 
-xmlTextReaderPtr openDocument(const std::string& path, const std::uint32_t& moves) {
-    auto input = std::make_unique<PartInput>(path, moves);
+xmlTextReaderPtr openDocument(const std::string& path) {
+    auto input = std::make_unique<PartInput>(path);
     if (!input->isOpen()) return nullptr;
     PartInput* const watching = input.get();
     const int options =

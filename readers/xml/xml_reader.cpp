@@ -2,7 +2,6 @@
 
 #include <unistd.h>
 
-#include <algorithm>
 #include <cstring>
 
 #include <libxml/xmlreader.h>
@@ -10,6 +9,7 @@
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
 #include "dpxlsx/readers/xml/file_copy.h"
+#include "dpxlsx/readers/xml/known_names.h"
 #include "dpxlsx/readers/xml/part_input.h"
 #include "dpxlsx/readers/xml/silence.h"
 #include "dpxlsx/readers/xml/temporary_path.h"
@@ -23,8 +23,8 @@ bool looksLikeAddress(const std::string& path) {
 }
 
 // Null for a path that cannot be opened, or that libxml2 would take for an address.
-xmlTextReaderPtr openFile(const std::string& path, const std::uint32_t& moves) {
-    return looksLikeAddress(path) ? nullptr : dp::openDocument(path, moves);
+xmlTextReaderPtr openFile(const std::string& path) {
+    return looksLikeAddress(path) ? nullptr : dp::openDocument(path);
 }
 
 // The path of a private copy of `path`; empty when it could not be made. Throws the file system's
@@ -40,6 +40,11 @@ std::string copyToTemporary(const std::string& path) {
 void requireNoElement(int nodeType) {
     if (nodeType == XML_READER_TYPE_ELEMENT || nodeType == XML_READER_TYPE_END_ELEMENT)
         throw CmXmlException(kXmlError);
+}
+
+int moveOn(xmlTextReaderPtr reader) {
+    const dp::DocumentMove move;
+    return xmlTextReaderRead(reader);
 }
 
 bool isTooDeep(xmlTextReaderPtr reader) {
@@ -63,11 +68,11 @@ XmlReader::~XmlReader() {
 
 void XmlReader::mInitialize(const std::string& path) {
     const dp::SilentLibxml2 silent;
-    textReader = openFile(path, moves_);
+    textReader = openFile(path);
     if (!textReader) {
         tempPath = copyToTemporary(path);
         tempCopy = !tempPath.empty();
-        if (tempCopy) textReader = openFile(tempPath, moves_);
+        if (tempCopy) textReader = openFile(tempPath);
     }
     if (!textReader || !readNode() || dp::declaresTooMuch(textReader))
         throw CmXmlException(kXmlError);
@@ -76,9 +81,7 @@ void XmlReader::mInitialize(const std::string& path) {
 
 bool XmlReader::readNode() {
     const dp::SilentLibxml2 silent;
-    ++moves_;
-    const int result = xmlTextReaderRead(textReader);
-    ++moves_;
+    const int result = moveOn(textReader);
     endOfFile = result == 0;
     if (result == -1 || isTooDeep(textReader)) throw CmXmlException(kXmlError);
     return !endOfFile;
@@ -158,37 +161,6 @@ const char* XmlReader::nodeValue() const {
 }
 
 namespace dp::xml {
-
-KnownNames::KnownNames(XmlReader& reader, const std::vector<std::string>& names) {
-    for (const std::string& name : names) names_.push_back(reader.knownName(name.c_str()));
-}
-
-int KnownNames::find(const char* name) const {
-    const auto position = [this](auto isName) {
-        const auto found = std::find_if(names_.begin(), names_.end(), isName);
-        return found == names_.end() ? -1 : static_cast<int>(found - names_.begin());
-    };
-    const int same = position([name](const char* known) { return known == name; });
-    if (same != -1 || !name) return same;
-    // A name with a prefix is another copy: compare characters.
-    return position([name](const char* known) { return std::strcmp(known, name) == 0; });
-}
-
-int readToOneOf(XmlReader& reader, const KnownNames& names) {
-    bool onElement = reader.nodeType() == XML_READER_TYPE_ELEMENT || reader.readToElement();
-    for (; onElement; onElement = reader.readToElement())
-        if (const int found = names.find(reader.nodeName()); found != -1) return found;
-    return -1;
-}
-
-bool readContent(XmlReader& reader) {
-    while (reader.readNode()) {
-        const int type = reader.nodeType();
-        if (type != XML_READER_TYPE_COMMENT && type != XML_READER_TYPE_PROCESSING_INSTRUCTION)
-            return true;
-    }
-    return false;
-}
 
 int mReadForElements(XmlReader& reader, const std::vector<std::string>& names) {
     return names.empty() ? -1 : readToOneOf(reader, KnownNames(reader, names));

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -74,13 +73,6 @@ class DPXLSX_API XmlReader {
 
     bool tempCopy = false;   // the document is a private copy, which the destructor removes
     bool endOfFile = false;  // the last forward read came to the end of the document
-  private:
-    // Incremented at the start and at the end of each move: odd while the reader is moving. It is
-    // declared here because it fits into the padding between the flags and the path, so no field
-    // that hosts know is moved.
-    std::uint32_t moves_ = 0;
-
-  public:
     std::string tempPath;
     _xmlTextReader* textReader = nullptr;
 
@@ -90,31 +82,9 @@ class DPXLSX_API XmlReader {
 
 namespace dp::xml {
 
-// Names as the document's own copies, so that comparing pointers nearly always suffices. Valid as
-// long as the reader, and only for names that this reader returns.
-class KnownNames {
-  public:
-    // None, until names are known.
-    KnownNames() = default;
-    KnownNames(XmlReader& reader, const std::vector<std::string>& names);
-
-    // The index of a name that the reader returned, -1 when it is not one of these.
-    int find(const char* name) const;
-
-  private:
-    std::vector<const char*> names_;
-};
-
 // Moves to the next element whose name is in `names` and returns the name's index; stays where it
 // is when the current element is one. -1 at the end of the document and for an empty list. Throws
 // CmXmlException.
 DPXLSX_API int mReadForElements(XmlReader& reader, const std::vector<std::string>& names);
-
-// The same for names that are known already; without any it reads to the end of the document.
-int readToOneOf(XmlReader& reader, const KnownNames& names);
-
-// Moves to the next node of content, skipping comments and processing instructions. False at the
-// end of the document. Throws CmXmlException.
-bool readContent(XmlReader& reader);
 
 }  // namespace dp::xml

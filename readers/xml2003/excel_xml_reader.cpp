@@ -1,5 +1,6 @@
 #include "dpxlsx/readers/xml2003/excel_xml_reader.h"
 
+#include <iterator>
 #include <stdexcept>
 #include <string_view>
 #include <utility>
@@ -7,6 +8,7 @@
 #include <boost/lexical_cast.hpp>
 
 #include "dpxlsx/formats/style_classification.h"
+#include "dpxlsx/readers/xml2003/reading.h"
 #include "dpxlsx/store/text_cleaning.h"
 
 // What all readers of workbooks share.
@@ -38,15 +40,13 @@ ExcelXmlReader::ExcelXmlReader(std::string path, std::string shortDate, double m
       dateTimeHelper(helper) {
     xmlReader.mInitialize(path);
     mInitialize();
-    cellNames_ = xml::KnownNames(xmlReader, elementNames);
-    rowNames_ = xml::KnownNames(xmlReader, {"Row", "WorksheetOptions"});
-    attributeNames_ = xml::KnownNames(xmlReader, {"StyleID", "Index", "MergeAcross", "Type"});
+    reading_ = std::make_unique<Reading>(xmlReader);
 }
 
 ExcelXmlReader::~ExcelXmlReader() = default;
 
 void ExcelXmlReader::mInitialize() {
-    elementNames = {"Cell", "Data", "WorksheetOptions", "Row", "ss:Data", "Comment"};
+    elementNames.assign(std::begin(kCellElements), std::end(kCellElements));
     percentFormats = {"0.00%", "0%"};
     currencyFormats = {R"("$"#,##0.00_);[Red]\("$"#,##0.00\))", R"("$"#,##0.00_);\("$"#,##0.00\))",
                        R"("$"#,##0_);[Red]\("$"#,##0\))", R"("$"#,##0_);\("$"#,##0\))"};
@@ -100,7 +100,7 @@ DateTimeMasks ExcelXmlReader::masks() {
 }
 
 bool ExcelXmlReader::mSearchStyleIndexForFormat(const std::string& id, xStyle*& style, int& index) {
-    index = static_cast<int>(styleById_.find(styles, id));
+    index = static_cast<int>(reading_->styleById.find(styles, id));
     style = index < 0 ? nullptr : &styles[static_cast<std::size_t>(index)];
     return style != nullptr;
 }
@@ -114,8 +114,8 @@ bool ExcelXmlReader::mGetFormat(unsigned column, unsigned row, int& styleIndex) 
         mSearchStyleIndexForFormat(currentStyleId, currentStyle, styleIndex);
         return true;
     };
-    if (resolve(columnStyles, styleByColumn_, column)) return true;
-    if (resolve(rowStyles, styleByRow_, row)) return true;
+    if (resolve(columnStyles, reading_->styleByColumn, column)) return true;
+    if (resolve(rowStyles, reading_->styleByRow, row)) return true;
     if (!currentStyle) return false;
     mSearchStyleIndexForFormat(currentStyleId, currentStyle, styleIndex);
     return true;

@@ -1,25 +1,26 @@
 #pragma once
 
+#include <memory>
 #include <string>
 #include <vector>
 
 #include "dpxlsx/formats/style.h"
-#include "dpxlsx/formats/style_classification.h"
 #include "dpxlsx/model/host/export.h"
 #include "dpxlsx/model/host/i_data_provider.h"
 #include "dpxlsx/model/host/i_variable_format.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
-#include "dpxlsx/readers/xml2003/first_entry_index.h"
 #include "dpxlsx/store/external_data_record.h"
 
-struct _xmlAttr;  // libxml2's own name; NOLINT(bugprone-reserved-identifier)
-
 namespace dp {
+
+struct DateTimeMasks;
 
 // Reads a workbook into a provider. This class reads XML Spreadsheet 2003 documents and owns what
 // all readers share: the style table and the formats made from it. The provider and the date-time
 // helper are borrowed. Structural errors end as CmXmlException; what was delivered until then stays
-// with the provider. The order of the virtual operations is part of the binary contract.
+// with the provider. The order of the virtual operations is part of the binary contract. Defined in
+// excel_xml_reader.cpp (the style table and what all readers share), spreadsheet_2003.cpp (styles,
+// worksheets and rows of the 2003 format) and spreadsheet_2003_cells.cpp (its cells).
 class DPXLSX_API ExcelXmlReader {
   public:
     // Opens the document at `path`. `shortDateFormat` is the code that "Short Date" stands for,
@@ -95,20 +96,8 @@ class DPXLSX_API ExcelXmlReader {
     static bool IsStringAllBlank(const std::string& text);
 
   protected:
-    DateTimeMasks masks();
-    bool isInTable(int styleIndex) const;
-    EXCEL_FORMAT_TYPE typeAt(int styleIndex) const;
     // Delivers a record and notes that the worksheet is not empty.
     void deliver(const ExternalDataRecord& record);
-    bool isOnElement(const char* name) const;
-    bool isStyle(const std::string& id);
-    void readRow(unsigned row, unsigned columnCount);
-    void beginCell(unsigned& column, unsigned& mergeAcross);
-    void setCurrentStyle(const char* id);
-    int attributeName(const _xmlAttr* attribute) const;
-    ExternalCellType dataType();
-    bool readData(bool inPreview);
-    void readStringData(std::string& text);
     // Announces a worksheet to the provider and makes it the current one.
     void beginWorksheet(const std::string& name);
     // Removes the worksheets that delivered nothing and selects the first one.
@@ -138,13 +127,21 @@ class DPXLSX_API ExcelXmlReader {
     std::string ampmMask;
 
   private:
-    ExternalDataRecord record_{0, 0, 0, 0};  // the one being read
-    xml::KnownNames cellNames_;              // elementNames as the constructor left them
-    xml::KnownNames rowNames_;
-    xml::KnownNames attributeNames_;
-    FirstEntryIndex<xStyle, std::string> styleById_{&xStyle::styleId};
-    FirstEntryIndex<xStyleRange, unsigned> styleByColumn_{&xStyleRange::column};
-    FirstEntryIndex<xStyleRange, unsigned> styleByRow_{&xStyleRange::row};
+    struct Reading;
+
+    DateTimeMasks masks();
+    bool isInTable(int styleIndex) const;
+    EXCEL_FORMAT_TYPE typeAt(int styleIndex) const;
+    bool isOnElement(const char* name) const;
+    bool isStyle(const std::string& id);
+    void readRow(unsigned row, unsigned columnCount);
+    void beginCell(unsigned& column, unsigned& mergeAcross);
+    void setCurrentStyle(const char* id);
+    ExternalCellType dataType();
+    bool readData(bool inPreview);
+    void readStringData(std::string& text);
+
+    std::unique_ptr<Reading> reading_;  // what only the library's own code needs
 };
 
 }  // namespace dp

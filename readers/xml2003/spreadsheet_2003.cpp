@@ -6,7 +6,7 @@
 #include "dpxlsx/readers/xml/attributes.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
 #include "dpxlsx/readers/xml/silence.h"
-#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
+#include "dpxlsx/readers/xml2003/reading.h"
 
 // XML Spreadsheet 2003: the workbook, its styles and its worksheets.
 namespace dp {
@@ -28,7 +28,7 @@ bool readIndex(XmlReader& reader, unsigned& index) {
 void ExcelXmlReader::mReadExcelWorkbook() {
     const SilentLibxml2 silent;
     mReadExcelStyles();
-    const auto byId = styleById_.use();
+    const auto byId = reading_->styleById.use();
     std::vector<unsigned> emptySheets;
     emptySheets.reserve(100);
     while (!xmlReader.endOfFile && xml::mReadForElements(xmlReader, {"Worksheet"}) != -1) {
@@ -67,9 +67,9 @@ void ExcelXmlReader::mReadExcelStyles() {
 }
 
 void ExcelXmlReader::mReadExcelWorksheet(std::vector<unsigned>& emptySheets) {
-    const auto byId = styleById_.use();
-    const auto byColumn = styleByColumn_.use();
-    const auto byRow = styleByRow_.use();
+    const auto byId = reading_->styleById.use();
+    const auto byColumn = reading_->styleByColumn.use();
+    const auto byRow = reading_->styleByRow.use();
     const std::string name = xmlReader.attributeText("ss:Name");
     const int element = xml::mReadForElements(xmlReader, {"Table", "WorksheetOptions"});
     if (element == -1) fail();
@@ -90,7 +90,9 @@ bool ExcelXmlReader::isOnElement(const char* name) const {
     return current && std::string_view(current) == name;
 }
 
-bool ExcelXmlReader::isStyle(const std::string& id) { return styleById_.find(styles, id) >= 0; }
+bool ExcelXmlReader::isStyle(const std::string& id) {
+    return reading_->styleById.find(styles, id) >= 0;
+}
 
 void ExcelXmlReader::mReadExcelWorksheetDataHeader() {
     unsigned column = 0;
@@ -121,7 +123,7 @@ void ExcelXmlReader::mReadExcelWorksheetData(unsigned columnCount, unsigned rowC
     if (rowCount == 0) return;
     unsigned row = 0;
     int element = 0;
-    while ((element = xml::readToOneOf(xmlReader, rowNames_)) == 0) {
+    while ((element = xml::readToOneOf(xmlReader, reading_->rowNames)) == 0) {
         Attributes attributes(xmlReader);
         unsigned index = 0;  // 1-based
         if (const char* text = attributes.find("Index", "ss"))

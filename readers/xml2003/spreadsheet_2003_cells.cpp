@@ -9,27 +9,27 @@
 #include "dpxlsx/readers/worksheet_size.h"
 #include "dpxlsx/readers/xml/attributes.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
-#include "dpxlsx/readers/xml2003/excel_xml_reader.h"
+#include "dpxlsx/readers/xml2003/reading.h"
 
 // XML Spreadsheet 2003: the cells of a row.
 namespace dp {
 
 namespace {
 
-// Positions in elementNames.
-enum Element { kNone = -1, kCell, kData, kWorksheetOptions, kRow, kPrefixedData, kComment };
-
 unsigned saturatingSum(unsigned left, unsigned right) {
     const unsigned room = std::numeric_limits<unsigned>::max() - left;
     return left + std::min(right, room);
 }
 
-// Positions in attributeNames_.
-enum Attribute { kStyleId, kIndex, kMergeAcross, kType };
-
 bool hasPrefix(const xmlAttr* attribute) {
     const xmlChar* prefix = attribute->ns ? attribute->ns->prefix : nullptr;
     return prefix && std::strcmp(reinterpret_cast<const char*>(prefix), "ss") == 0;
+}
+
+// The attribute's CellAttribute, -1 for another one.
+int attributeIn(const xml::KnownNames& names, const xmlAttr* attribute) {
+    if (!hasPrefix(attribute)) return -1;
+    return names.find(reinterpret_cast<const char*>(attribute->name));
 }
 
 ExternalCellType typeOfData(std::string_view name) {
@@ -45,7 +45,7 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
     unsigned mergeAcross = 0;
     bool cellSeen = false;
     while (true) {
-        switch (xml::readToOneOf(xmlReader, cellNames_)) {
+        switch (xml::readToOneOf(xmlReader, reading_->cellNames)) {
             case kCell:
                 if (std::exchange(cellSeen, true)) column = saturatingSum(column, 1);
                 beginCell(column, mergeAcross);
@@ -71,17 +71,12 @@ bool ExcelXmlReader::mReadExcelWorksheetCell(unsigned& column, unsigned row, uns
     }
 }
 
-// The attribute's Attribute, -1 for another one.
-int ExcelXmlReader::attributeName(const xmlAttr* attribute) const {
-    if (!hasPrefix(attribute)) return -1;
-    return attributeNames_.find(reinterpret_cast<const char*>(attribute->name));
-}
-
 // The type that the current data names.
 ExternalCellType ExcelXmlReader::dataType() {
     Attributes attributes(xmlReader);
     for (const xmlAttr* a = attributes.first(); a; a = a->next)
-        if (attributeName(a) == kType) return typeOfData(attributes.valueOf(a));
+        if (attributeIn(reading_->attributeNames, a) == kType)
+            return typeOfData(attributes.valueOf(a));
     return CELL_EMPTY;
 }
 
@@ -92,7 +87,7 @@ void ExcelXmlReader::beginCell(unsigned& column, unsigned& mergeAcross) {
     mergeAcross = 0;
     bool hasStyle = false;
     for (const xmlAttr* a = attributes.first(); a; a = a->next) {
-        const int name = attributeName(a);
+        const int name = attributeIn(reading_->attributeNames, a);
         if (name == kStyleId) {
             setCurrentStyle(attributes.valueOf(a));
             hasStyle = true;
@@ -118,22 +113,23 @@ void ExcelXmlReader::setCurrentStyle(const char* id) {
 
 void ExcelXmlReader::mReadExcelWorksheetCellData(unsigned column, unsigned row) {
     const bool hasContent = xmlTextReaderIsEmptyElement(xmlReader.textReader) != 1;
-    record_.initialize();
-    record_.cell.type = dataType();
+    ExternalDataRecord& record = reading_->record;
+    record.initialize();
+    record.cell.type = dataType();
     xml::readContent(xmlReader);
     const bool inPreview = !provider->IsPreviewing() ||
                            (row < static_cast<unsigned>(provider->GetPreviewNumberOfRows()) &&
                             column < static_cast<unsigned>(provider->GetPreviewNumberOfColumns()));
     if (!hasContent || !readData(inPreview)) return;
     requireInWorksheet(row, column);
-    record_.row = row;
-    record_.column = column;
-    mAddExternalDataRecord(record_, inPreview);
+    record.row = row;
+    record.column = column;
+    mAddExternalDataRecord(record, inPreview);
 }
 
 // Reads the value of the current data according to its type. False when there is none.
 bool ExcelXmlReader::readData(bool inPreview) {
-    ExternalDataRecordCell& cell = record_.cell;
+    ExternalDataRecordCell& cell = reading_->record.cell;
     if (cell.type == CELL_TEXT) {
         readStringData(cell.textValue);
         return !IsStringAllBlank(cell.textValue);
@@ -156,7 +152,7 @@ void ExcelXmlReader::readStringData(std::string& text) {
         if (type == XML_READER_TYPE_TEXT || type == XML_READER_TYPE_SIGNIFICANT_WHITESPACE) {
             if (const char* value = xmlReader.nodeValue()) text += value;
         } else if (type == XML_READER_TYPE_END_ELEMENT) {
-            const int element = cellNames_.find(xmlReader.nodeName());
+            const int element = reading_->cellNames.find(xmlReader.nodeName());
             if (element == kData || element == kPrefixedData) break;
         }
     } while (xmlReader.readNode());
