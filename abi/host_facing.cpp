@@ -15,6 +15,11 @@
 #include "dpxlsx/provider/xlsx_data_provider.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
+#include "dpxlsx/store/blank_rows.h"
+#include "dpxlsx/store/cell_column.h"
+#include "dpxlsx/store/external_data_record.h"
+#include "dpxlsx/store/read_options.h"
+#include "dpxlsx/store/worksheet_cells.h"
 
 namespace dp {
 
@@ -36,6 +41,11 @@ DPXLSX_API void objects(String*, ReadOnlyCollection<int>*, ReadOnlyStringCollect
 
 DPXLSX_API void formatObjects(NumericVariableFormat*, PercentageVariableFormat*,
                               FractionVariableFormat*, TextVariableFormat*, DateTimeVariableFormat*,
-                              xStyle*, ExternalDataRecord*) {}
+                              xStyle*) {}
+
+// What inline functions compiled into hosts read of the cells.
+DPXLSX_API void cells(ExternalDataRecord*, WorksheetCells*, CellColumn*,
+                      CellColumn::const_iterator*, CellView*, PackedCell*, RareCell*, PooledText*,
+                      BlankRows*, SheetReadOptions*, ColumnReadOptions*) {}
 
 }  // namespace dp

@@ -50,30 +50,20 @@ set(class_headers
     model/string.h
     model/worksheet.h
     provider/excel_data_provider_base.h
-    provider/package.h
     provider/temporary_directory.h
     provider/xlsx_data_provider.h
-    readers/xml/cm_xml_cast.h
     readers/xlsx/excel_xlsx_reader.h
-    readers/xml2003/excel_xml_reader.h
-    readers/xml2003/first_entry_index.h
-    readers/limits.h
-    readers/xlsx/relationships.h
-    readers/xlsx/repeated_parts.h
-    readers/xlsx/shared_string_table.h
-    readers/xlsx/text_budget.h
+    readers/xml/cm_xml_cast.h
     readers/xml/xml_reader.h
+    readers/xml2003/excel_xml_reader.h
     store/blank_rows.h
     store/cell_column.h
-    store/column_loading.h
-    store/conversion.h
+    store/date_time_recognition.h
     store/external_data_record.h
     store/number_recognition.h
+    store/pooled_text.h
     store/read_options.h
-    store/row_layout.h
-    store/short_texts.h
     store/text_cleaning.h
-    store/text_pool.h
     store/worksheet_cells.h)
 foreach(header IN LISTS host_headers class_headers)
     cmake_path(GET header PARENT_PATH folder)

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "dpxlsx/store/text_pool.h"
+
 namespace dp {
 
 namespace {

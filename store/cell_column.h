@@ -11,9 +11,11 @@
 
 #include "dpxlsx/model/host/export.h"
 #include "dpxlsx/store/external_data_record.h"
-#include "dpxlsx/store/text_pool.h"
+#include "dpxlsx/store/pooled_text.h"
 
 namespace dp {
+
+class TextPool;
 
 // A cell that does not fit into a PackedCell: more fields than the one its type names are set, the
 // type has no name, or the format index needs more bits.

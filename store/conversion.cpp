@@ -3,6 +3,7 @@
 #include <cstdio>
 
 #include "dpxlsx/model/string.h"
+#include "dpxlsx/store/date_time_recognition.h"
 #include "dpxlsx/store/number_recognition.h"
 #include "dpxlsx/store/text_cleaning.h"
 
@@ -71,11 +72,6 @@ std::string integerText(std::int32_t value) {
 }
 
 }  // namespace
-
-bool IsDateTime(const IDateTimeVariableFormat* helper, const IString* format, IString* text,
-                double& value) {
-    return helper->ConvertToDatetime(format, text, value);
-}
 
 CellContent::CellContent(const ExternalDataRecordCell& cell)
     : type(cell.type),

@@ -14,11 +14,6 @@
 
 namespace dp {
 
-// True when the helper reads `text` by `format` (null: no pattern known) as a date-time; `value` is
-// then its serial day number.
-DPXLSX_API bool IsDateTime(const IDateTimeVariableFormat* helper, const IString* format,
-                           IString* text, double& value);
-
 // The initial missing value, which marks a missing value until the host sets another.
 inline constexpr double kInitialMissingValue = 1.23456e30;
 

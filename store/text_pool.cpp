@@ -6,12 +6,6 @@
 
 namespace dp {
 
-std::string_view PooledText::longView() const {
-    std::size_t length;
-    std::memcpy(&length, stored_ + 1, sizeof length);
-    return {stored_ + 1 + sizeof length, length};
-}
-
 PooledText TextPool::intern(std::string_view text) {
     std::uint64_t bits = 0;
     begin(text);

@@ -6,38 +6,10 @@
 #include <string_view>
 #include <unordered_map>
 
-#include "dpxlsx/model/host/export.h"
+#include "dpxlsx/store/pooled_text.h"
 #include "dpxlsx/store/short_texts.h"
 
 namespace dp {
-
-// A text kept by a TextPool, one pointer wide; valid as long as that pool. Within one pool two
-// handles are equal exactly when their texts are.
-class DPXLSX_API PooledText {
-  public:
-    PooledText() = default;  // the empty text, of every pool
-
-    // Not terminated by a zero; never a null pointer.
-    std::string_view view() const {
-        if (!stored_) return "";
-        const auto length = static_cast<unsigned char>(*stored_);
-        return length < kLong ? std::string_view(stored_ + 1, length) : longView();
-    }
-
-    friend bool operator==(PooledText, PooledText) = default;
-
-  private:
-    friend class TextPool;
-
-    // In place of the one-byte length of a short text: the length follows as a std::size_t.
-    static constexpr unsigned char kLong = ShortTexts::kLongest + 1;
-
-    explicit PooledText(const char* stored) : stored_(stored) {}
-    std::string_view longView() const;
-
-    // The length in one byte, or kLong and the length as a std::size_t, then the text.
-    const char* stored_ = nullptr;
-};
 
 // Keeps every distinct text once, until the pool is destroyed. Not thread-safe.
 class TextPool {
@@ -65,6 +37,8 @@ class TextPool {
     std::size_t size();
 
   private:
+    static_assert(PooledText::kLong == ShortTexts::kLongest + 1);
+
     PooledText internLong(std::string_view text);
 
     ShortTexts short_;

@@ -5,6 +5,8 @@
 #include <iterator>
 #include <utility>
 
+#include "dpxlsx/store/text_pool.h"
+
 namespace dp {
 
 WorksheetCells::WorksheetCells(std::shared_ptr<TextPool> texts) : texts_(std::move(texts)) {}

@@ -10,7 +10,6 @@
 #include "dpxlsx/model/host/export.h"
 #include "dpxlsx/store/cell_column.h"
 #include "dpxlsx/store/external_data_record.h"
-#include "dpxlsx/store/text_pool.h"
 
 namespace dp {
 

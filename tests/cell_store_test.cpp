@@ -16,6 +16,7 @@
 
 #include "dpxlsx/store/blank_rows.h"
 #include "dpxlsx/store/row_layout.h"
+#include "dpxlsx/store/text_pool.h"
 #include "dpxlsx/store/worksheet_cells.h"
 #include "testkit/allocated_bytes.h"
 
