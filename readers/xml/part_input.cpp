@@ -22,18 +22,30 @@ namespace dp {
 
 namespace {
 
+// A file open for reading; the destructor closes it.
+class File {
+  public:
+    explicit File(const std::string& path)
+        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)) {}
+    ~File() {
+        if (descriptor_ >= 0) ::close(descriptor_);
+    }
+    File(const File&) = delete;
+    File& operator=(const File&) = delete;
+
+    // Negative when the file could not be opened.
+    int descriptor() const { return descriptor_; }
+
+  private:
+    int descriptor_;
+};
+
 // The file behind a reader, and how far libxml2 has come in it.
 class PartInput {
   public:
-    explicit PartInput(const std::string& path)
-        : descriptor_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)), text_(descriptor_) {}
-    ~PartInput() {
-        if (isOpen()) ::close(descriptor_);
-    }
-    PartInput(const PartInput&) = delete;
-    PartInput& operator=(const PartInput&) = delete;
+    explicit PartInput(const std::string& path) : file_(path), text_(file_.descriptor()) {}
 
-    bool isOpen() const { return descriptor_ >= 0; }
+    bool isOpen() const { return file_.descriptor() >= 0; }
     bool isDecoded() const { return text_.isDecoded(); }
     void watch(xmlTextReaderPtr reader) { reader_ = reader; }
 
@@ -91,9 +103,9 @@ class PartInput {
     // Reads the document from its beginning again, to count exactly. False when that cannot be
     // done.
     bool countExactly() {
-        const off_t position = ::lseek(descriptor_, 0, SEEK_CUR);
-        if (position < 0 || ::lseek(descriptor_, 0, SEEK_SET) < 0) return false;
-        PartText again(descriptor_);
+        const off_t position = ::lseek(file_.descriptor(), 0, SEEK_CUR);
+        if (position < 0 || ::lseek(file_.descriptor(), 0, SEEK_SET) < 0) return false;
+        PartText again(file_.descriptor());
         exactMarks_.emplace();
         marks_ = 0;
         for (std::int64_t at = 0; at < supplied_;) {
@@ -105,13 +117,13 @@ class PartInput {
             marks_ += exactMarks_->countIn(supply.substr(before.size()));
             at += static_cast<std::int64_t>(supply.size());
         }
-        return ::lseek(descriptor_, position, SEEK_SET) >= 0;
+        return ::lseek(file_.descriptor(), position, SEEK_SET) >= 0;
     }
     static std::size_t sizeOf(std::int64_t begin, std::int64_t end) {
         return begin < end ? static_cast<std::size_t>(end - begin) : 0;
     }
 
-    int descriptor_;
+    const File file_;
     std::uint32_t stepsBefore_ = 0;
     std::int64_t runStart_ = 0;
     PartText text_;
