@@ -156,9 +156,10 @@ void cellToText(const CellContent& cell, const ConversionSettings& settings, For
     if (settings.cleanTextValues) CleanText(text);
 }
 
-void cutToBytes(std::string& text, std::int32_t maxLength) {
+void cutToBytes(std::string& text, std::int32_t maxLength, TextCut cut) {
     if (maxLength < 0 || text.size() <= static_cast<std::size_t>(maxLength)) return;
-    text.resize(static_cast<std::size_t>(maxLength));
+    const auto bytes = static_cast<std::size_t>(maxLength);
+    text.resize(cut == TextCut::AtCharacters ? wholeCharacters(text, bytes) : bytes);
     // Otherwise a column of shortened texts would occupy the memory of the long ones.
     constexpr std::size_t kWorthReturning = 256;  // bytes
     if (text.capacity() > text.size() + kWorthReturning) text.shrink_to_fit();

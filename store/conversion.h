@@ -17,6 +17,9 @@ namespace dp {
 // The initial missing value, which marks a missing value until the host sets another.
 inline constexpr double kInitialMissingValue = 1.23456e30;
 
+// Where a text that is too long ends.
+enum class TextCut : std::uint8_t { AtBytes, AtCharacters };
+
 // The host's settings that decide how cells become values. Texts are borrowed.
 struct ConversionSettings {
     double missingValue;
@@ -34,6 +37,7 @@ struct ConversionSettings {
     bool cleanTextValues;
     bool convertDateTimeToText;
     IDateTimeVariableFormat* dateTimeHelper;  // null when the host gave none
+    TextCut textCut = TextCut::AtBytes;       // where texts that are too long are cut
 };
 
 // A cell to convert, wherever it is kept. The text is borrowed.
@@ -101,7 +105,8 @@ void cellToText(const CellContent& cell, const ConversionSettings& settings, For
 std::string numericCellToText(const CellContent& cell, const ConversionSettings& settings,
                               FormatCache& formats);
 
-// Keeps the first `maxLength` bytes; a negative length sets no limit.
-void cutToBytes(std::string& text, std::int32_t maxLength);
+// Keeps the first `maxLength` bytes, or as many of them as make up whole characters; a negative
+// length sets no limit.
+void cutToBytes(std::string& text, std::int32_t maxLength, TextCut cut = TextCut::AtBytes);
 
 }  // namespace dp

@@ -89,6 +89,22 @@ void truncateToCharLength(std::string& text, unsigned short maxChars) {
     text.erase(static_cast<std::size_t>(boundary));
 }
 
+std::size_t wholeCharacters(std::string_view text, std::size_t bytes) {
+    std::size_t codePoints = bytes;
+    while (codePoints > 0 && (static_cast<unsigned char>(text[codePoints]) & 0xC0U) == 0x80U)
+        --codePoints;
+    const auto& iterator = breakIterator();
+    if (!iterator) return codePoints;
+    UErrorCode status = U_ZERO_ERROR;
+    const std::unique_ptr<UText, CloseText> walked(
+        utext_openUTF8(nullptr, text.data(), static_cast<std::int64_t>(text.size()), &status));
+    iterator->setText(walked.get(), status);
+    if (U_FAILURE(status)) return codePoints;
+    const auto end = static_cast<std::int32_t>(codePoints);
+    const std::int32_t boundary = iterator->isBoundary(end) ? end : iterator->preceding(end);
+    return boundary > 0 ? static_cast<std::size_t>(boundary) : codePoints;
+}
+
 void cleanVariableName(std::string& name, unsigned short maxChars) {
     truncateToCharLength(name, maxChars);
     std::replace(name.begin(), name.end(), '\n', ' ');

@@ -37,7 +37,7 @@ class TextLoad {
             cellToText(CellContent(cell), settings_.conversion, formats_, text);
         if (isAllSpaces(text)) text.clear();
         if (text == settings_.missingTextFrom) text = settings_.missingTextTo;
-        cutToBytes(text, settings_.conversion.maxTextLength);
+        cutToBytes(text, settings_.conversion.maxTextLength, settings_.conversion.textCut);
         if (!text.empty()) --column_.missingCount;
         format_.characterCount =
             std::max(format_.characterCount, static_cast<std::int32_t>(text.size()));
