@@ -21,6 +21,13 @@ ExcelXLSXReader::ExcelXLSXReader(const std::string& dir, bool sharedStringsPrese
     opened_->dir = dir;
 }
 
+ExcelXLSXReader::ExcelXLSXReader(const std::string& workbookPart, std::string shortDate,
+                                 double missing, IExcelDataProvider* receiver,
+                                 IDateTimeVariableFormat* helper)
+    : ExcelXmlReader(workbookPart, std::move(shortDate), missing, receiver, helper),
+      hasSharedStrings(false),
+      opened_(std::make_unique<OpenedPackage>()) {}
+
 ExcelXLSXReader::~ExcelXLSXReader() = default;
 
 void ExcelXLSXReader::mReadExcelWorkbook() {

@@ -40,6 +40,12 @@ class DPXLSX_API ExcelXLSXReader : public ExcelXmlReader {
     // Decodes the escapes by which a package writes control characters, in place.
     static void mParseCharString(std::string& text);
 
+  protected:
+    // For readers that find the parts themselves; `workbookPart` is the path of that part.
+    ExcelXLSXReader(const std::string& workbookPart, std::string shortDateFormat,
+                    double missingValue, IExcelDataProvider* provider,
+                    IDateTimeVariableFormat* dateTimeHelper);
+
   private:
     friend class CellAssembler;
     struct OpenedPackage;

@@ -1,0 +1,89 @@
+#include "dpxlsx/readers/standard/number_formats.h"
+
+#include <algorithm>
+
+#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/standard_formats.h"
+#include "dpxlsx/readers/limits.h"
+#include "dpxlsx/readers/standard/cell_values.h"
+#include "dpxlsx/readers/standard/element_walker.h"
+
+namespace dp::standard {
+
+namespace {
+
+// The built-in formats in which a date, a time or both is shown that has no such format itself.
+constexpr int kDate = 14;
+constexpr int kTime = 21;
+constexpr int kDateTime = 22;
+
+bool showsElapsedTime(const NumberFormatCode& code) {
+    using Kind = FormatToken::Kind;
+    const FormatSection& section = code.sections.front();
+    return std::any_of(section.begin(), section.end(), [](const FormatToken& token) {
+        return token.kind == Kind::ElapsedHours || token.kind == Kind::ElapsedMinutes ||
+               token.kind == Kind::ElapsedSeconds;
+    });
+}
+
+std::optional<int> idOf(ElementWalker& walker) {
+    return parseIndex(walker.attribute("numFmtId").value_or(""));
+}
+
+}  // namespace
+
+void NumberFormats::read(const std::string& path) {
+    *this = {};
+    std::vector<int> ids;  // of the cell formats, which may come before the codes
+    ElementWalker walker(path);
+    walker.children([&](std::string_view list) {
+        walker.children([&](std::string_view entry) {
+            const std::optional<int> id = idOf(walker);
+            if (list == "cellXfs" && entry == "xf") ids.push_back(id.value_or(0));
+            if (list != "numFmts" || entry != "numFmt" || !id) return;
+            std::string code = walker.attribute("formatCode").value_or("");
+            if (!code.empty() && code.size() <= kFormatCodeSize) codeById_[*id] = std::move(code);
+        });
+    });
+    walker.finish();
+    for (const int id : ids) ofCells_.push_back(indexOf(id));
+}
+
+int NumberFormats::ofCell(int style) const {
+    const auto position = static_cast<std::size_t>(style);
+    return style >= 0 && position < ofCells_.size() ? ofCells_[position] : -1;
+}
+
+int NumberFormats::ofDateTime(EXCEL_FORMAT_TYPE type) {
+    return indexOf(type == EXCEL_FORMAT_DATE   ? kDate
+                   : type == EXCEL_FORMAT_TIME ? kTime
+                                               : kDateTime);
+}
+
+const NumberFormats::Format* NumberFormats::at(int index) const {
+    const auto position = static_cast<std::size_t>(index);
+    return index >= 0 && position < formats_.size() ? &formats_[position] : nullptr;
+}
+
+std::unique_ptr<IVariableFormat> NumberFormats::create(int index) const {
+    if (const Format* format = at(index)) return createVariableFormat(format->code);
+    auto automatic = std::make_unique<NumericVariableFormat>();
+    automatic->autoFormat = true;
+    return automatic;
+}
+
+int NumberFormats::indexOf(int id) {
+    const auto own = codeById_.find(id);
+    const std::string_view text = own == codeById_.end() ? builtInFormatCode(id) : own->second;
+    if (text == "General") return -1;  // as without a format
+    const auto [place, isNew] = indexById_.try_emplace(id, static_cast<int>(formats_.size()));
+    if (isNew) {
+        NumberFormatCode code = parseNumberFormat(text);
+        const EXCEL_FORMAT_TYPE type = formatType(code);
+        const bool elapsed = showsElapsedTime(code);
+        formats_.push_back({std::move(code), type, elapsed});
+    }
+    return place->second;
+}
+
+}  // namespace dp::standard
