@@ -63,6 +63,7 @@ set(class_headers
     store/number_recognition.h
     store/pooled_text.h
     store/read_options.h
+    store/reading_rules.h
     store/text_cleaning.h
     store/worksheet_cells.h)
 foreach(header IN LISTS host_headers class_headers)

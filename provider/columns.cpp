@@ -173,7 +173,10 @@ std::string ExcelDataProviderBase::variableNameInSheet(unsigned worksheetKey,
 
 FormatType ExcelDataProviderBase::firstDataType(unsigned worksheetKey, const CellColumn& cells,
                                                 ColumnType requested) const {
-    const auto cell = cells.lower_bound(plainOptions(worksheetKey).firstDataRow);
+    auto cell = cells.lower_bound(plainOptions(worksheetKey).firstDataRow);
+    // By the standard there are cells without a value, which say nothing of the kind.
+    if (isByStandard())
+        while (cell != cells.end() && cell->second.type() == CELL_EMPTY) ++cell;
     if (cell == cells.end())
         return requested == ColumnType::Text ? FormatType::Text : FormatType::Numeric;
     if (cell->second.type() == CELL_TEXT) return FormatType::Text;
@@ -227,7 +230,8 @@ ConversionSettings ExcelDataProviderBase::conversionSettings() const {
             .alphaMissingNumericFrom = _alphaMissingNumericFrom,
             .cleanTextValues = _cleanTextValues,
             .convertDateTimeToText = _convertDateTimeToText,
-            .dateTimeHelper = _dateTimeHelper.get()};
+            .dateTimeHelper = _dateTimeHelper.get(),
+            .textCut = isByStandard() ? TextCut::AtCharacters : TextCut::AtBytes};
 }
 
 double ExcelDataProviderBase::ConvertCellToReal(const ExternalDataRecordCell& cell, bool asDateTime,
@@ -242,8 +246,9 @@ std::string ExcelDataProviderBase::ConvertCellToString(const ExternalDataRecordC
     const ProviderFormats source(*this);
     FormatCache formats(source);
     std::string text;
-    cellToText(CellContent(cell), conversionSettings(), formats, text);
-    if (truncate) cutToBytes(text, _maxTextLength);
+    const ConversionSettings settings = conversionSettings();
+    cellToText(CellContent(cell), settings, formats, text);
+    if (truncate) cutToBytes(text, settings.maxTextLength, settings.textCut);
     return text;
 }
 

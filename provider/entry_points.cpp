@@ -38,4 +38,14 @@ long CreateDataProvider(const char* typeName, IDataProvider** provider) {
     return 0;
 }
 
+long SetReadingRules(IDataProvider* provider, int rules) {
+    constexpr long kUnsupported = -50;
+    auto* const own = dynamic_cast<ExcelDataProviderBase*>(provider);
+    const bool known = rules == static_cast<int>(ReadingRules::Always) ||
+                       rules == static_cast<int>(ReadingRules::Standard);
+    if (!own || !known) return kUnsupported;
+    own->setReadingRules(static_cast<ReadingRules>(rules));
+    return 0;
+}
+
 }  // namespace dp

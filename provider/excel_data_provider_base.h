@@ -15,6 +15,7 @@
 #include "dpxlsx/store/blank_rows.h"
 #include "dpxlsx/store/external_data_record.h"
 #include "dpxlsx/store/read_options.h"
+#include "dpxlsx/store/reading_rules.h"
 #include "dpxlsx/store/worksheet_cells.h"
 
 namespace dp {
@@ -243,6 +244,9 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
                                 unsigned columnIndex, unsigned position, const std::string& name,
                                 int key) const;
 
+    // Sets the rules for the next open or listing and those after it.
+    void setReadingRules(ReadingRules rules) { _readingRules = rules; }
+
     // --- Worksheet registry; positions are 0-based ---
     // 0 for a position that names no worksheet.
     int GetWorksheetPrimeKey(unsigned position) const;
@@ -317,9 +321,15 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     std::uint32_t _maxVariableNameLength = kNotSet;
     long _error = 0;
     EVariableNameRowSetting _defaultVariableNameRowSetting{kNotSet};
+    // The next two are declared here because they fit into the padding between the setting and the
+    // helper, so no field that hosts know is moved.
+    ReadingRules _readingRules = ReadingRules::Always;  // for the next open or listing
+    ReadingRules _rulesOfCells = ReadingRules::Always;  // those of the last open
     std::shared_ptr<IDateTimeVariableFormat> _dateTimeHelper;
 
   private:
+    // Whether the stored cells were read by the standard.
+    bool isByStandard() const { return _rulesOfCells == ReadingRules::Standard; }
     ColumnReadOptions& columnOptions(unsigned key, unsigned column);
     const ColumnOptions& columnOptionsOf(unsigned key) const;
     // The options of a worksheet, made on demand: with the host's default setting, or plain.

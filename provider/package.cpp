@@ -4,6 +4,7 @@
 
 #include <boost/filesystem.hpp>
 
+#include "dpxlsx/readers/standard/standard_reader.h"
 #include "dpxlsx/readers/xml/silence.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 
@@ -28,6 +29,12 @@ bool isReadable(const std::string& workbookPart) {
     }
 }
 
+bool hasUsualParts(const std::string& directory) {
+    const std::string workbook = directory + "/xl/workbook.xml";
+    return boost::filesystem::exists(directory + "/xl/styles.xml") &&
+           boost::filesystem::exists(workbook) && isReadable(workbook);
+}
+
 }  // namespace
 
 long resultCode(PackageStatus status) {
@@ -50,11 +57,10 @@ long resultCode(PackageStatus status) {
     return -1;
 }
 
-PackageStatus checkWorkbook(const std::string& directory) {
-    const std::string workbook = directory + "/xl/workbook.xml";
-    const bool complete = boost::filesystem::exists(directory + "/xl/styles.xml") &&
-                          boost::filesystem::exists(workbook) && isReadable(workbook);
-    return complete ? PackageStatus::Success : PackageStatus::NotAWorkbook;
+PackageStatus checkWorkbook(const std::string& directory, ReadingRules rules) {
+    const bool isWorkbook = rules == ReadingRules::Standard ? standard::isWorkbook(directory)
+                                                            : hasUsualParts(directory);
+    return isWorkbook ? PackageStatus::Success : PackageStatus::NotAWorkbook;
 }
 
 }  // namespace dp

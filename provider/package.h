@@ -2,6 +2,8 @@
 
 #include <string>
 
+#include "dpxlsx/store/reading_rules.h"
+
 namespace dp {
 
 // How a step of opening ended.
@@ -19,8 +21,8 @@ enum class PackageStatus : int {
 // The result code that the host gets.
 long resultCode(PackageStatus status);
 
-// Whether the unpacked package in `directory` is a workbook. Throws the file system's error when
-// its parts cannot be looked up.
-PackageStatus checkWorkbook(const std::string& directory);
+// Whether the unpacked package in `directory` is a workbook by these rules. Throws the file
+// system's error when its parts cannot be looked up.
+PackageStatus checkWorkbook(const std::string& directory, ReadingRules rules);
 
 }  // namespace dp

@@ -13,12 +13,37 @@
 #include "dpxlsx/provider/package.h"
 #include "dpxlsx/provider/temporary_directory.h"
 #include "dpxlsx/provider/unpacking.h"
+#include "dpxlsx/readers/standard/standard_reader.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "dpxlsx/readers/xml/file_copy.h"
 
 namespace dp {
 
 namespace fs = boost::filesystem;
+
+namespace {
+
+std::shared_ptr<ExcelXLSXReader> makeReader(const std::string& directory, ReadingRules rules,
+                                            ExcelDataProviderBase& provider) {
+    const std::string shortDate = GetShortDateMask();
+    const double missing = ExcelDataProviderBase::GetMissingValue();
+    IDateTimeVariableFormat* const helper = provider.GetDateTimeVariableFormatHelper();
+    if (rules == ReadingRules::Standard)
+        return std::make_shared<StandardReader>(directory, shortDate, missing, &provider, helper);
+    const bool hasSharedStrings = fs::exists(directory + "/xl/sharedStrings.xml");
+    return std::make_shared<ExcelXLSXReader>(directory, hasSharedStrings, shortDate, missing,
+                                             &provider, helper);
+}
+
+void listWorksheets(const std::string& directory, ReadingRules rules,
+                    std::vector<std::string>& names) {
+    if (rules == ReadingRules::Standard)
+        standard::listWorksheets(directory, names);
+    else
+        excel_xlsx::GetWorksheets(directory, names);
+}
+
+}  // namespace
 
 xlsxDataProvider::xlsxDataProvider() = default;
 
@@ -49,7 +74,7 @@ PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     }
     const PackageStatus status = unpackArchive(copy.string(), _tempDirectory);
     if (status == PackageStatus::TooLarge) removeDirectoryAndContents(_tempDirectory);
-    return status == PackageStatus::Success ? checkWorkbook(_tempDirectory) : status;
+    return status == PackageStatus::Success ? checkWorkbook(_tempDirectory, _readingRules) : status;
 }
 
 void xlsxDataProvider::removeUnpackedFile() try {
@@ -63,10 +88,8 @@ long xlsxDataProvider::OpenFile(const char* fileName, FileAccess access) {
     if (access != FileAccess::Read) return -1;
     const PackageStatus status = unzipFile(fileName);
     if (status != PackageStatus::Success) return resultCode(status);
-    const bool hasSharedStrings = fs::exists(_tempDirectory + "/xl/sharedStrings.xml");
-    _reader = std::make_shared<ExcelXLSXReader>(_tempDirectory, hasSharedStrings,
-                                                GetShortDateMask(), GetMissingValue(), this,
-                                                GetDateTimeVariableFormatHelper());
+    _rulesOfCells = _readingRules;
+    _reader = makeReader(_tempDirectory, _readingRules, *this);
     _reader->startAtWorksheet(static_cast<int>(_worksheetNames.size()));
     _reader->mReadExcelWorkbook();
     return resultCode(status);
@@ -76,7 +99,7 @@ long xlsxDataProvider::GetWorksheets(const char* fileName, std::vector<std::stri
     PackageStatus status = unzipFile(fileName);
     if (status != PackageStatus::Success) return resultCode(status);
     try {
-        excel_xlsx::GetWorksheets(_tempDirectory, names);
+        listWorksheets(_tempDirectory, _readingRules, names);
     } catch (const CmXmlException&) {
         status = PackageStatus::NotAWorkbook;
     }

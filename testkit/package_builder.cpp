@@ -25,9 +25,7 @@ PackageBuilder PackageBuilder::of(const std::vector<std::string>& sheets) {
 
 const PackageBuilder& PackageBuilder::small() {
     static const PackageBuilder package{{
-        {"xl/workbook.xml",
-         "<workbook xmlns:r='r'><bookViews/><sheets><sheet name='A' r:id='r1'/>"
-         "<sheet name='B' r:id='r2'/></sheets></workbook>"},
+        {"xl/workbook.xml", workbook("<sheet name='A' r:id='r1'/><sheet name='B' r:id='r2'/>")},
         {"xl/_rels/workbook.xml.rels",
          "<Relationships><Relationship Id='r1' Type='x/worksheet' Target='worksheets/sheet1.xml'/>"
          "<Relationship Id='r2' Type='x/worksheet' Target='/xl/worksheets/sheet2.xml'/>"
@@ -57,7 +55,10 @@ std::string PackageBuilder::worksheet(const std::string& data) {
     return "<worksheet><sheetData>" + data + "</sheetData></worksheet>";
 }
 std::string PackageBuilder::workbook(const std::string& sheets) {
-    return "<workbook xmlns:r='r'><bookViews/><sheets>" + sheets + "</sheets></workbook>";
+    return "<workbook "
+           "xmlns:r='http://schemas.openxmlformats.org/officeDocument/2006/relationships'>"
+           "<bookViews/><sheets>" +
+           sheets + "</sheets></workbook>";
 }
 std::string PackageBuilder::relationships(const std::string& list) {
     return "<Relationships>" + list + "</Relationships>";

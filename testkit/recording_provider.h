@@ -45,6 +45,7 @@ class RecordingProvider : public dp::xlsxDataProvider {
   private:
     // Numbers have as many digits as tell them from all others.
     static std::string contentOf(const dp::ExternalDataRecordCell& cell) {
+        if (cell.type == dp::CELL_EMPTY) return "missing";
         std::string text = cell.type == dp::CELL_NUMBER     ? ""
                            : cell.type == dp::CELL_DATETIME ? "d"
                            : cell.type == dp::CELL_TEXT     ? "'" + cell.textValue + "'"
