@@ -396,6 +396,13 @@ class ToolTest(unittest.TestCase):
             column = self.columns("--library", library, "--type", "K=text", *options)["Passed"]
             self.assertEqual(column["values"][:2], wanted)
 
+    def test_books_are_read_by_the_standard_on_demand(self):
+        book = self.book(prefixed(WORKBOOK, LINKS, SHEET))
+        self.run_tool(book, expected=13)
+        self.assertIn("My Data", self.run_tool(book, "--list", "--standard"))
+        self.assertEqual(self.run_tool(book, "--csv", "--standard"),
+                         self.run_tool(self.book(PARTS), "--csv"))
+
     def test_worksheet_names_are_cleaned_on_demand(self):
         book = self.book(changed(WORKBOOK, "My Data", "a?b:c"))
         for options, wanted in (([], "a?b:c"), (["--clean-sheet-names"], "a_b_c")):

@@ -52,6 +52,7 @@ Library::Library(const std::string& path) {
     if (handle == nullptr) throw loadFailure(library);
     create_ = find<decltype(create_)>(handle, "CreateDataProvider", library);
     type_ = find<decltype(type_)>(handle, "GetDataProviderFiletype", library);
+    rules_ = reinterpret_cast<decltype(rules_)>(dlsym(handle, "SetReadingRules"));
 }
 
 std::string Library::fileType(const std::string& book) const { return type_(book.c_str()); }
@@ -65,6 +66,14 @@ IDataProvider* Library::createProvider(const std::string& type) const {
                                            "); install a library of this version");
     }
     return provider;
+}
+
+void Library::readByStandard(IDataProvider& provider) const {
+    constexpr int kByStandard = 1;
+    if (rules_ != nullptr && rules_(&provider, kByStandard) == 0) return;
+    throw Failure(kLibraryFailure,
+                  "the import library cannot read by the standard; install a library of this "
+                  "version, or leave out --standard");
 }
 
 }  // namespace dp::tool

@@ -20,10 +20,13 @@ class Library {
     std::string fileType(const std::string& book) const;
     // A provider with a reference count of 0. Throws a Failure when there is none.
     IDataProvider* createProvider(const std::string& type) const;
+    // Makes the provider read by the standard. Throws a Failure when the library cannot.
+    void readByStandard(IDataProvider& provider) const;
 
   private:
     decltype(&CreateDataProvider) create_;
     decltype(&GetDataProviderFiletype) type_;
+    decltype(&SetReadingRules) rules_;  // null when the library is too old for it
 };
 
 }  // namespace dp::tool

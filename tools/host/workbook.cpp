@@ -31,7 +31,9 @@ std::vector<int> columnKeys(IVariableFinder& finder, int sheet) {
 Workbook::Workbook(const Library& library, const Options& options)
     : options_(options),
       provider_(library.createProvider(providerType(library, options.book))),
-      losses_(options) {}
+      losses_(options) {
+    if (options.standard) library.readByStandard(*provider_);
+}
 
 Workbook::~Workbook() { provider_->CloseFile(); }
 

@@ -11,8 +11,7 @@ namespace dp::tool {
 namespace {
 
 constexpr const char* kIntroduction = R"(Usage: dpxlsx [OPTIONS] BOOK.xlsx
-Imports an Excel workbook as a statistics host does, and shows the columns and
-first rows of each worksheet.
+Imports an Excel workbook as a host does and shows columns and first rows.
 )";
 
 constexpr const char* kExitCodes =

@@ -60,7 +60,8 @@ struct Options {
     std::vector<std::string> sheets;  // names or keys; empty for all
     std::optional<size_t> head;       // rows
     bool asShown = false;
-    bool explain = false;  // instead of an import; the view is Tables or Json
+    bool standard = false;  // read by the standard
+    bool explain = false;   // instead of an import; the view is Tables or Json
     ReadSettings settings;
 };
 
