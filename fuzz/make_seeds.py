@@ -92,6 +92,7 @@ def seeds_of_cases():
         sheet = row[1].replace(b">F<", b"><numFmt numFmtId='164' formatCode='h:mm'/><")
         sheet = sheet.replace(b">X<", b"><xf numFmtId='14'/><xf numFmtId='164'/><")
         yield "part", f"styles-{i}", part(PARTS[3], b"<styleSheet>" + sheet + b"</styleSheet>")
+    yield from seeds_of_the_standard()
     table = (b"<Workbook xmlns:ss='urn:s'><Styles><Style ss:ID='f'><NumberFormat "
              b"ss:Format='0.00'/></Style><Style ss:ID='d'><NumberFormat ss:Format='Short Date'/>"
              b"</Style></Styles><Worksheet ss:Name='S'><Table ss:ExpandedColumnCount='9' "
@@ -122,6 +123,19 @@ def seeds_of_cases():
             stem = f"{encoding.decode()}-{pathlib.PurePath(name).stem}"
             yield "part", stem, part(name, head + broken)
         yield "spreadsheet_2003", encoding.decode(), head + broken
+
+
+def seeds_of_the_standard():
+    """The parts of the cases that are read by either rules."""
+    schemas = b"http://schemas.openxmlformats.org/"
+    for i, row in enumerate(cases("standard.txt")):
+        yield "part", f"standard-{i}", part(PARTS[4], worksheet(row[1]))
+        for name, content in re.findall(rb"@([^:]+):(.*?)(?= @|$)", row[2].strip(), re.S):
+            for mark, space in ((b"{m}", b"spreadsheetml/2006/main"), (b"{p}", b"package/2006/relationships"),
+                                (b"{r}", b"officeDocument/2006/relationships")):
+                content = content.replace(mark, schemas + space)
+            if name.decode() in PARTS:
+                yield "part", f"standard-{i}-{pathlib.PurePath(name.decode()).stem}", part(name.decode(), content)
 
 
 def seeds_of_packages():

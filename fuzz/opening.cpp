@@ -19,12 +19,11 @@ bool isResultOfOpening(long result) {
     return std::find(std::begin(kResults), std::end(kResults), result) != std::end(kResults);
 }
 
-}  // namespace
-
-long openAsHost(const std::string& path) {
+long open(const std::string& path, int rules) {
     dp::IDataProvider* created = nullptr;
     require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
     const dp::Reference provider(created);
+    require(dp::SetReadingRules(created, rules) == 0, "no rules");
     provider->SetDateTimeVariableFormatHelper(new Helper);
     std::vector<std::string> names;
     require(isResultOfOpening(provider->GetWorksheets(path.c_str(), names)), "another result");
@@ -40,6 +39,15 @@ long openAsHost(const std::string& path) {
     provider->CloseFile();
     takeEverything(*provider);
     return result;
+}
+
+}  // namespace
+
+long openAsHost(const std::string& path) {
+    constexpr int kAlways = 0;
+    constexpr int kByStandard = 1;
+    open(path, kByStandard);
+    return open(path, kAlways);
 }
 
 }  // namespace fuzz

@@ -5,8 +5,9 @@
 namespace fuzz {
 
 // Lists and opens the workbook at `path` through the entry points, loads everything in it, closes
-// it and loads everything again. Whatever the bytes are, this must end with a result code or the
-// readers' exception; returns the code of either.
+// it and loads everything again; by the standard first, and then by the rules of always. Whatever
+// the bytes are, this must end with a result code or the readers' exception; returns the code of
+// the latter reading.
 long openAsHost(const std::string& path);
 
 }  // namespace fuzz

@@ -10,6 +10,7 @@
 #include "dpxlsx/formats/format_codes.h"
 #include "dpxlsx/model/host/reference.h"
 #include "dpxlsx/provider/package.h"
+#include "dpxlsx/readers/standard/standard_reader.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "fuzz/checks.h"
 #include "fuzz/host.h"
@@ -19,6 +20,8 @@
 #include "testkit/workspace.h"
 
 namespace {
+
+using dp::ReadingRules;
 
 constexpr const char* kParts[] = {"xl/workbook.xml", "xl/_rels/workbook.xml.rels",
                                   "xl/sharedStrings.xml", "xl/styles.xml",
@@ -41,22 +44,38 @@ class Package {
     std::string different_;
 };
 
-void readPackage(const std::string& directory) {
-    dp::checkWorkbook(directory);
+std::unique_ptr<dp::ExcelXLSXReader> readerOf(const std::string& directory, ReadingRules rules,
+                                              testkit::ReadingProvider& provider) {
+    const double missing = provider.GetMissingVxlValue();
+    dp::IDateTimeVariableFormat* const helper = provider.GetDateTimeVariableFormatHelper();
+    if (rules == ReadingRules::Standard)
+        return std::make_unique<dp::StandardReader>(directory, dp::GetShortDateMask(), missing,
+                                                    &provider, helper);
+    return std::make_unique<dp::ExcelXLSXReader>(directory, true, dp::GetShortDateMask(), missing,
+                                                 &provider, helper);
+}
+
+void list(const std::string& directory, ReadingRules rules) {
+    std::vector<std::string> names;
+    if (rules == ReadingRules::Standard)
+        dp::standard::listWorksheets(directory, names);
+    else
+        dp::excel_xlsx::GetWorksheets(directory, names);
+}
+
+void readPackage(const std::string& directory, ReadingRules rules) {
+    dp::checkWorkbook(directory, rules);
     const dp::Reference provider(new testkit::ReadingProvider);
     provider->SetDateTimeVariableFormatHelper(new fuzz::Helper);
     try {
-        provider->read(std::make_unique<dp::ExcelXLSXReader>(
-            directory, true, dp::GetShortDateMask(), provider->GetMissingVxlValue(), provider.get(),
-            provider->GetDateTimeVariableFormatHelper()));
+        provider->read(readerOf(directory, rules, *provider));
     } catch (const CmXmlException& e) {
         fuzz::require(e.code() == kXmlError, "another code");
     }
     fuzz::takeEverything(*provider);
     provider->CloseFile();
-    std::vector<std::string> names;
     try {
-        dp::excel_xlsx::GetWorksheets(directory, names);
+        list(directory, rules);
     } catch (const CmXmlException& e) {
         fuzz::require(e.code() == kXmlError, "another code");
     }
@@ -69,6 +88,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     fuzz::Input input(data, size);
     const char* part = kParts[input.byte() % std::size(kParts)];
     package.set(part, input.rest());
-    fuzz::leavingNothing([] { readPackage(package.directory()); });
+    for (const ReadingRules rules : {ReadingRules::Always, ReadingRules::Standard})
+        fuzz::leavingNothing([rules] { readPackage(package.directory(), rules); });
     return 0;
 }

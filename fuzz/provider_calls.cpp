@@ -65,7 +65,7 @@ class Host {
 
     // --- what the provider holds ---
     void change(unsigned call) {
-        switch (call % 12) {
+        switch (call % 13) {
             case 0:
             case 1:
             case 2:
@@ -86,6 +86,8 @@ class Host {
                 return;
             case 10:
                 return provider_->ClearWorksheets();
+            case 12:
+                return setRules();
             default:
                 return list();
         }
@@ -95,6 +97,11 @@ class Host {
         const char* path = input_.byte() % 8 == 0 ? "nowhere.xlsx" : bookPath().c_str();
         const long result = provider_->OpenFile(path, access);
         require(result == 0 || result == -1 || result == -17, "another result of opening");
+    }
+    void setRules() {
+        const int rules = static_cast<int>(input_.byte() % 4) - 1;
+        const bool exist = rules == 0 || rules == 1;
+        require(dp::SetReadingRules(provider_.get(), rules) == (exist ? 0 : -50), "other rules");
     }
     void list() {
         std::vector<std::string> names;
