@@ -1,6 +1,5 @@
 #include "dpxlsx/formats/number_display.h"
 
-#include <algorithm>
 #include <cstddef>
 
 #include "dpxlsx/formats/numeric_variable_format.h"

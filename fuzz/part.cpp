@@ -88,7 +88,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     fuzz::Input input(data, size);
     const char* part = kParts[input.byte() % std::size(kParts)];
     package.set(part, input.rest());
-    for (const ReadingRules rules : {ReadingRules::Always, ReadingRules::Standard})
+    for (const ReadingRules rules : {ReadingRules::Default, ReadingRules::Standard})
         fuzz::leavingNothing([rules] { readPackage(package.directory(), rules); });
     return 0;
 }

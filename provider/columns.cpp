@@ -4,7 +4,6 @@
 #include <iterator>
 #include <memory>
 #include <numeric>
-#include <utility>
 
 #include "dpxlsx/provider/excel_data_provider_base.h"
 #include "dpxlsx/store/column_loading.h"

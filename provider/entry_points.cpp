@@ -41,7 +41,7 @@ long CreateDataProvider(const char* typeName, IDataProvider** provider) {
 long SetReadingRules(IDataProvider* provider, int rules) {
     constexpr long kUnsupported = -50;
     auto* const own = dynamic_cast<ExcelDataProviderBase*>(provider);
-    const bool known = rules == static_cast<int>(ReadingRules::Always) ||
+    const bool known = rules == static_cast<int>(ReadingRules::Default) ||
                        rules == static_cast<int>(ReadingRules::Standard);
     if (!own || !known) return kUnsupported;
     own->setReadingRules(static_cast<ReadingRules>(rules));

@@ -323,8 +323,8 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     EVariableNameRowSetting _defaultVariableNameRowSetting{kNotSet};
     // The next two are declared here because they fit into the padding between the setting and the
     // helper, so no field that hosts know is moved.
-    ReadingRules _readingRules = ReadingRules::Always;  // for the next open or listing
-    ReadingRules _rulesOfCells = ReadingRules::Always;  // those of the last open
+    ReadingRules _readingRules = ReadingRules::Default;  // for the next open or listing
+    ReadingRules _rulesOfCells = ReadingRules::Default;  // those of the last open
     std::shared_ptr<IDateTimeVariableFormat> _dateTimeHelper;
 
   private:

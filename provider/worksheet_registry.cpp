@@ -1,7 +1,6 @@
 #include <algorithm>
 #include <limits>
 #include <memory>
-#include <stdexcept>
 
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/model/worksheet.h"

@@ -1,7 +1,6 @@
 #include "dpxlsx/provider/xlsx_data_provider.h"
 
 #include <algorithm>
-#include <cctype>
 #include <new>
 
 #include <boost/filesystem.hpp>

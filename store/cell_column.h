@@ -76,6 +76,7 @@ class DPXLSX_API CellBlocks {
     CellBlocks(CellBlocks&& other) noexcept;
 
     std::size_t size() const { return size_; }
+    // Constness is that of the sequence: the cells may be changed.
     PackedCell& operator[](std::size_t index) const;
     PackedCell& back() const { return next_[-1]; }
     // The end of the contiguous cells in memory that start with the one at `index`.

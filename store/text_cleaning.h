@@ -27,7 +27,7 @@ DPXLSX_API void truncateToCharLength(std::string& text, unsigned short maxChars)
 // white space at the ends goes, and characters that the host's names cannot have become "_".
 void cleanVariableName(std::string& name, unsigned short maxChars);
 
-// How many of the first `bytes` bytes make up whole characters as readers see them, which may be
+// How many of the first `bytes` bytes make up whole user-perceived characters, which may be
 // several code points; where the first one alone is longer, whole code points. `bytes` is less than
 // the text has.
 std::size_t wholeCharacters(std::string_view text, std::size_t bytes);

@@ -75,8 +75,9 @@ class DPXLSX_API WorksheetCells {
     std::shared_ptr<TextPool> texts_;
     Columns columns_;
     Columns::iterator recent_;  // the column of the last cell filed, if any
-    mutable std::vector<const value_type*>
-        inOrder_;  // outdated while its size is not that of columns_
+    // The columns by number, made when a query that is const first needs them: therefore mutable.
+    // Outdated while its size is not that of columns_.
+    mutable std::vector<const value_type*> inOrder_;
 };
 
 }  // namespace dp

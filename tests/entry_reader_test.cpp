@@ -1,7 +1,7 @@
 #include "dpxlsx/provider/entry_reader.h"
 
 #include <cstddef>
-#include <fstream>
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -74,23 +74,21 @@ std::string archiveOfAllKinds() {
 // Entries are inflated by another library than minizip's where there is one.
 TEST(EntryReader, AnswersAsMinizipDoesToEveryDamage) {
     const testkit::Workspace workspace(testkit::Workspace::Place::Memory);
-    const std::string path = workspace.file("damaged.zip");
     const std::string whole = archiveOfAllKinds();
-    std::size_t errors = 0;
-    const auto compare = [&](const std::string& damaged, const std::string& damage) {
-        std::ofstream(path, std::ios::binary) << damaged;
-        const std::string wanted = contentOf<MinizipEntry>(path);
-        errors += wanted.find("error") != wanted.npos;
-        EXPECT_EQ(contentOf<dp::EntryReader>(path), wanted) << damage;
-    };
-    compare(whole, "none");
+    const std::string path = workspace.write("whole.zip", whole);
+    const std::string wholeContent = contentOf<MinizipEntry>(path);
+    EXPECT_EQ(contentOf<dp::EntryReader>(path), wholeContent);
+    std::size_t changed = 0;
     for (std::size_t at = 0; at < whole.size() && !HasFailure(); ++at)
         for (const int change : {0x01, 0x06, 0x80, 0xFF}) {
-            std::string damaged = whole;
-            damaged[at] = static_cast<char>(damaged[at] ^ change);
-            compare(damaged, std::to_string(at) + " with " + std::to_string(change));
+            std::string bytes = whole;
+            bytes[at] = static_cast<char>(bytes[at] ^ change);
+            const std::string damaged = workspace.write("damaged.zip", bytes);
+            const std::string wanted = contentOf<MinizipEntry>(damaged);
+            EXPECT_EQ(contentOf<dp::EntryReader>(damaged), wanted) << at << " with " << change;
+            changed += wanted != wholeContent;
         }
-    EXPECT_GT(errors, whole.size());
+    EXPECT_GT(changed, whole.size());
 }
 
 }  // namespace

@@ -1,9 +1,7 @@
 #include "dpxlsx/store/number_recognition.h"
 
 #include <bit>
-#include <cmath>
 #include <cstdint>
-#include <cstdlib>
 #include <optional>
 #include <random>
 #include <utility>

@@ -23,11 +23,11 @@ DPXLSX_API bool IsMicrosoftXLSXFile(const char* fileName);
 // `provider` is null; `*provider` is null unless the result is 0. Throws nothing.
 DPXLSX_API long CreateDataProvider(const char* typeName, IDataProvider** provider);
 
-// Chooses by which rules `provider` reads workbooks: 0, those of always and until this is called;
-// 1, the standard ISO/IEC 29500 as spreadsheet programs practise it. Holds from the next OpenFile
-// or GetWorksheets on until it is called again; ClearWorksheets keeps it. Returns 0, or -50, and
-// changes nothing, for another number, a null provider and one that CreateDataProvider did not
-// make. Older libraries do not export it. Throws nothing.
+// Chooses by which rules `provider` reads workbooks: 0, the default rules, in force until this is
+// called; 1, the standard ISO/IEC 29500 as spreadsheet programs practise it. Holds from the next
+// OpenFile or GetWorksheets on until it is called again; ClearWorksheets keeps it. Returns 0, or
+// -50, and changes nothing, for another number, a null provider and one that CreateDataProvider did
+// not make. Older libraries do not export it. Throws nothing.
 DPXLSX_API long SetReadingRules(IDataProvider* provider, int rules);
 
 }  // extern "C"

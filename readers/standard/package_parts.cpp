@@ -29,7 +29,8 @@ PackageParts::PackageParts(const std::string& directory) {
     std::sort(files.begin(), files.end());  // directories are listed in any order
     for (const std::string& file : files) {
         const std::string name = resolvePartName({}, file);
-        const std::string path = directory + "/" + file;
+        std::string path = directory;
+        path.append("/").append(file);
         pathByName_.try_emplace(name, path);
         pathByFoldedName_.try_emplace(foldPartName(name), path);
     }

@@ -20,7 +20,7 @@ class CellAssembler {
     // `passedOver` records were delivered when the part was read before, and are not again.
     explicit CellAssembler(ExcelXLSXReader& owner, std::size_t passedOver = 0);
 
-    // A `row`; `number` is its `r`. Throws CmXmlException for a row that no worksheet has.
+    // A `row`; `number` is its `r`. It may be beyond the worksheet: values there are the error.
     void beginRow(std::optional<std::string_view> number);
     // A `c` with its `r`, and its `t` and `s` or nothing. Throws CmXmlException.
     void beginCell(std::optional<std::string_view> reference, std::string_view type,

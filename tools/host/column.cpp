@@ -66,6 +66,18 @@ std::string patternOf(const IVariableFormat* format) {
 
 }  // namespace
 
+const char* kindName(Kind kind) {
+    switch (kind) {
+        case Kind::Number:
+            return "numeric";
+        case Kind::DateTime:
+            return "datetime";
+        case Kind::Text:
+            break;
+    }
+    return "text";
+}
+
 std::string numberText(double value) {
     char text[32];
     const auto end = std::to_chars(text, text + sizeof text, value).ptr;

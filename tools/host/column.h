@@ -9,6 +9,9 @@ namespace dp::tool {
 
 enum class Kind { Number, DateTime, Text };
 
+// "numeric", "datetime" or "text".
+const char* kindName(Kind kind);
+
 // The shortest text that reads back as the same number.
 std::string numberText(double value);
 

@@ -138,18 +138,6 @@ Json formatJson(const Column& column) {
     return json;
 }
 
-const char* kindName(Kind kind) {
-    switch (kind) {
-        case Kind::Number:
-            return "numeric";
-        case Kind::DateTime:
-            return "datetime";
-        case Kind::Text:
-            break;
-    }
-    return "text";
-}
-
 Json columnHead(const Column& column) {
     const IColumn& host = column.host();
     const IColumnView& view = *host.GetView();

@@ -29,18 +29,6 @@ std::string layoutText(const LoadedWorksheet& worksheet) {
     return text + ", last used row " + std::to_string(layout.usedRows);
 }
 
-const char* kindText(Kind kind) {
-    switch (kind) {
-        case Kind::Number:
-            return "numeric";
-        case Kind::DateTime:
-            return "datetime";
-        case Kind::Text:
-            break;
-    }
-    return "text";
-}
-
 Table columnTable(const LoadedWorksheet& worksheet) {
     Table table({{"key", true},
                  {"position", true},
@@ -54,7 +42,7 @@ Table columnTable(const LoadedWorksheet& worksheet) {
         const IColumn& host = column.host();
         const bool text = column.kind() == Kind::Text;
         table.addRow({std::to_string(host.GetPrimeKey()), std::to_string(host.GetPosition()),
-                      column.name(), kindText(column.kind()), std::to_string(host.GetRowCount()),
+                      column.name(), kindName(column.kind()), std::to_string(host.GetRowCount()),
                       std::to_string(host.GetMissingCount()),
                       text ? "-" : std::to_string(column.convertedMissing()), column.formatText()});
     }
