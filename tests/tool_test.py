@@ -142,7 +142,7 @@ TRAITS = [
     ("iso-dates", changed(SHEET, CELL, '<c r="B2" t = \'d\'><v>2024-01-05</v></c>'),
      r"1 date \(My Data!B2\).*the year of a date", 0),
     ("date-system-1904", changed(WORKBOOK, "<workbookPr", '<workbookPr date1904="true"'),
-     "1,462 days early; add 1462", 0),
+     "1,462 days early; use --standard, or add 1462", 0),
     ("password-protected", compound("EncryptedPackage"), "protected with a password", 22),
     ("old-workbook", compound("Workbook"), "old binary format", 22),
     ("old-workbook", compound("Book"), "old binary format", 22),
@@ -208,6 +208,11 @@ TRAITS = [
     ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
 ]
 # The traits that a plain import mentions when it succeeds.
+CURED_BY_STANDARD = {
+    "namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904", "no-style-sheet",
+    "part-names", "taken-for-dates", "not-taken-for-dates", "number-format-count", "default-date-style",
+    "phonetic-texts", "inline-runs", "inline-values", "cdata-texts", "values-in-pieces", "booleans-as-words",
+    "lower-case-references"}
 WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904",
          "shared-strings-missing", "worksheet-without-part")
 
@@ -604,6 +609,14 @@ class ToolTest(unittest.TestCase):
                 self.assertEqual([t["trait"] for t in explained["traits"]], [key] if key else [])
                 fails = [t["importFails"] for t in explained["traits"]]
                 self.assertEqual(fails, [code != 0] if key else [])
+                cured = key in CURED_BY_STANDARD
+                self.assertEqual(["--standard" in t["advice"] for t in explained["traits"]], [cured] if key else [])
+                left = json.loads(self.run_tool(book, "--explain", "--json", "--standard"))["traits"]
+                self.assertEqual({t["trait"] for t in left} & {key, "unreadable", *CURED_BY_STANDARD},
+                                 {key} if key and not cured else set())
+                if cured:
+                    self.run_tool(book, "--standard")
+                    self.assertEqual([n for n in self.notes if "dpxlsx --explain" in n], [])
                 self.run_tool(book, expected=code)
                 noted = [note for note in self.notes if "dpxlsx --explain" in note]
                 told = code != 0 or (key in WORST and text != r"1 cell \(My Data!A2\)")
@@ -686,7 +699,7 @@ class ToolTest(unittest.TestCase):
                           "The book counts its dates from 1904",
                           "1 cell (My Data) with an error such as #DIV/0!"])
         self.run_tool(book)
-        self.assertIn("texts are missing; dates, if there are any, arrive 1,462 days early", self.notes[0])
+        self.assertIn("texts are missing (--standard cures it); dates, if there are any, arrive 1,462 days early (--standard", self.notes[0])
         self.run_tool(self.folder / "none.xlsx", "--explain", expected=17)
         self.assertIn("does not end in .xlsx",
                       self.run_tool(book.rename(self.folder / "a.xlsm"), "--explain"))

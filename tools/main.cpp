@@ -45,7 +45,7 @@ void show(Workbook& workbook, const Options& options) {
 
 // Prints what the user would not notice in the output.
 void printNotes(const Workbook& workbook, const Options& options) {
-    const std::string note = importNote(options.book, workbook.folder(), workbook.leftOut());
+    const std::string note = importNote(options, workbook.folder(), workbook.leftOut());
     if (!note.empty()) printLine(note);
     for (const std::string& more : workbook.notes()) printLine(more);
 }
@@ -79,7 +79,7 @@ void carryOut(const Options& options) {
     } catch (const Interrupted&) {
         throw;
     } catch (...) {
-        throw explained(currentFailure(options.book), options.book);
+        throw explained(currentFailure(options.book), options);
     }
 }
 

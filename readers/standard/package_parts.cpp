@@ -48,9 +48,11 @@ std::vector<Relationship> PackageParts::relationshipsOf(std::string_view source)
     ElementWalker walker(pathOf(relationshipPartOf(source)), Vocabulary::Package);
     walker.children([&](std::string_view name) {
         if (name != "Relationship" || walker.attribute("TargetMode") == "External") return;
+        const std::string target = walker.attribute("Target").value_or("");
+        if (target.empty()) return;  // it leads nowhere, as without the standard
         relationships.push_back({walker.attribute("Id").value_or(""),
                                  lastSegment(walker.attribute("Type").value_or("")),
-                                 resolvePartName(source, walker.attribute("Target").value_or(""))});
+                                 resolvePartName(source, target)});
     });
     walker.finish();
     return relationships;

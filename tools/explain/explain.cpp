@@ -82,7 +82,8 @@ std::vector<Trait> allTraits(const Library& library, Options options) {
     findings.lost = attempt.lost;
     findings.textLimit = options.settings.maxText.value_or(kDefaultLongestText);
     std::vector<Trait> traits =
-        traitsOf(findings, askForStyles(library, options.book, findings.formats));
+        underRules(traitsOf(findings, askForStyles(library, options.book, findings.formats)),
+                   options.standard);
     const bool explained =
         std::any_of(traits.begin(), traits.end(), [](const Trait& trait) { return trait.fatal; });
     if (failure && !explained) traits.push_back(unreadableTrait(findings, failure->code()));
@@ -127,20 +128,24 @@ void explain(const Library& library, const Options& options, Output& output) {
     if (traits.empty()) output.write(printable(options.book) + ": " + kNothing + "\n");
 }
 
-std::string importNote(const std::string& book, const std::string& folder,
+std::string importNote(const Options& options, const std::string& folder,
                        const std::set<std::string>& leftOut) {
+    const std::string& book = options.book;
     std::string text;
-    for (const Trait& trait : quickTraitsOf(quickFindings(book, folder, leftOut))) {
+    const Findings findings = quickFindings(book, folder, leftOut);
+    for (const Trait& trait : underRules(quickTraitsOf(findings), options.standard)) {
         if (trait.note.empty()) continue;
         text += (text.empty() ? "" : "; ") + trait.note;
     }
     return text.empty() ? text : book + ": " + text + "; see dpxlsx --explain";
 }
 
-Failure explained(const Failure& failure, const std::string& book) {
+Failure explained(const Failure& failure, const Options& options) {
+    const std::string& book = options.book;
     const int code = failure.code();
     if (code != kMalformedWorkbook && code != kNoPackage && code != kNoWorkbook) return failure;
-    for (const Trait& trait : traitsOf(quickFindings(book, "", {}), {})) {
+    const Findings findings = quickFindings(book, "", {});
+    for (const Trait& trait : underRules(traitsOf(findings, {}), options.standard)) {
         if (!trait.fatal) continue;
         return {failure.code(),
                 book + ": " + trait.found + "; " + trait.advice + "; see dpxlsx --explain"};

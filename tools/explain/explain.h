@@ -17,10 +17,10 @@ void explain(const Library& library, const Options& options, Output& output);
 // One line about the worst traits of a book that was imported without failure; empty when it has
 // none of them. `folder` is the directory into which the library has unpacked the open book,
 // `leftOut` the titles of worksheets that are not imported.
-std::string importNote(const std::string& book, const std::string& folder,
+std::string importNote(const Options& options, const std::string& folder,
                        const std::set<std::string>& leftOut);
 
 // The failure of an import, with the reason that an inspection of the book finds, if any.
-Failure explained(const Failure& failure, const std::string& book);
+Failure explained(const Failure& failure, const Options& options);
 
 }  // namespace dp::tool

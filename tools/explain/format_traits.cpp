@@ -117,7 +117,7 @@ Found defaultDateStyle(const Findings& findings, const StyleAnswers& answers) {
                  placed(found.cells, "date") +
                      " in formats without a counterpart: " + listed(found.codes, true),
                  "the values are right, but are displayed in the default date style",
-                 "to choose how they are displayed, use a format such as m/d/yyyy"};
+                 "use a format such as m/d/yyyy to choose how they are displayed"};
 }
 
 // The first value decides the kind of the whole column.

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <string>
+#include <string_view>
 #include <utility>
 
 #include "tools/host/exit_code.h"
@@ -321,7 +322,60 @@ void addAll(std::vector<Trait>& traits, const Findings& findings, const Sources&
     (add(traits, found(findings, sources)), ...);
 }
 
+// An import by the standard gives what spreadsheet programs show.
+constexpr std::string_view kCuredByStandard[] = {
+    "namespace-prefix",
+    "shared-strings-without-count",
+    "iso-dates",
+    "date-system-1904",
+    "no-style-sheet",
+    "part-names",
+    "taken-for-dates",
+    "not-taken-for-dates",
+    "number-format-count",
+    "default-date-style",
+    "phonetic-texts",
+    "inline-runs",
+    "inline-values",
+    "cdata-texts",
+    "values-in-pieces",
+    "booleans-as-words",
+    "lower-case-references",
+};
+
+bool isCuredByStandard(const Trait& trait) {
+    return std::find(std::begin(kCuredByStandard), std::end(kCuredByStandard), trait.key) !=
+           std::end(kCuredByStandard);
+}
+
+// What an import by the standard does differently with what it cannot cure.
+struct StandardEffect {
+    std::string_view key;
+    const char* effect;
+};
+
+constexpr StandardEffect kStandardEffects[] = {
+    {"error-cells", "a missing value arrives"},
+    {"not-a-number", "a missing value arrives"},
+};
+
 }  // namespace
+
+std::vector<Trait> underRules(std::vector<Trait> traits, bool standard) {
+    if (!standard) {
+        for (Trait& trait : traits) {
+            if (!isCuredByStandard(trait)) continue;
+            trait.advice.insert(0, "use --standard, or ");
+            if (!trait.note.empty()) trait.note += " (--standard cures it)";
+        }
+        return traits;
+    }
+    std::erase_if(traits, isCuredByStandard);
+    for (Trait& trait : traits)
+        for (const StandardEffect& changed : kStandardEffects)
+            if (trait.key == changed.key) trait.effect = changed.effect;
+    return traits;
+}
 
 std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers) {
     std::vector<Trait> traits = quickTraitsOf(findings);

@@ -68,7 +68,7 @@ constexpr OptionRow kOutput[] = {
     {"--head", "N", "first N rows only, 0 for none (tables: 10, else all)", "",
      value<&Options::head, wholeFrom<0, kLastRow>>},
     {"--standard", "", "read by the standard, as spreadsheet programs do",
-     "; else by the rules that every host knows", flag<&Options::standard>},
+     "; else by the default rules", flag<&Options::standard>},
     {"--sheet", "NAME|KEY", "only this worksheet", ", by its name or its key in the tables",
      values<&Options::sheets, textValue>}};
 
