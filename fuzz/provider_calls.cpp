@@ -61,6 +61,7 @@ class Host {
     char symbol() { return static_cast<char>(input_.byte()); }
     unsigned key() { return input_.byte() < 240 ? input_.byte() % 8 : input_.index(); }
     int anyKey() { return static_cast<int>(key()); }
+    int anyPosition() { return static_cast<int>(key() - 1); }  // -1 included
     std::string name() { return input_.text(); }
 
     // --- what the provider holds ---
@@ -75,9 +76,9 @@ class Host {
             case 5:
                 return provider_->AddWorksheet(name().c_str());
             case 6:
-                return provider_->SetWorksheetIndex(anyKey() - 1);
+                return provider_->SetWorksheetIndex(anyPosition());
             case 7:
-                return provider_->RemoveWorksheet(anyKey() - 1);
+                return provider_->RemoveWorksheet(anyPosition());
             case 8:
                 return open();
             case 9:
