@@ -130,6 +130,9 @@ TEST_F(ProviderContract, SettingsLandWhereTheyBelong) {
     op<void>("SetBooleanTrueValue", "yes");
     op<void>("SetBooleanFalseValue", "no");
     EXPECT_EQ(processSettings(), "-99 ? -1 1 2.147e+09 7 i o g yes no");
+    for (const char* setter : {"SetMissingValueTextRepresentation", "SetBooleanTrueValue", "SetBooleanFalseValue"})
+        op<void>(setter, nullptr);  // counts as the empty text
+    EXPECT_EQ(processSettings(), "-99  -1 1 2.147e+09 7 i o g  ");
     op<void>("SetWriteOptionVariableNames", false);
     EXPECT_FALSE(op<bool>("GetWriteOptionVariableNames"));
     op<void>("SetMissingText", "from", "to");
