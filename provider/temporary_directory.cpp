@@ -2,17 +2,21 @@
 
 #include <unistd.h>
 
+#include <filesystem>
 #include <limits>
 #include <sys/stat.h>
 #include <sys/statvfs.h>
-
-#include <boost/filesystem.hpp>
+#include <system_error>
 
 #include "dpxlsx/readers/xml/temporary_path.h"
 
 namespace dp {
 
-namespace fs = boost::filesystem;
+namespace {
+
+constexpr mode_t kPermissions = S_IRWXU | S_IRWXG | S_IRWXO;
+
+}  // namespace
 
 std::string makePrivateDirectory() {
     // The name is complete before the directory is made: nothing may fail afterwards, or the
@@ -23,10 +27,13 @@ std::string makePrivateDirectory() {
 }
 
 bool makeOwnDirectory(const std::string& path) {
-    // The mode of mkdir keeps others out from the first moment on; chmod adds what the umask
-    // removed.
+    // The mode of mkdir keeps others out from the first moment on; chmod, which a journaling file
+    // system makes expensive, adds what an unusual umask removed.
     if (::mkdir(path.c_str(), S_IRWXU) != 0) return false;
-    if (::chmod(path.c_str(), S_IRWXU) == 0) return true;
+    struct stat status {};
+    const bool isPrivate =
+        ::stat(path.c_str(), &status) == 0 && (status.st_mode & kPermissions) == S_IRWXU;
+    if (isPrivate || ::chmod(path.c_str(), S_IRWXU) == 0) return true;
     ::rmdir(path.c_str());
     return false;
 }
@@ -40,8 +47,11 @@ std::uint64_t freeSpace(const std::string& directory) {
 }
 
 void removeDirectoryAndContents(const std::string& path) {
-    boost::system::error_code ignored;
-    if (!path.empty() && fs::is_directory(path, ignored)) fs::remove_all(path, ignored);
+    // The standard library's takes what it removes from the directory's own list, where Boost's
+    // asks the file system about each file.
+    std::error_code ignored;
+    if (!path.empty() && std::filesystem::is_directory(path, ignored))
+        std::filesystem::remove_all(path, ignored);
 }
 
 }  // namespace dp

@@ -31,14 +31,24 @@ constexpr std::size_t kBufferSize = std::size_t{64} << 10;  // bytes
 constexpr std::size_t kLongestName = 255;                   // bytes; longer names are cut
 constexpr int kEntryFailed = UNZ_INTERNALERROR;
 
+// Tells a file from all others, whatever its name.
+struct FileIdentity {
+    dev_t device = 0;
+    ino_t number = 0;
+
+    bool operator==(const FileIdentity&) const = default;
+};
+
+FileIdentity identityOf(const struct stat& status) { return {status.st_dev, status.st_ino}; }
+
 // A file being written; the destructor closes it.
 class OutputFile {
   public:
-    // Does not follow a link. The file is readable by its owner whatever the umask.
-    explicit OutputFile(const std::string& path)
-        : descriptor_(::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOFOLLOW | O_CLOEXEC,
-                             S_IRUSR | S_IWUSR)) {
-        if (isOpen()) ::fchmod(descriptor_, S_IRUSR | S_IWUSR);
+    // Does not follow a link, and does not open the file that must be `kept`. The file is readable
+    // by its owner whatever the umask, and empty.
+    OutputFile(const std::string& path, const FileIdentity& kept)
+        : descriptor_(::open(path.c_str(), O_WRONLY | O_CREAT | O_NOFOLLOW | O_CLOEXEC, kMode)) {
+        if (isOpen() && !prepare(kept)) ::close(std::exchange(descriptor_, -1));
     }
     ~OutputFile() {
         if (isOpen()) ::close(descriptor_);
@@ -63,6 +73,17 @@ class OutputFile {
     bool close() { return ::close(std::exchange(descriptor_, -1)) == 0; }
 
   private:
+    static constexpr mode_t kMode = S_IRUSR | S_IWUSR;
+
+    // Looks before it changes anything: on a journaling file system a change of the mode costs ten
+    // times as much as a look, and there is seldom one to make.
+    bool prepare(const FileIdentity& kept) const {
+        struct stat status {};
+        if (::fstat(descriptor_, &status) != 0 || identityOf(status) == kept) return false;
+        if ((status.st_mode & kMode) != kMode && ::fchmod(descriptor_, kMode) != 0) return false;
+        return status.st_size == 0 || ::ftruncate(descriptor_, 0) == 0;
+    }
+
     int descriptor_;
 };
 
@@ -100,10 +121,12 @@ class Unpacking {
     PackageStatus run() {
         const std::uint64_t space = freeSpace(directory_);
         spareSpace_ = space / kSpareSpaceDivisor;
-        boost::system::error_code unknown;  // for the overload that does not throw
-        const std::uint64_t size = fs::file_size(archivePath_, unknown);
-        if (unknown || exceedsLimits(claimsOf(archive_), size, space - spareSpace_))
+        struct stat status {};
+        if (::stat(archivePath_.c_str(), &status) != 0 ||
+            exceedsLimits(claimsOf(archive_), static_cast<std::uint64_t>(status.st_size),
+                          space - spareSpace_))
             return PackageStatus::TooLarge;
+        package_ = identityOf(status);
         const int result = unpackEntries();
         if (spaceIsShort_) return PackageStatus::TooLarge;
         return result == UNZ_END_OF_LIST_OF_FILE ? PackageStatus::Success
@@ -135,21 +158,22 @@ class Unpacking {
     // Makes the directories that lead to `relative`; true when all of them exist afterwards. Links
     // are not followed: the library makes none, so somebody else must have put them into the
     // private directory.
-    bool makeDirectories(const std::string& relative) const {
+    bool makeDirectories(const std::string& relative) {
+        if (relative == known_) return true;
         fs::path path = directory_;
         for (const fs::path& component : fs::path(relative)) {
             path /= component;
+            if (makeOwnDirectory(path.string())) continue;
             boost::system::error_code error;
             const fs::file_type type = fs::symlink_status(path, error).type();
-            if (type == fs::symlink_file || type == fs::status_error) return false;
-            if (type == fs::file_not_found && !makeOwnDirectory(path.string())) return false;
+            if (type == fs::symlink_file || type == fs::status_error || type == fs::file_not_found)
+                return false;
         }
+        known_ = relative;
         return true;
     }
 
     int unpackFile(const std::string& path) {
-        boost::system::error_code error;
-        if (fs::equivalent(path, archivePath_, error)) return kEntryFailed;
         int result = reader_.open();
         if (result != UNZ_OK) return result;
         result = copyCurrentFile(path);
@@ -159,7 +183,7 @@ class Unpacking {
 
     // The last read result: 0 at the entry's end, negative on an error.
     int copyCurrentFile(const std::string& path) {
-        OutputFile file(path);
+        OutputFile file(path, package_);
         if (!file.isOpen()) return kEntryFailed;
         int size = 0;
         while ((size = reader_.read(buffer_.data(), buffer_.size())) > 0)
@@ -183,6 +207,8 @@ class Unpacking {
     std::array<char, kBufferSize> buffer_;
     const std::string& archivePath_;
     const std::string& directory_;
+    FileIdentity package_;          // which no entry replaces
+    std::string known_;             // the directory that was made or looked at last
     std::uint64_t spareSpace_ = 0;  // bytes
     std::uint64_t unchecked_ = 0;   // bytes written since the last check of the free space
     bool spaceIsShort_ = false;
