@@ -50,8 +50,8 @@ class DPXLSX_API DateTimeVariableFormat : public IDateTimeVariableFormat {
     unsigned dateTimeParameters[4] = {};  // the host's
     const String pattern;
     // Made from the pattern when the first value is rendered, hence mutable; owned, null until
-    // then. Creating one takes as long as rendering some twenty values, and most formats never
-    // render any.
+    // then. It makes that value cost as much as some twenty others, and most formats never render
+    // any.
     mutable icu::DateFormat* formatter = nullptr;
 };
 
