@@ -240,6 +240,7 @@ TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     provider.AddWorksheet("third");
     provider.SetWorksheetIndex(2);
     file(provider, 0, "|6");
+    EXPECT_EQ(keysOf(3), " 5");
     provider.SetWorksheetIndex(0);
     file(provider, 3, "|3");  // moves all later keys
     provider.GetWorksheetPrimeKeys();
