@@ -3,10 +3,12 @@
 
 #include <unistd.h>
 
+#include <cstdint>
 #include <fstream>
 #include <map>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "bench/harness.h"

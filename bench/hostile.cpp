@@ -6,6 +6,7 @@
 // 10,000 files take longer than everything else.
 
 #include <functional>
+#include <iterator>
 #include <string>
 #include <vector>
 

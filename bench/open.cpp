@@ -1,7 +1,6 @@
 // Opening, closing and clearing of workbooks beside a floor: copy and unpack the package, pull
 // every node of its parts with libxml2's reader, and append the values to one vector per column.
 
-#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>

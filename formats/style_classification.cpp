@@ -1,6 +1,8 @@
 #include "dpxlsx/formats/style_classification.h"
 
 #include <algorithm>
+#include <cstddef>
+#include <iterator>
 #include <utility>
 
 #include "dpxlsx/formats/automatic_format.h"

@@ -1,5 +1,6 @@
 #include "dpxlsx/provider/entry_name.h"
 
+#include <cstddef>
 #include <string_view>
 
 namespace dp {

@@ -1,6 +1,7 @@
 #include <algorithm>
 #include <limits>
 #include <memory>
+#include <utility>
 
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/model/worksheet.h"

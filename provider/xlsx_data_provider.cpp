@@ -1,7 +1,7 @@
 #include "dpxlsx/provider/xlsx_data_provider.h"
 
-#include <algorithm>
 #include <new>
+#include <utility>
 
 #include <boost/filesystem.hpp>
 

@@ -7,6 +7,7 @@
 #include <locale>
 #include <sstream>
 #include <string_view>
+#include <system_error>
 
 #include "dpxlsx/store/text_cleaning.h"
 

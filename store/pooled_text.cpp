@@ -1,5 +1,6 @@
 #include "dpxlsx/store/pooled_text.h"
 
+#include <cstddef>
 #include <cstring>
 
 namespace dp {

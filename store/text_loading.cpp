@@ -1,4 +1,5 @@
 #include <algorithm>
+#include <utility>
 
 #include "dpxlsx/formats/text_variable_format.h"
 #include "dpxlsx/store/column_loading.h"

@@ -2,6 +2,7 @@
 
 #include <zlib.h>
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 #include <string_view>

@@ -1,5 +1,6 @@
 #include <algorithm>
 #include <memory>
+#include <tuple>
 
 #include "dpxlsx/formats/date_time_variable_format.h"
 #include "dpxlsx/formats/fraction_variable_format.h"

@@ -2,7 +2,6 @@
 #include <bit>
 #include <cstdint>
 #include <initializer_list>
-#include <iterator>
 #include <map>
 #include <memory>
 #include <optional>

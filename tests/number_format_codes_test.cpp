@@ -1,4 +1,5 @@
 #include <cmath>
+#include <cstddef>
 #include <fstream>
 #include <limits>
 #include <memory>

@@ -1,4 +1,5 @@
 #include <algorithm>
+#include <new>
 #include <regex>
 #include <string>
 #include <vector>

@@ -1,4 +1,5 @@
 #include <regex>
+#include <stdexcept>
 
 #include <boost/lexical_cast.hpp>
 

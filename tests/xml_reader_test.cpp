@@ -2,6 +2,7 @@
 
 #include <bit>
 #include <clocale>
+#include <cmath>
 #include <cstdlib>
 #include <cstring>
 #include <random>

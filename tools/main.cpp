@@ -1,5 +1,7 @@
 #include <cstdio>
+#include <exception>
 #include <filesystem>
+#include <system_error>
 
 #include "tools/explain/explain.h"
 #include "tools/host/exit_code.h"

@@ -1,5 +1,7 @@
 #include "dpxlsx/readers/standard/cell_content.h"
 
+#include <utility>
+
 #include "dpxlsx/readers/standard/cell_values.h"
 #include "dpxlsx/readers/standard/string_items.h"
 #include "dpxlsx/store/text_cleaning.h"

@@ -4,8 +4,10 @@
 #include <charconv>
 #include <chrono>
 #include <cmath>
+#include <cstddef>
 #include <iterator>
 #include <limits>
+#include <string>
 #include <system_error>
 
 #include "dpxlsx/readers/xml/cm_xml_cast.h"

@@ -1,6 +1,7 @@
 #include "dpxlsx/readers/standard/number_formats.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/standard_formats.h"

@@ -1,6 +1,7 @@
 #include "dpxlsx/readers/standard/package_parts.h"
 
 #include <algorithm>
+#include <cstddef>
 
 #include <boost/filesystem.hpp>
 

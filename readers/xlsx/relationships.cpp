@@ -1,5 +1,7 @@
 #include "dpxlsx/readers/xlsx/relationships.h"
 
+#include <utility>
+
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 

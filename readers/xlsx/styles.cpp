@@ -1,6 +1,7 @@
-#include <algorithm>
 #include <cstdint>
+#include <iterator>
 #include <string_view>
+#include <utility>
 
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"

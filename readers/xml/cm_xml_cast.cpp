@@ -4,6 +4,7 @@
 #include <cctype>
 #include <charconv>
 #include <clocale>
+#include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>

@@ -2,7 +2,6 @@
 
 #include <iterator>
 #include <stdexcept>
-#include <string_view>
 #include <utility>
 
 #include <boost/lexical_cast.hpp>

@@ -1,6 +1,7 @@
 #include "tools/explain/format_traits.h"
 
 #include <algorithm>
+#include <cstdio>
 #include <set>
 #include <string>
 #include <vector>

@@ -2,9 +2,11 @@
 
 #include <algorithm>
 #include <cctype>
+#include <cstdint>
 #include <filesystem>
 #include <map>
 #include <set>
+#include <string_view>
 #include <vector>
 
 #include "tools/explain/number_formats.h"

@@ -1,7 +1,9 @@
 #include "tools/explain/style_probe.h"
 
 #include <array>
+#include <cstdlib>
 #include <filesystem>
+#include <system_error>
 #include <vector>
 
 #include <dpxlsx/model/host/i_finders.h>

@@ -1,6 +1,7 @@
 #include "tools/explain/tally.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "tools/views/text.h"
 

@@ -1,6 +1,7 @@
 #include "tools/explain/traits.h"
 
 #include <algorithm>
+#include <iterator>
 #include <string>
 #include <string_view>
 #include <utility>

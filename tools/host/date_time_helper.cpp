@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <iterator>
 
 #include <unicode/smpdtfmt.h>
 #include <unicode/timezone.h>

@@ -3,6 +3,7 @@
 #include <map>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include <dpxlsx/model/host/i_string.h>
 #include <dpxlsx/model/host/i_variable_format.h>

@@ -4,6 +4,7 @@
 #include <charconv>
 #include <cmath>
 #include <optional>
+#include <system_error>
 
 #include <dpxlsx/model/host/i_finders.h>
 

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <charconv>
+#include <system_error>
+#include <utility>
 
 namespace dp::tool {
 

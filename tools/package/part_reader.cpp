@@ -1,6 +1,7 @@
 #include "tools/package/part_reader.h"
 
 #include <algorithm>
+#include <iterator>
 #include <string_view>
 
 #include "tools/host/interrupt.h"

@@ -1,8 +1,10 @@
 #include "tools/views/csv.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <filesystem>
 #include <set>
+#include <system_error>
 
 #include "tools/host/exit_code.h"
 #include "tools/host/interrupt.h"

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
 
 #include <dpxlsx/model/host/i_formula.h>
 #include <dpxlsx/model/host/i_string.h>

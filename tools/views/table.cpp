@@ -1,6 +1,7 @@
 #include "tools/views/table.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "tools/views/text.h"
 

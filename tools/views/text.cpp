@@ -1,5 +1,7 @@
 #include "tools/views/text.h"
 
+#include <cstdint>
+
 #include <unicode/uchar.h>
 #include <unicode/unistr.h>
 
