@@ -16,8 +16,9 @@ namespace dp {
 // True for the date, time and date-time types.
 bool isDateTimeType(EXCEL_FORMAT_TYPE type) noexcept;
 
-// Classifies one style: sets a date-time type and replaces the code by its cleaned first section,
-// or sets EXCEL_FORMAT_NONE.
+// Sets the style's type by its number-format code. A code that shows dates or times gives one of
+// the three date-time types and is replaced by what parseDateTimeFormat() makes of it. Any other
+// code, percentages and currencies included, stays as it is and gives EXCEL_FORMAT_NONE.
 void setFormatType(xStyle& style);
 
 // The codes for those descriptive format names that do not have one fixed code.

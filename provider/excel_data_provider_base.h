@@ -254,7 +254,8 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     unsigned GetWorksheetPosition(unsigned key) const;
     // Empty for a position that names no worksheet.
     std::string GetWorksheetName(int position) const;
-    // Worksheets of the write side: none in this read-only provider.
+    // The number of worksheets that were written: always 0, nothing can be written. Those that were
+    // read are the keys of GetWorksheetPrimeKeys().
     int GetWorksheetCount() const;
     // Always empty.
     std::string GetFileName() const;
@@ -296,9 +297,9 @@ class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
     std::string _fileName;
     bool _previewing = false;
     int _worksheetIndex = -1;
-    std::vector<std::vector<IColumn*>> _worksheetColumns;
+    std::vector<std::vector<IColumn*>> _worksheetColumns;  // written ones: the library adds none
     std::vector<std::string> _worksheetNames;
-    std::vector<WorksheetCells> _cells;
+    std::vector<WorksheetCells> _cells;  // what was read, by the position of the worksheet
     mutable ReadOnlyCollection<int> _columnKeys;
     ReadOnlyCollection<int> _allWorksheetKeys;
     mutable ReadOnlyCollection<int> _worksheetKeys;

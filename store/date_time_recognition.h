@@ -6,8 +6,9 @@
 
 namespace dp {
 
-// True when the helper reads `text` by `format` (null: no pattern known) as a date-time; `value` is
-// then its serial day number.
+// Asks the host's helper, which must not be null, to read `text` by the ICU pattern `format`; null
+// stands for no known pattern. If the helper can, returns true and sets `value` to the serial day
+// number.
 DPXLSX_API bool IsDateTime(const IDateTimeVariableFormat* helper, const IString* format,
                            IString* text, double& value);
 

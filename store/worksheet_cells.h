@@ -60,10 +60,10 @@ class DPXLSX_API WorksheetCells {
     // Settles all columns.
     void settle() const;
 
-    // The number of columns in all worksheets before this one, cached by the code that numbers
-    // columns across worksheets. Mutable, because queries that are const fill the cache. It belongs
-    // to this worksheet's position in the workbook, not to its cells, so a move of the cells leaves
-    // it behind.
+    // The number of columns in all worksheets before this one. The provider, which numbers columns
+    // across worksheets, keeps it here: public, because only the provider knows the other
+    // worksheets, and mutable, because const queries compute it. It belongs to this worksheet's
+    // position in the workbook, not to its cells, so a move of the cells leaves it behind.
     mutable std::optional<std::size_t> columnsBefore;
 
   private:

@@ -75,10 +75,12 @@ class DPXLSX_API INumericColumn : public IColumn {
   public:
     // GetRowCount() numbers; where a row has none, the missing value that was set at the load.
     virtual const double* GetValues() const = 0;
-    // Cells whose content is no number or date-time, or a number out of range, also where a missing
-    // word or number (SetAlphaMissingNumeric, SetMissingNumeric) put a number in its place. A cell
-    // that one of these made missing counts if the missing value is out of range, as it is by
-    // default. Error cells are not read and not counted.
+    // The number of cells whose content the column cannot hold: texts that are no number, or no
+    // date-time in a column of date-times; numbers that are out of range or that the helper refuses
+    // as date-times; date-times where SetReadOptionConvertDateTimeToText asks for texts. Such a
+    // cell counts even if SetMissingNumeric or SetAlphaMissingNumeric gives it a number. A cell
+    // that one of the two makes missing counts unless the missing value is in range, which by
+    // default it is not. Error cells do not count: they are not read.
     virtual int GetConvertedMissingCount() const = 0;
     // A number by the column's format without the format's own decimal places, which may lose
     // digits (FormatValue(value, false) of the format keeps them); the decimal point of the

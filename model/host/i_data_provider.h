@@ -118,8 +118,8 @@ class DPXLSX_API IDataProvider : public IResource {
     // What a text column shows for a cell that holds the missing value, "*" by default. Rows
     // without a cell are empty texts.
     virtual void SetMissingValueTextRepresentation(const char* text) = 0;
-    // Numbers outside [minimum, maximum] become missing and count as converted. By default
-    // -1.001e18 and 1.001e18.
+    // Numbers outside [minimum, maximum] become missing; INumericColumn::GetConvertedMissingCount
+    // counts them. By default -1.001e18 and 1.001e18.
     virtual void SetNumericRange(double minimum, double maximum) = 0;
     // Bytes, 80 by default: longer texts, and names in the sheet, are cut, possibly inside a
     // character. Negative is no limit; 0 leaves empty texts.
@@ -174,7 +174,8 @@ class DPXLSX_API IDataProvider : public IResource {
     // and trims them; GetWorksheets still lists the names as they are.
     virtual void SetReadOptionCleanWorksheetNames(bool clean) = 0;
     // Columns that begin with a date-time arrive as texts. Date-times in a column that is loaded as
-    // numeric all the same, or that begins with a number, become missing and count as converted.
+    // numeric all the same, or that begins with a number, become missing, and
+    // INumericColumn::GetConvertedMissingCount counts them.
     virtual void SetReadOptionConvertDateTimeToText(bool convert) = 0;
 
     // --- 53-56: read options per worksheet ---
@@ -230,8 +231,10 @@ class DPXLSX_API IDataProvider : public IResource {
     virtual void SetInferFormatPolicy(int policy) = 0;
     // Not supported: -1.
     virtual long RereadFile() = 0;
-    // A preview converts the first 101 values of a column and fills up with empty texts, or with
-    // 1.23456e30, which counts as missing only if it is the missing value. False by default.
+    // While previewing, FindColumn converts only the cells in the first 101 rows of a column. Cells
+    // in later rows become empty texts, or 1.23456e30, which is missing only if it is the missing
+    // value. OpenFile reads as much as ever, except for dates and styles of documents in XML
+    // Spreadsheet 2003 (see GetPreviewNumberOfRows). False by default.
     virtual void SetPreviewing(bool previewing) = 0;
 
     // --- 68-71: the file on disk ---
@@ -288,8 +291,10 @@ class DPXLSX_API IExcelDataProvider : public IDataProvider {
     virtual bool GetWriteOptionVariableNames() const = 0;
     // The value of SetPreviewing.
     virtual bool IsPreviewing() const = 0;
-    // Always 100, like the next one. While previewing, values of so many rows and columns are read
-    // from an XML Spreadsheet 2003 document; .xlsx files are read whole.
+    // Always 100, like the next one. While previewing, the reader of XML Spreadsheet 2003 documents
+    // delivers cells beyond the first 100 rows and columns of the sheet without their style, and
+    // their dates as the missing value. The rows of loaded columns that a preview converts are
+    // another matter, see SetPreviewing.
     virtual int GetPreviewNumberOfRows() const = 0;
     // Always 100.
     virtual int GetPreviewNumberOfColumns() const = 0;

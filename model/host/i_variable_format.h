@@ -33,8 +33,11 @@ class DPXLSX_API IVariableFormat {
     // formats, also for those with a pattern; of numbers only for the general format.
     virtual bool GetAuto() const = 0;
     // The display text of `value`, a new string, with the decimal symbol of SetInputDecimal; never
-    // null from the library. `fullPrecision` leaves the format's own decimal places out: "2" for
-    // 2.50 in fixed notation, one significant digit of a percentage. Date-times ignore it.
+    // null from the library. Pass false to display a value as the workbook does. True does not give
+    // all digits, in spite of the name: the format then ignores its count of decimals, and a
+    // fixed format shows whole numbers ("3" for 2.75), a percentage one significant digit ("1e+01%"
+    // for 0.1234), a scientific format as many digits as the value needs. General and date-time
+    // formats show the same either way.
     virtual IString* FormatValue(double value, bool fullPrecision) const = 0;
 };
 

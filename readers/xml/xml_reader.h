@@ -48,6 +48,7 @@ class DPXLSX_API XmlReader {
     // read continues behind the element. Throws CmXmlException.
     template <class T>
     bool mReadAttribute(T& value, const char* name);
+    // The same as mReadAttribute for an int; the name says nothing about safety here.
     bool mReadAttribute_NotSafe(int& value, const char* name);
 
     // Moves to the next node; false at the end of the document. Throws CmXmlException.

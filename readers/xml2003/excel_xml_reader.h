@@ -105,8 +105,9 @@ class DPXLSX_API ExcelXmlReader {
 
     XmlReader xmlReader;
     int worksheetIndex = 0;  // of the next worksheet
-    // The tables may change in any way between calls; while a document or a worksheet of it is read
-    // they may only grow. What grows while a package is read is not looked at.
+    // Derived classes may change the three tables in any way between calls. While a call reads a
+    // document or a worksheet, entries may only be appended; while it reads a package, entries that
+    // are appended have no effect.
     std::vector<xStyle> styles;
     std::vector<xStyleRange> columnStyles;
     std::vector<xStyleRange> rowStyles;
