@@ -12,6 +12,7 @@
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/percentage_variable_format.h"
 #include "dpxlsx/model/host/i_string.h"
+#include "dpxlsx/model/host/reference.h"
 #include "testkit/process_settings.h"
 #include "testkit/providers.h"
 
@@ -155,7 +156,7 @@ inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key, Colum
     facts.formatType = static_cast<int>(type);
     EXPECT_EQ(column != nullptr, facts.found);
     if (!facts.found || !column) return facts;
-    EXPECT_EQ(column->AddRef(), 1U);
+    const Reference<IColumn> held(column);
     EXPECT_EQ(std::pair(column->GetPrimeKey(), column->GetVariableBodyPrimeKey()), std::pair(key, key));
     EXPECT_TRUE(column->IsFormatDirty() && !column->UseDefaultVariableBody());
     facts.dataType = column->GetDataType();
@@ -171,7 +172,6 @@ inline ColumnFacts factsOf(const ExcelDataProviderBase& provider, int key, Colum
         EXPECT_EQ(texts.Count(), static_cast<unsigned long>(column->GetRowCount()));
         for (unsigned long i = 0; i < texts.Count(); ++i) facts.texts.emplace_back(texts.Item(i).database_str());
     }
-    column->Release();
     return facts;
 }
 

@@ -13,6 +13,7 @@
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
 #include "testkit/process_settings.h"
+#include "testkit/workspace.h"
 #include "tests/case_table.h"
 #include "tests/temporary_files.h"
 
@@ -324,16 +325,13 @@ TEST(CmXmlCast, YieldsWhatTheCLibraryYields) {
 }
 
 TEST(CmXmlCast, ReadsPointsUnderADecimalComma) {
-    const auto directory =
-        boost::filesystem::temp_directory_path() / boost::filesystem::unique_path("locale-%%%%-%%%%");
-    boost::filesystem::create_directories(directory);
+    const testkit::Workspace workspace;
+    const auto directory = workspace.files();
     const std::string make = "localedef -i de_DE -f UTF-8 " + (directory / "de_DE.UTF-8").string() + " >/dev/null 2>&1";
     const bool made = std::system(make.c_str()) == 0;
-    ::setenv("LOCPATH", directory.c_str(), 1);
-    if (!made || !std::setlocale(LC_ALL, "de_DE.UTF-8")) {
-        ::unsetenv("LOCPATH");
+    const testkit::EnvironmentVariable locales("LOCPATH", directory.string());
+    if (!made || !std::setlocale(LC_ALL, "de_DE.UTF-8"))
         GTEST_SKIP() << "no locale with a decimal comma can be made here";
-    }
     double value = 0;
     CmXmlCast::instance().mCast(value, "1.5");
     EXPECT_EQ(value, 1.5);
@@ -341,8 +339,6 @@ TEST(CmXmlCast, ReadsPointsUnderADecimalComma) {
     EXPECT_EQ(value, 1.0) << "only the last point is a decimal comma";
     compareCasts(50'000, 2);
     std::setlocale(LC_ALL, "C");
-    ::unsetenv("LOCPATH");
-    boost::filesystem::remove_all(directory);
 }
 
 }  // namespace
