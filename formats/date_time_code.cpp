@@ -4,12 +4,11 @@
 
 #include "dpxlsx/formats/format_codes.h"
 #include "dpxlsx/formats/input_decimal.h"
+#include "dpxlsx/formats/number_format_code.h"
 
 namespace dp {
 namespace {
 
-// Where "m" could also mean minutes, only three letters or more mean a month.
-constexpr int kMostMinuteLetters = 2;
 constexpr int kMostFractionDigits = 3;
 
 // Reads the first section of a code and finds out whether it shows a date, a time or both. Quoted

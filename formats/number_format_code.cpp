@@ -10,8 +10,6 @@ namespace {
 
 using Kind = FormatToken::Kind;
 
-constexpr std::size_t kMostMinuteLetters = 2;  // three letters or more are a month
-
 struct Word {
     std::string_view text;
     Kind kind;

@@ -49,6 +49,9 @@ struct NumberFormatCode {
     std::vector<FormatSection> sections;
 };
 
+// "m" and "mm" are months or minutes, depending on what is next to them; longer ones are months.
+inline constexpr int kMostMinuteLetters = 2;
+
 // Takes time and memory in proportion to the code; callers refuse codes of unreasonable size.
 NumberFormatCode parseNumberFormat(std::string_view code);
 

@@ -8,6 +8,7 @@
 #include <limits>
 #include <system_error>
 
+#include "dpxlsx/formats/digits.h"
 #include "dpxlsx/formats/input_decimal.h"
 
 namespace dp {
@@ -44,7 +45,6 @@ int shortestDigits(double value) {
     char buffer[32];
     const auto result =
         std::to_chars(std::begin(buffer), std::end(buffer), value, std::chars_format::scientific);
-    const auto isDigit = [](char c) { return c >= '0' && c <= '9'; };
     char* const mantissaEnd = std::find(buffer, result.ptr, 'e');
     return static_cast<int>(std::count_if(buffer, mantissaEnd, isDigit));
 }

@@ -10,6 +10,7 @@
 #include <string>
 #include <system_error>
 
+#include "dpxlsx/formats/digits.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
 
 namespace dp::standard {
@@ -23,8 +24,6 @@ std::string_view trimmed(std::string_view text) {
     if (first == text.npos) return {};
     return text.substr(first, text.find_last_not_of(kWhiteSpace) - first + 1);
 }
-
-bool isDigit(char c) { return c >= '0' && c <= '9'; }
 
 // What remains of a text that is being read from the left.
 class Scanner {

@@ -2,16 +2,11 @@
 
 #include <algorithm>
 
+#include "dpxlsx/formats/digits.h"
 #include "dpxlsx/readers/worksheet_size.h"
 #include "dpxlsx/readers/xml/cm_xml_cast.h"
 
 namespace dp {
-
-namespace {
-
-bool isDigit(char c) { return c >= '0' && c <= '9'; }
-
-}  // namespace
 
 const char* mDetermineCol(const char* reference, int& column) {
     int value = 0;

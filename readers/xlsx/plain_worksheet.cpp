@@ -5,6 +5,7 @@
 #include <optional>
 #include <string_view>
 
+#include "dpxlsx/formats/digits.h"
 #include "dpxlsx/readers/xlsx/cell_assembler.h"
 
 namespace dp {
@@ -13,7 +14,6 @@ namespace {
 
 bool isUpper(char c) { return c >= 'A' && c <= 'Z'; }
 bool isLower(char c) { return c >= 'a' && c <= 'z'; }
-bool isDigit(char c) { return c >= '0' && c <= '9'; }
 bool isOfNumber(char c) { return isDigit(c) || c == '.' || c == '-' || c == 'E' || c == '+'; }
 
 // Moves `p` behind `literal` if that stands there. The zeros behind the bytes read so far are in no

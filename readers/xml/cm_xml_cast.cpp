@@ -13,9 +13,9 @@
 #include <string_view>
 #include <system_error>
 
-namespace {
+#include "dpxlsx/formats/digits.h"
 
-bool isDigit(char c) { return c >= '0' && c <= '9'; }
+namespace {
 
 // Numbers of few digits, as nearly all are. An integer below 2^53 divided by a power of ten up to
 // 10^22 is rounded only once, so the result is the same double that a full conversion gives.
@@ -28,13 +28,13 @@ bool castShortDecimal(double& value, const char* text) {
     std::int64_t whole = 0;
     std::size_t digits = 0;
     std::size_t decimals = 0;
-    for (; isDigit(*text); ++text, ++digits) {
+    for (; dp::isDigit(*text); ++text, ++digits) {
         if (digits == kDigits) return false;
         whole = whole * 10 + (*text - '0');
     }
     if (digits == 0) return false;
     if (*text == '.')
-        for (++text; isDigit(*text); ++text, ++digits, ++decimals) {
+        for (++text; dp::isDigit(*text); ++text, ++digits, ++decimals) {
             if (digits == kDigits) return false;
             whole = whole * 10 + (*text - '0');
         }
@@ -48,7 +48,7 @@ bool castShortDecimal(double& value, const char* text) {
 // number, values out of range) is left to atof, whose rules for it differ.
 bool castPlainDecimal(double& value, const char* text) {
     const char first = *text == '-' ? text[1] : *text;
-    if (!isDigit(first) && first != '.') return false;
+    if (!dp::isDigit(first) && first != '.') return false;
     const char* end = text + std::strlen(text);
     const auto result = std::from_chars(text, end, value);
     return result.ec == std::errc() && result.ptr == end;

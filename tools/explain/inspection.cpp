@@ -21,10 +21,6 @@ namespace {
 constexpr size_t kMostWorksheets = 10000;
 constexpr size_t kMostRelationships = 100000;
 
-constexpr const char* kWorkbook = "xl/workbook.xml";
-constexpr const char* kStyles = "xl/styles.xml";
-constexpr const char* kStrings = "xl/sharedStrings.xml";
-
 bool endsInXlsx(const std::string& book) {
     std::string extension = std::filesystem::path(book).extension().string();
     std::transform(extension.begin(), extension.end(), extension.begin(),

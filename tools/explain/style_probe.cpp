@@ -22,15 +22,14 @@ namespace {
 
 namespace fs = std::filesystem;
 
-constexpr const char* kStyles = "xl/styles.xml";
 constexpr size_t kMostColumns = 16384;
 constexpr size_t kLargestStyleSheet = 64 << 20;  // bytes
 
-constexpr const char* kWorkbook =
+constexpr const char* kProbeWorkbook =
     "<workbook xmlns=\"http://schemas.openxmlformats.org/spreadsheetml/2006/main\" "
     "xmlns:r=\"http://schemas.openxmlformats.org/officeDocument/2006/relationships\">"
     "<bookViews/><sheets><sheet name=\"Styles\" sheetId=\"1\" r:id=\"a\"/></sheets></workbook>";
-constexpr const char* kRelationships =
+constexpr const char* kProbeRelationships =
     "<Relationships xmlns=\"http://schemas.openxmlformats.org/package/2006/relationships\">"
     "<Relationship Id=\"a\" Type=\"http://schemas.openxmlformats.org/officeDocument/2006/"
     "relationships/worksheet\" Target=\"worksheets/sheet1.xml\"/></Relationships>";
@@ -120,8 +119,8 @@ bool copyStyles(const std::string& book, Archive& archive) {
 
 bool makeProbe(const std::string& path, const std::string& book, const std::vector<int>& styles) {
     Archive archive(path);
-    archive.add("xl/workbook.xml", kWorkbook);
-    archive.add("xl/_rels/workbook.xml.rels", kRelationships);
+    archive.add(kWorkbook, kProbeWorkbook);
+    archive.add("xl/_rels/workbook.xml.rels", kProbeRelationships);
     archive.add("xl/worksheets/sheet1.xml", worksheetOf(styles));
     return copyStyles(book, archive) && archive.close();
 }

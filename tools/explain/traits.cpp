@@ -223,7 +223,7 @@ Found noStyleSheet(const Findings& findings) {
 Found movedParts(const Findings& findings) {
     if (findings.moved.empty()) return std::nullopt;
     const MovedPart& first = findings.moved.front();
-    const bool textsOnly = findings.moved.size() == 1 && first.wanted == "xl/sharedStrings.xml";
+    const bool textsOnly = findings.moved.size() == 1 && first.wanted == kStrings;
     std::string found =
         "the package has " + quoted(first.found) + " where " + quoted(first.wanted) + " belongs";
     if (findings.moved.size() > 1) {

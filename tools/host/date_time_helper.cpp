@@ -8,6 +8,7 @@
 #include <unicode/timezone.h>
 
 #include "tools/host/calendar.h"
+#include "tools/views/text.h"
 
 namespace dp::tool {
 
@@ -38,12 +39,6 @@ constexpr const char* kUsualPatterns[] = {
     "h:mm a",
     "h:mm:ss a",
 };
-
-std::string trimmed(const std::string& text) {
-    const size_t first = text.find_first_not_of(" \t\r\n");
-    if (first == std::string::npos) return {};
-    return text.substr(first, text.find_last_not_of(" \t\r\n") - first + 1);
-}
 
 std::unique_ptr<icu::DateFormat> makeFormatter(const std::string& pattern) {
     UErrorCode status = U_ZERO_ERROR;

@@ -80,12 +80,6 @@ bool isSame(double shown, double number) {
     return std::abs(shown - number) <= kDigits * std::abs(number);
 }
 
-std::string trimmed(const std::string& text) {
-    const size_t first = text.find_first_not_of(' ');
-    return first == std::string::npos ? std::string()
-                                      : text.substr(first, text.find_last_not_of(' ') - first + 1);
-}
-
 // The column loaded again with another limit of text length.
 std::optional<Column> uncut(IDataProvider& provider, const Column& column, const Options& options,
                             int limit) {

@@ -46,8 +46,8 @@ void chooseView(Options& options, View view) {
 }
 
 template <View chosen>
-constexpr OptionAction view = {Takes::Nothing,
-                               [](Options& options, const Given&) { chooseView(options, chosen); }};
+constexpr OptionAction viewed = {
+    Takes::Nothing, [](Options& options, const Given&) { chooseView(options, chosen); }};
 
 template <View chosen>
 constexpr OptionAction target = {Takes::ValueOrNothing, [](Options& options, const Given& given) {
@@ -56,7 +56,7 @@ constexpr OptionAction target = {Takes::ValueOrNothing, [](Options& options, con
                                  }};
 
 constexpr OptionRow kOutput[] = {
-    {"--list", "", "names of the worksheets, without reading cells", "", view<View::Names>},
+    {"--list", "", "names of the worksheets, without reading cells", "", viewed<View::Names>},
     {"--explain", "", "what the import does to this book that may surprise",
      "; with `--json` as data", flag<&Options::explain>},
     {"--csv", "FILE|DIR/|-", "values as CSV; several worksheets go into a folder",

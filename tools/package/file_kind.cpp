@@ -79,7 +79,7 @@ FileKind archiveKind(const Package& package) {
         FileKind kind;
     };
     constexpr Sign kSigns[] = {
-        {"xl/workbook.xml", FileKind::Workbook},
+        {kWorkbook, FileKind::Workbook},
         {"xl/workbook.bin", FileKind::BinaryWorkbook},
         {"word/document.xml", FileKind::TextDocument},
         {"ppt/presentation.xml", FileKind::Presentation},

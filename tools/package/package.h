@@ -7,6 +7,11 @@
 
 namespace dp::tool {
 
+// The parts of a workbook's package, by the names that programs give them.
+inline constexpr const char* kWorkbook = "xl/workbook.xml";
+inline constexpr const char* kStyles = "xl/styles.xml";
+inline constexpr const char* kStrings = "xl/sharedStrings.xml";
+
 // The entries of a ZIP archive, read one at a time; nothing is unpacked to disk. Names are cut to
 // 255 bytes; of several entries with one name the last counts.
 class Package {

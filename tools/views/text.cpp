@@ -102,6 +102,13 @@ std::string padded(const std::string& text, int width, bool toTheRight) {
     return toTheRight ? spaces + text : text + spaces;
 }
 
+std::string trimmed(const std::string& text) {
+    constexpr const char* kSpace = " \t\r\n";
+    const size_t first = text.find_first_not_of(kSpace);
+    if (first == std::string::npos) return {};
+    return text.substr(first, text.find_last_not_of(kSpace) - first + 1);
+}
+
 std::string counted(size_t count, const std::string& unit) {
     return counted(count, unit, unit + "s");
 }

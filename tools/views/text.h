@@ -22,6 +22,9 @@ std::string cutToWidth(const std::string& text, int width);
 // The text followed (or, to the right, preceded) by spaces up to `width` cells.
 std::string padded(const std::string& text, int width, bool toTheRight);
 
+// The text without the white space at its ends.
+std::string trimmed(const std::string& text);
+
 // "1 cell", "2 cells".
 std::string counted(size_t count, const std::string& unit);
 std::string counted(size_t count, const std::string& one, const std::string& more);
