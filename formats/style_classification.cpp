@@ -35,13 +35,13 @@ constexpr LocaleStyle kLocaleStyles[] = {
     {"22", DATE_PART | TIME_PART},
 };
 
-IVariableFormat* createDateTimeFormat(std::string& code) {
+IVariableFormat* makeDateTimeFormat(std::string& code) {
     removeBackslashes(code);
     const std::string* pattern = icuPatternOf(code);
     return pattern ? new DateTimeVariableFormat(*pattern) : new DateTimeVariableFormat();
 }
 
-IVariableFormat* createNumberFormat(std::string& code) {
+IVariableFormat* makeNumberFormat(std::string& code) {
     if (parseDecimalFormat(code)) return createVextralDecimalFormat(code);
     if (parsePercentageFormat(code)) return createVextralPercentageFormat(code);
     if (parseCurrencyFormat(code)) return createAutomaticFormat().release();
@@ -122,7 +122,7 @@ IVariableFormat* createStyleFormat(std::vector<xStyle>& styles, int styleIndex, 
     if (styleIndex < 0 || static_cast<std::size_t>(styleIndex) >= styles.size())
         return createAutomaticFormat().release();
     std::string& code = styles[static_cast<std::size_t>(styleIndex)].formatCode;
-    return isDateTime ? createDateTimeFormat(code) : createNumberFormat(code);
+    return isDateTime ? makeDateTimeFormat(code) : makeNumberFormat(code);
 }
 
 }  // namespace dp

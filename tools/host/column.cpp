@@ -28,13 +28,13 @@ size_t rowsOf(const IColumn& column, bool preview) {
     return preview ? std::min(rows, kPreviewRows) : rows;
 }
 
-std::string counted(int count, const std::string& unit) {
-    return tool::counted(static_cast<size_t>(std::max(count, 0)), unit);
+std::string howMany(int count, const std::string& unit) {
+    return counted(static_cast<size_t>(std::max(count, 0)), unit);
 }
 
 std::string fractionText(const IFractionVariableFormat& format) {
     if (!format.GetFixedDenominator()) {
-        return "fraction, " + counted(format.GetMaximumDigits(), "digit");
+        return "fraction, " + howMany(format.GetMaximumDigits(), "digit");
     }
     return "fraction, denominator " + std::to_string(format.GetDenominator());
 }
@@ -44,12 +44,12 @@ std::string numericText(const INumericVariableFormat& format) {
     format.GetDecimalPlaces(&decimals, nullptr);
     switch (format.GetNumericSubtype()) {
         case NumericSubtype::Fixed:
-            return "fixed, " + counted(decimals, "decimal");
+            return "fixed, " + howMany(decimals, "decimal");
         case NumericSubtype::Scientific:
-            return "scientific, " + counted(decimals, "decimal");
+            return "scientific, " + howMany(decimals, "decimal");
         case NumericSubtype::Percentage:
             decimals = static_cast<const IPercentageVariableFormat&>(format).GetDecimalPlaces();
-            return "percentage, " + counted(decimals, "decimal");
+            return "percentage, " + howMany(decimals, "decimal");
         case NumericSubtype::Fraction:
             return fractionText(static_cast<const IFractionVariableFormat&>(format));
         case NumericSubtype::General:
@@ -149,7 +149,7 @@ std::string Column::formatText() const {
             break;
     }
     const auto& texts = static_cast<const ITextVariableFormat&>(*format);
-    return "text, up to " + counted(texts.GetCharacterCount(), "byte");
+    return "text, up to " + howMany(texts.GetCharacterCount(), "byte");
 }
 
 const INumericColumn& Column::numeric() const {

@@ -17,7 +17,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-std::string quoted(const std::string& text) {
+std::string csvText(const std::string& text) {
     const bool spaces = !text.empty() && (text.front() == ' ' || text.back() == ' ');
     if (!spaces && text.find_first_of(",\"\r\n") == std::string::npos) return text;
     std::string result = "\"";
@@ -38,7 +38,7 @@ void writeLine(Output& output, const LoadedWorksheet& worksheet, TextOf textOf) 
     std::string line;
     for (const Column& column : worksheet.columns) {
         if (&column != &worksheet.columns.front()) line += ',';
-        line += quoted(validUtf8(textOf(column)));
+        line += csvText(validUtf8(textOf(column)));
     }
     // Programs that read CSV skip empty lines; an empty field must still be a row.
     output.write(line.empty() ? "\"\"\n" : line + "\n");
