@@ -1,8 +1,8 @@
 #pragma once
 
+#include <map>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace dp::standard {
@@ -38,8 +38,9 @@ class PackageParts {
     std::string workbookPart() const;
 
   private:
-    std::unordered_map<std::string, std::string> pathByName_;
-    std::unordered_map<std::string, std::string> pathByFoldedName_;
+    // Ordered: hashes could be made to collide.
+    std::map<std::string, std::string> pathByName_;
+    std::map<std::string, std::string> pathByFoldedName_;
 };
 
 }  // namespace dp::standard

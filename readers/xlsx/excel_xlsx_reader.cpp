@@ -1,7 +1,7 @@
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 
+#include <map>
 #include <string_view>
-#include <unordered_map>
 #include <utility>
 
 #include "dpxlsx/formats/style_classification.h"
@@ -68,7 +68,7 @@ void ExcelXLSXReader::mSearchWorkbookRelationships(const std::string& id, std::s
 }
 
 void ExcelXLSXReader::resolveNumberKinds() {
-    std::unordered_map<std::string_view, int> firstById;
+    std::map<std::string_view, int> firstById;  // ordered: hashes could be made to collide
     for (std::size_t i = 0; i < styles.size(); ++i)
         firstById.try_emplace(styles[i].styleId, static_cast<int>(i));
     firstById.erase("");  // a cell format without an id has no number format

@@ -1,9 +1,9 @@
 #pragma once
 
 #include <cstddef>
+#include <map>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace dp {
@@ -24,7 +24,7 @@ class RelationshipIndex {
     std::ptrdiff_t find(const std::string& id) const;
 
   private:
-    std::unordered_map<std::string_view, std::size_t> firstById_;
+    std::map<std::string_view, std::size_t> firstById_;  // ordered: hashes could be made to collide
 };
 
 // The path of the part that the workbook's relationship target names, "." and ".." resolved within

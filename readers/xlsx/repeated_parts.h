@@ -1,8 +1,8 @@
 #pragma once
 
 #include <cstdint>
+#include <set>
 #include <string>
-#include <unordered_set>
 
 #include "dpxlsx/readers/limits.h"
 
@@ -16,7 +16,7 @@ class RepeatedParts {
     void visit(const std::string& path);
 
   private:
-    std::unordered_set<std::string> paths_;
+    std::set<std::string> paths_;            // ordered: hashes could be made to collide
     std::uint64_t left_ = kRepeatedReading;  // bytes
 };
 

@@ -4,9 +4,9 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <set>
 #include <string>
 #include <string_view>
-#include <unordered_set>
 #include <vector>
 
 namespace dp {
@@ -123,7 +123,7 @@ class PlainXml {
     std::string openNames_;  // of the open elements, one behind the other
     std::vector<std::uint16_t> openLengths_;
     std::vector<Prefix> prefixes_;
-    std::unordered_set<std::string> known_;
+    std::set<std::string> known_;  // ordered: hashes could be made to collide
     std::size_t knownSize_ = 0;  // bytes
     std::array<std::string, 64> lately_;
 };

@@ -2,7 +2,7 @@
 
 #include <cstddef>
 #include <limits>
-#include <unordered_map>
+#include <map>
 #include <vector>
 
 namespace dp {
@@ -64,7 +64,8 @@ class FirstEntryIndex {
     }
 
     Key Entry::*key_;
-    std::unordered_map<Key, std::size_t> first_;
+    // Ordered: a document chooses the keys, and could choose some that collide in a hash table.
+    std::map<Key, std::size_t> first_;
     std::size_t known_ = kUnused;  // entries in `first_`
 };
 
