@@ -1,6 +1,7 @@
 #include "dpxlsx/readers/standard/standard_reader.h"
 
-#include <algorithm>
+#include <map>
+#include <string_view>
 #include <utility>
 
 #include "dpxlsx/readers/standard/string_items.h"
@@ -15,14 +16,23 @@ namespace {
 using standard::PackageParts;
 using standard::Relationship;
 
-// The relationship of a sheet to its worksheet part; null for a chart sheet, say.
-const Relationship* worksheetOf(const standard::Sheet& sheet,
-                                const std::vector<Relationship>& relationships) {
-    const auto found =
-        std::find_if(relationships.begin(), relationships.end(), [&](const Relationship& r) {
-            return r.type == "worksheet" && r.id == sheet.relationshipId;
-        });
-    return found == relationships.end() ? nullptr : &*found;
+struct NamedPart {
+    std::string name;
+    std::string part;
+};
+
+// The sheets that are worksheets, not chart sheets, say.
+std::vector<NamedPart> worksheetsOf(const std::vector<standard::Sheet>& sheets,
+                                    const std::vector<Relationship>& relationships) {
+    std::map<std::string_view, const std::string*> partById;
+    for (const Relationship& relationship : relationships)
+        if (relationship.type == "worksheet")
+            partById.try_emplace(relationship.id, &relationship.part);
+    std::vector<NamedPart> worksheets;
+    for (const standard::Sheet& sheet : sheets)
+        if (const auto found = partById.find(sheet.relationshipId); found != partById.end())
+            worksheets.push_back({sheet.name, *found->second});
+    return worksheets;
 }
 
 }  // namespace
@@ -47,11 +57,9 @@ void StandardReader::mReadExcelWorkbook() {
     references_.date1904 = workbook.date1904;
     readReferences(workbookPart, relationships);
     std::vector<unsigned> emptySheets;
-    for (const standard::Sheet& sheet : workbook.sheets) {
-        const Relationship* worksheet = worksheetOf(sheet, relationships);
-        if (!worksheet) continue;
-        beginWorksheet(sheet.name);
-        readWorksheet(parts_.pathOf(worksheet->part));
+    for (const auto& [name, part] : worksheetsOf(workbook.sheets, relationships)) {
+        beginWorksheet(name);
+        readWorksheet(parts_.pathOf(part));
         if (worksheetEmpty) emptySheets.push_back(static_cast<unsigned>(worksheetIndex - 1));
     }
     removeEmptyWorksheets(emptySheets);
@@ -118,8 +126,8 @@ void listWorksheets(const std::string& dir, std::vector<std::string>& names) {
     const WorkbookPart workbook = readWorkbookPart(parts.pathOf(workbookPart));
     const std::vector<Relationship> relationships = parts.relationshipsOf(workbookPart);
     names.clear();
-    for (const Sheet& sheet : workbook.sheets)
-        if (worksheetOf(sheet, relationships)) names.push_back(sheet.name);
+    for (NamedPart& worksheet : worksheetsOf(workbook.sheets, relationships))
+        names.push_back(std::move(worksheet.name));
 }
 
 }  // namespace standard
