@@ -8,15 +8,9 @@ namespace dp::standard {
 
 namespace {
 
-// 0-based numbers: those of 1-based ones, and of the one beyond the last for all others.
-std::uint32_t rowOf(std::uint64_t number) {
-    const bool exists = number >= 1 && number <= kWorksheetRows;
-    return exists ? static_cast<std::uint32_t>(number - 1) : kWorksheetRows;
-}
-
-std::uint32_t columnOf(std::uint64_t number) {
-    const bool exists = number >= 1 && number <= kWorksheetColumns;
-    return exists ? static_cast<std::uint32_t>(number - 1) : kWorksheetColumns;
+// The 0-based number of a 1-based one out of `count`; the one beyond the last for all others.
+std::uint32_t fromZero(std::uint64_t number, std::uint32_t count) {
+    return number >= 1 && number <= count ? static_cast<std::uint32_t>(number - 1) : count;
 }
 
 // The value of a letter in a column's name, 0 for all other characters.
@@ -42,11 +36,12 @@ std::optional<CellPosition> parseReference(std::string_view text) {
     for (; c != text.end() && digitValue(*c) < 10; ++c)
         row = std::min(row * 10 + digitValue(*c), kFar);
     if (digits == text.begin() || c == digits || c != text.end()) return std::nullopt;
-    return CellPosition{rowOf(row), columnOf(column)};
+    return CellPosition{fromZero(row, kWorksheetRows), fromZero(column, kWorksheetColumns)};
 }
 
 void CellOrder::beginRow(std::optional<int> number) {
-    const std::uint32_t row = number ? rowOf(static_cast<std::uint64_t>(*number)) : nextRow_;
+    const std::uint32_t row =
+        number ? fromZero(static_cast<std::uint64_t>(*number), kWorksheetRows) : nextRow_;
     next_ = {row, 0};
     nextRow_ = std::min<std::uint32_t>(row, kWorksheetRows) + 1;
 }
