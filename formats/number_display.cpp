@@ -2,6 +2,7 @@
 
 #include <cstddef>
 
+#include "dpxlsx/formats/automatic_format.h"
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/percentage_variable_format.h"
 
@@ -49,7 +50,6 @@ std::unique_ptr<INumericVariableFormat> createNumeric(NumericSubtype subtype, in
     auto format = std::make_unique<NumericVariableFormat>();
     format->numericSubtype = subtype;
     format->decimalPlaces = decimals;
-    format->autoFormat = subtype == NumericSubtype::General;
     return format;
 }
 
@@ -76,7 +76,7 @@ std::unique_ptr<INumericVariableFormat> createNumberFormat(NumberDisplay display
         case NumberDisplay::Kind::Scientific:
             return createNumeric(NumericSubtype::Scientific, display.decimals);
         default:
-            return createNumeric(NumericSubtype::General, 0);
+            return createAutomaticFormat();
     }
 }
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "dpxlsx/formats/numeric_variable_format.h"
+#include "dpxlsx/formats/automatic_format.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/standard/cell_values.h"
@@ -68,9 +68,7 @@ const NumberFormats::Format* NumberFormats::at(int index) const {
 
 std::unique_ptr<IVariableFormat> NumberFormats::create(int index) const {
     if (const Format* format = at(index)) return createVariableFormat(format->code);
-    auto automatic = std::make_unique<NumericVariableFormat>();
-    automatic->autoFormat = true;
-    return automatic;
+    return createAutomaticFormat();
 }
 
 int NumberFormats::indexOf(int id) {
