@@ -1,9 +1,13 @@
 #include "dpxlsx/readers/standard/string_items.h"
 
 #include <charconv>
+#include <cstdint>
 #include <optional>
 #include <string_view>
 #include <utility>
+
+#include <unicode/unistr.h>
+#include <unicode/utf16.h>
 
 namespace dp::standard {
 
@@ -11,53 +15,31 @@ namespace {
 
 constexpr std::size_t kEscapeLength = 7;  // of "_x000D_"
 
-// The code of the escape that `text` begins with.
-std::optional<char32_t> escapedCode(std::string_view text) {
+// The UTF-16 code of the escape that `text` begins with.
+std::optional<char16_t> escapedCode(std::string_view text) {
     if (text.size() < kEscapeLength || !text.starts_with("_x") || text[kEscapeLength - 1] != '_')
         return std::nullopt;
-    unsigned code = 0;
+    std::uint16_t code = 0;
     const char* const end = text.data() + kEscapeLength - 1;
     if (std::from_chars(text.data() + 2, end, code, 16).ptr != end) return std::nullopt;
     return code;
 }
 
-bool isHighHalf(char32_t code) { return code >= 0xD800 && code < 0xDC00; }
-bool isLowHalf(char32_t code) { return code >= 0xDC00 && code < 0xE000; }
-
-void appendUtf8(std::string& text, char32_t code) {
-    const auto tail = [&](unsigned shift) {
-        text += static_cast<char>(0x80U | ((code >> shift) & 0x3FU));
-    };
-    if (code < 0x80) {
-        text += static_cast<char>(code);
-    } else if (code < 0x800) {
-        text += static_cast<char>(0xC0U | (code >> 6U));
-        tail(0);
-    } else if (code < 0x10000) {
-        text += static_cast<char>(0xE0U | (code >> 12U));
-        tail(6);
-        tail(0);
-    } else {
-        text += static_cast<char>(0xF0U | (code >> 18U));
-        tail(12);
-        tail(6);
-        tail(0);
-    }
-}
-
 // Appends the character that `text` begins to escape; how many bytes it is written with, 0 when it
 // is none.
 std::size_t takeEscape(std::string_view text, std::string& decoded) {
-    const std::optional<char32_t> code = escapedCode(text);
-    if (!code || *code == 0 || isLowHalf(*code)) return 0;
-    if (!isHighHalf(*code)) {
-        appendUtf8(decoded, *code);
-        return kEscapeLength;
+    const std::optional<char16_t> code = escapedCode(text);
+    if (!code || *code == 0 || U16_IS_TRAIL(*code)) return 0;
+    icu::UnicodeString character(*code);
+    std::size_t length = kEscapeLength;
+    if (U16_IS_LEAD(*code)) {
+        const std::optional<char16_t> low = escapedCode(text.substr(kEscapeLength));
+        if (!low || !U16_IS_TRAIL(*low)) return 0;
+        character.append(*low);
+        length += kEscapeLength;
     }
-    const std::optional<char32_t> low = escapedCode(text.substr(kEscapeLength));
-    if (!low || !isLowHalf(*low)) return 0;
-    appendUtf8(decoded, 0x10000 + ((*code - 0xD800) << 10U) + (*low - 0xDC00));
-    return 2 * kEscapeLength;
+    character.toUTF8String(decoded);
+    return length;
 }
 
 }  // namespace
