@@ -38,6 +38,18 @@ const std::shared_ptr<icu::BreakIterator>& breakIterator() {
     return iterator;
 }
 
+// The iterator over the characters of `text`, which the caller keeps until the next call; null when
+// there is none.
+icu::BreakIterator* charactersOf(std::string_view text) {
+    const auto& iterator = breakIterator();
+    if (!iterator) return nullptr;
+    UErrorCode status = U_ZERO_ERROR;
+    const std::unique_ptr<UText, CloseText> walked(
+        utext_openUTF8(nullptr, text.data(), static_cast<std::int64_t>(text.size()), &status));
+    iterator->setText(walked.get(), status);
+    return U_FAILURE(status) ? nullptr : iterator.get();
+}
+
 // Every byte is a character of its own; only a carriage return may join with a line feed.
 bool isPlainAscii(std::string_view text) {
     return std::all_of(text.begin(), text.end(), [](char c) { return isAscii(c) && c != '\r'; });
@@ -76,13 +88,8 @@ void truncateToCharLength(std::string& text, unsigned short maxChars) {
         text.erase(maxChars);
         return;
     }
-    const auto& iterator = breakIterator();
+    icu::BreakIterator* const iterator = charactersOf(text);
     if (!iterator) return;
-    UErrorCode status = U_ZERO_ERROR;
-    const std::unique_ptr<UText, CloseText> walked(
-        utext_openUTF8(nullptr, text.data(), static_cast<std::int64_t>(text.size()), &status));
-    iterator->setText(walked.get(), status);
-    if (U_FAILURE(status)) return;
     std::int32_t boundary = iterator->first();
     for (unsigned passed = 0; passed < maxChars; ++passed) {
         boundary = iterator->next();
@@ -95,13 +102,8 @@ std::size_t wholeCharacters(std::string_view text, std::size_t bytes) {
     std::size_t codePoints = bytes;
     while (codePoints > 0 && (static_cast<unsigned char>(text[codePoints]) & 0xC0U) == 0x80U)
         --codePoints;
-    const auto& iterator = breakIterator();
+    icu::BreakIterator* const iterator = charactersOf(text);
     if (!iterator) return codePoints;
-    UErrorCode status = U_ZERO_ERROR;
-    const std::unique_ptr<UText, CloseText> walked(
-        utext_openUTF8(nullptr, text.data(), static_cast<std::int64_t>(text.size()), &status));
-    iterator->setText(walked.get(), status);
-    if (U_FAILURE(status)) return codePoints;
     const auto end = static_cast<std::int32_t>(codePoints);
     const std::int32_t boundary = iterator->isBoundary(end) ? end : iterator->preceding(end);
     return boundary > 0 ? static_cast<std::size_t>(boundary) : codePoints;
