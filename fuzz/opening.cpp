@@ -44,10 +44,10 @@ long open(const std::string& path, int rules) {
 }  // namespace
 
 long openAsHost(const std::string& path) {
-    constexpr int kAlways = 0;
+    constexpr int kDefault = 0;
     constexpr int kByStandard = 1;
     open(path, kByStandard);
-    return open(path, kAlways);
+    return open(path, kDefault);
 }
 
 }  // namespace fuzz

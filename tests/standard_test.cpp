@@ -22,7 +22,7 @@ using Access = dp::IDataProvider::FileAccess;
 using testkit::PackageBuilder;
 using testkit::RecordingProvider;
 
-constexpr int kAlways = 0;
+constexpr int kDefault = 0;
 constexpr int kStandard = 1;
 
 class Standard : public TemporaryFiles {
@@ -68,7 +68,7 @@ TEST_F(Standard, OffAndOn) {
             package.set(parts.substr(1, colon - 1), parts.substr(colon + 1, next - colon - 1));
             parts.erase(0, next + 1);
         }
-        EXPECT_EQ(read(package, kAlways), c[3]) << c[0] << ", off";
+        EXPECT_EQ(read(package, kDefault), c[3]) << c[0] << ", off";
         EXPECT_EQ(read(package, kStandard), c[4]) << c[0] << ", on";
     }
 }
@@ -88,7 +88,7 @@ TEST_F(Standard, SwitchHoldsFromTheNextOpenOrListing) {
     EXPECT_EQ(list(), 0) << "after clearing";
     EXPECT_EQ(dp::SetReadingRules(&provider, 7), -50);
     EXPECT_EQ(list(), 0) << "after a refusal";
-    EXPECT_EQ(dp::SetReadingRules(&provider, kAlways), 0);
+    EXPECT_EQ(dp::SetReadingRules(&provider, kDefault), 0);
     EXPECT_EQ(list(), -25);
 }
 
@@ -109,7 +109,7 @@ TEST_F(Standard, ColumnsOfCellsWithoutValues) {
         const dp::ColumnFacts column = dp::factsOf(provider, 1);
         return column.rows() + ", " + std::to_string(column.missing) + " missing";
     };
-    EXPECT_EQ(facts(kAlways), "'' 'Gr\xc3', 1 missing");
+    EXPECT_EQ(facts(kDefault), "'' 'Gr\xc3', 1 missing");
     EXPECT_EQ(facts(kStandard), "'' 'Gr' '', 2 missing");
     provider.CloseFile();
 }
