@@ -12,6 +12,7 @@
 #include "dpxlsx/formats/number_text.h"
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/formats/style_classification.h"
 #include "dpxlsx/formats/text_variable_format.h"
 #include "dpxlsx/model/host/i_string.h"
@@ -52,6 +53,17 @@ void recognise(const std::string& code, double value) {
         show(dp::DateTimeVariableFormat(*pattern), value);
     show(dp::DateTimeVariableFormat(code), value);
     dp::getRightSubString(code, static_cast<unsigned>(code.size() / 2));
+}
+
+// What reading by the standard makes of the code.
+void readByStandard(const std::string& code, double value) {
+    const dp::NumberFormatCode parsed = dp::parseNumberFormat(code);
+    fuzz::require(!parsed.sections.empty(), "a code without a section");
+    const auto format = dp::createVariableFormat(parsed);
+    const bool isDateTime = format->GetType() == dp::IVariableFormat::FormatType::DateTime;
+    fuzz::require(isDateTime == dp::isDateTimeType(dp::formatType(parsed)),
+                  "a format of another kind");
+    show(*format, value);
 }
 
 // Processes a style table as the readers do.
@@ -106,6 +118,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         freeFormats(settings, value);
         const std::string code = input.rest();
         recognise(code, value);
+        readByStandard(code, value);
         styleTable(code, value);
     });
     return 0;
