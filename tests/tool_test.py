@@ -207,12 +207,12 @@ TRAITS = [
     ("unreadable", changed(SHEET, "</sheetData>", ""), '"xl/worksheets/sheet1.xml" is .*damaged', 13),
     ("unreadable", {**PARTS, SHEET: None}, "is missing or damaged", 13),
 ]
-# The traits that a plain import mentions when it succeeds.
 CURED_BY_STANDARD = {
     "namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904", "no-style-sheet",
     "part-names", "taken-for-dates", "not-taken-for-dates", "number-format-count", "default-date-style",
     "phonetic-texts", "inline-runs", "inline-values", "cdata-texts", "values-in-pieces", "booleans-as-words",
     "lower-case-references"}
+# The traits that a plain import mentions when it succeeds.
 WORST = ("namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904",
          "shared-strings-missing", "worksheet-without-part")
 

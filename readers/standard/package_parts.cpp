@@ -50,7 +50,7 @@ std::vector<Relationship> PackageParts::relationshipsOf(std::string_view source)
     walker.children([&](std::string_view name) {
         if (name != "Relationship" || walker.attribute("TargetMode") == "External") return;
         const std::string target = walker.attribute("Target").value_or("");
-        if (target.empty()) return;  // it leads nowhere, as without the standard
+        if (target.empty()) return;  // would lead to the folder of the source
         relationships.push_back({walker.attribute("Id").value_or(""),
                                  lastSegment(walker.attribute("Type").value_or("")),
                                  resolvePartName(source, target)});

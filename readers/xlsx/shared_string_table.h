@@ -43,7 +43,7 @@ class SharedStringTable {
     std::string bytes_;
     unsigned endBits_ = 32;
     std::vector<std::uint32_t> ends_;   // the low bits, endBits_ of them
-    std::vector<std::size_t> carries_;  // per unit of the high bits, the first index that has it
+    std::vector<std::size_t> carries_;  // [n]: the first text whose end has high bits beyond n
 };
 
 }  // namespace dp

@@ -9,8 +9,9 @@ namespace dp {
 
 // One move of a document's reader by the library, as long as it lives. What libxml2 reads of the
 // file during one move lies between two nodes, and is limited; a host that moves the reader itself
-// is on its own. Counted by thread and not by reader, which hosts know without such a field: while
-// one reader moves, no other one of its thread reads.
+// is on its own. The moves are counted for each thread, because XmlReader, whose fields hosts know,
+// has no room for a count of its own. That suffices: while one reader moves, no other reader of
+// the thread does.
 class DocumentMove {
   public:
     DocumentMove() { ++steps_; }
