@@ -144,7 +144,7 @@ std::optional<std::string_view> PartText::next() {
 
 // Reads as many bytes behind those that wait as there is room for. False on an error.
 bool PartText::fill() {
-    std::copy(waiting_.begin(), waiting_.end(), bytes_.begin());
+    std::string_view::traits_type::move(bytes_.data(), waiting_.data(), waiting_.size());
     const std::size_t size = waiting_.size();
     ssize_t count = -1;
     do count = ::read(descriptor_, bytes_.data() + size, bytes_.size() - size);
