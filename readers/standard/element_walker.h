@@ -19,7 +19,8 @@ class ElementWalker {
     explicit ElementWalker(const std::string& path,
                            Vocabulary vocabulary = Vocabulary::Spreadsheet);
 
-    // The name of the current element without its prefix; valid until the walker moves.
+    // The name of the current element without its prefix; valid until the walker leaves the
+    // element.
     std::string_view name() const;
     // Whether the current element, which may be the root, has this name in the vocabulary.
     bool is(std::string_view localName) const;
