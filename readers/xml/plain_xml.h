@@ -124,7 +124,7 @@ class PlainXml {
     std::vector<std::uint16_t> openLengths_;
     std::vector<Prefix> prefixes_;
     std::set<std::string> known_;  // ordered: hashes could be made to collide
-    std::size_t knownSize_ = 0;  // bytes
+    std::size_t knownSize_ = 0;    // bytes
     std::array<std::string, 64> lately_;
 };
 
