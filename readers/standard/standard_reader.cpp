@@ -4,6 +4,7 @@
 #include <string_view>
 #include <utility>
 
+#include "dpxlsx/readers/standard/content_types.h"
 #include "dpxlsx/readers/standard/string_items.h"
 #include "dpxlsx/readers/standard/workbook_part.h"
 #include "dpxlsx/readers/worksheet_size.h"
@@ -112,8 +113,9 @@ bool isWorkbook(const std::string& dir) {
     const SilentLibxml2 silent;
     const PackageParts parts(dir);
     try {
-        readWorkbookPart(parts.pathOf(parts.workbookPart()));
-        return true;
+        const std::string part = parts.workbookPart();
+        readWorkbookPart(parts.pathOf(part));
+        return mayBeWorkbook(parts, part);
     } catch (const CmXmlException&) {
         return false;
     }

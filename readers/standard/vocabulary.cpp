@@ -21,6 +21,7 @@ constexpr Namespace kNamespaces[] = {
      Vocabulary::Relationships},
     {"http://purl.oclc.org/ooxml/officeDocument/relationships", Vocabulary::Relationships},
     {"http://schemas.openxmlformats.org/package/2006/relationships", Vocabulary::Package},
+    {"http://schemas.openxmlformats.org/package/2006/content-types", Vocabulary::Package},
     {"http://schemas.openxmlformats.org/markup-compatibility/2006", Vocabulary::Compatibility},
 };
 

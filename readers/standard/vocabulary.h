@@ -7,7 +7,7 @@ enum class Vocabulary {
     None,           // no namespace
     Spreadsheet,    // workbooks, worksheets, styles, shared strings
     Relationships,  // references from one part to another, as r:id
-    Package,        // the relationship parts of a package
+    Package,        // the relationships and content types of a package
     Compatibility,  // alternatives for programs that know more or less
     Foreign,
 };
