@@ -31,6 +31,8 @@ class ProviderFormats : public CellFormats {
     const ExcelDataProviderBase& provider_;
 };
 
+bool hasValue(ExternalCellType type) { return type != CELL_EMPTY && type != kUnreadableContent; }
+
 // The kind of a column: that of its first data cell, unless an option sets another one.
 struct ColumnKind {
     ColumnType type;
@@ -175,7 +177,7 @@ FormatType ExcelDataProviderBase::firstDataType(unsigned worksheetKey, const Cel
     auto cell = cells.lower_bound(plainOptions(worksheetKey).firstDataRow);
     // By the standard there are cells without a value, which say nothing of the kind.
     if (isByStandard())
-        while (cell != cells.end() && cell->second.type() == CELL_EMPTY) ++cell;
+        while (cell != cells.end() && !hasValue(cell->second.type())) ++cell;
     if (cell == cells.end())
         return requested == ColumnType::Text ? FormatType::Text : FormatType::Numeric;
     if (cell->second.type() == CELL_TEXT) return FormatType::Text;
@@ -230,7 +232,8 @@ ConversionSettings ExcelDataProviderBase::conversionSettings() const {
             .cleanTextValues = _cleanTextValues,
             .convertDateTimeToText = _convertDateTimeToText,
             .dateTimeHelper = _dateTimeHelper.get(),
-            .textCut = isByStandard() ? TextCut::AtCharacters : TextCut::AtBytes};
+            .textCut = isByStandard() ? TextCut::AtCharacters : TextCut::AtBytes,
+            .errorsAreFiled = isByStandard()};
 }
 
 double ExcelDataProviderBase::ConvertCellToReal(const ExternalDataRecordCell& cell, bool asDateTime,

@@ -17,7 +17,7 @@ constexpr std::size_t kLateCells = 64;
 // Format indices from -1 up to here are packed: 28 of the 32 bits beside the kind hold them.
 constexpr std::int32_t kLargestPackedFormat = (1 << (32 - PackedCell::kKindBits)) - 2;
 
-bool hasName(ExternalCellType type) {
+bool hasKind(ExternalCellType type) {
     switch (type) {
         case CELL_EMPTY:
         case CELL_INTEGER:
@@ -27,7 +27,7 @@ bool hasName(ExternalCellType type) {
         case CELL_DATETIME:
             return true;
     }
-    return false;
+    return type == kUnreadableContent;  // of which a workbook may have many
 }
 
 bool isNumber(ExternalCellType type) { return type == CELL_NUMBER || type == CELL_DATETIME; }
@@ -42,7 +42,7 @@ bool packs(const ExternalDataRecordCell& cell) {
     return (plainNumber || isNumber(cell.type)) &&
            (cell.textValue.empty() || cell.type == CELL_TEXT) &&
            (cell.intValue == 0 || cell.type == CELL_INTEGER) &&
-           (cell.boolValue == 0 || cell.type == CELL_BOOLEAN) && hasName(cell.type) &&
+           (cell.boolValue == 0 || cell.type == CELL_BOOLEAN) && hasKind(cell.type) &&
            packsFormat(cell.formatIndex);
 }
 

@@ -53,6 +53,7 @@ double rawNumber(const CellContent& cell, bool asDateTime, const IString* dateTi
             converted = true;
             return settings.missingValue;
         default:
+            converted = settings.errorsAreFiled && cell.type == kUnreadableContent;
             return settings.missingValue;
     }
 }
@@ -113,8 +114,11 @@ const IVariableFormat& FormatCache::formatOf(const CellContent& cell) {
 double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
                     const ConversionSettings& settings, bool& converted) {
     converted = false;
-    const double value = rawNumber(cell, asDateTime, dateTimeFormat, settings, converted);
-    return inRange(mapMissing(value, cell, settings), settings, converted);
+    const double raw = rawNumber(cell, asDateTime, dateTimeFormat, settings, converted);
+    const double value = mapMissing(raw, cell, settings);
+    const bool isError = settings.errorsAreFiled && cell.type == CELL_EMPTY;
+    if (isError && value == settings.missingValue) return value;
+    return inRange(value, settings, converted);
 }
 
 std::string numericCellToText(const CellContent& cell, const ConversionSettings& settings,

@@ -38,6 +38,7 @@ struct ConversionSettings {
     bool convertDateTimeToText;
     IDateTimeVariableFormat* dateTimeHelper;  // null when the host gave none
     TextCut textCut = TextCut::AtBytes;       // where texts that are too long are cut
+    bool errorsAreFiled = false;              // as cells without a value
 };
 
 // A cell to convert, wherever it is kept. The text is borrowed.
@@ -92,7 +93,8 @@ inline double inRange(double value, const ConversionSettings& settings, bool& co
 // The cell as a number; the missing value when it has no number that the settings allow.
 // `converted` is set when the content is not a number or is out of range, even if the host's
 // mapping of missing values supplies another number, and for an empty cell when the missing value
-// itself is out of range. `dateTimeFormat` is the pattern by which texts are read as date-times,
+// itself is out of range, unless empty cells are errors: they have nothing to convert.
+// `dateTimeFormat` is the pattern by which texts are read as date-times,
 // null when none is known.
 double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dateTimeFormat,
                     const ConversionSettings& settings, bool& converted);

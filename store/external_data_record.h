@@ -17,6 +17,10 @@ enum ExternalCellType : std::uint32_t {
     CELL_DATETIME = 8
 };
 
+// By the standard cells without a value are filed too: errors as CELL_EMPTY, and content that is
+// not what the cell's type says as this type, which has no name and holds nothing.
+inline constexpr ExternalCellType kUnreadableContent{1};
+
 // The content of one worksheet cell: `type` names the field that holds its value.
 class DPXLSX_API ExternalDataRecordCell {
   public:

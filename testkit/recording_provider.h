@@ -45,7 +45,8 @@ class RecordingProvider : public dp::xlsxDataProvider {
   private:
     // Numbers have as many digits as tell them from all others.
     static std::string contentOf(const dp::ExternalDataRecordCell& cell) {
-        if (cell.type == dp::CELL_EMPTY) return "missing";
+        if (cell.type == dp::CELL_EMPTY) return "error";
+        if (cell.type == dp::kUnreadableContent) return "unreadable";
         std::string text = cell.type == dp::CELL_NUMBER     ? ""
                            : cell.type == dp::CELL_DATETIME ? "d"
                            : cell.type == dp::CELL_TEXT     ? "'" + cell.textValue + "'"

@@ -114,6 +114,25 @@ TEST_F(Standard, ColumnsOfCellsWithoutValues) {
     provider.CloseFile();
 }
 
+// An error has nothing to convert; what is not a number does.
+TEST_F(Standard, ColumnsOfErrors) {
+    const auto package =
+        PackageBuilder::of({"<row/><row><c t='e'><v>#N/A</v></c></row><row><c><v>1x</v></c></row>"
+                            "<row><c><v>5</v></c></row><row><c t='e'><v>#N/A</v></c></row>"});
+    const testkit::KeptSettings kept;
+    RecordingProvider provider;
+    for (const double missing : {1.23456e30, -99.0}) {
+        provider.ClearWorksheets();
+        provider.SetMissingValue(missing);
+        EXPECT_EQ(open(provider, package, kStandard), 0);
+        provider.GetWorksheetPrimeKeys();
+        const dp::ColumnFacts column = dp::factsOf(provider, 1);
+        EXPECT_EQ(column.values, (std::vector{missing, missing, 5.0, missing}));
+        EXPECT_EQ(column.converted, 1) << missing;
+    }
+    provider.CloseFile();
+}
+
 TEST(StandardTexts, EndAtWholeCharacters) {
     struct Case {
         const char* name;

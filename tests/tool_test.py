@@ -408,6 +408,19 @@ class ToolTest(unittest.TestCase):
         self.assertEqual(self.run_tool(book, "--csv", "--standard"),
                          self.run_tool(self.book(PARTS), "--csv"))
 
+    def test_older_library_does_not_read_by_the_standard(self):
+        library = (pathlib.Path(TOOL).parent.parent / "lib" / "libdpxlsx.so.1").read_bytes()
+        older = self.folder / "older.so"
+        older.write_bytes(library.replace(b"\0SetReadingRules\0", b"\0SetReadingRulez\0"))
+        self.run_tool(SAMPLE, "--library", older)
+        self.assertIn("cannot read by the standard",
+                      self.run_tool(SAMPLE, "--standard", "--library", older, expected=4))
+
+    def test_errors_are_not_lost_by_the_standard(self):
+        book = self.book(rows("<c r='A2'><v>1</v></c>", "<c r='A3' t='e'><v>#N/A</v></c>"))
+        column = json.loads(self.run_tool(book, "--json", "--standard"))["worksheets"][0]["columns"][0]
+        self.assertEqual((column["values"], column["convertedMissing"], self.notes), ([1, None], 0, []))
+
     def test_worksheet_names_are_cleaned_on_demand(self):
         book = self.book(changed(WORKBOOK, "My Data", "a?b:c"))
         for options, wanted in (([], "a?b:c"), (["--clean-sheet-names"], "a_b_c")):

@@ -12,7 +12,13 @@ namespace {
 
 using Content = std::optional<ExternalDataRecordCell>;
 
-ExternalDataRecordCell missing() { return {}; }
+ExternalDataRecordCell error() { return {}; }
+
+ExternalDataRecordCell unreadable() {
+    ExternalDataRecordCell cell;
+    cell.type = kUnreadableContent;
+    return cell;
+}
 
 Content text(std::string value) {
     if (isAllSpaces(value)) return std::nullopt;
@@ -40,7 +46,7 @@ double dayNumberFrom1904(double value, const NumberFormats::Format& format) {
 ExternalDataRecordCell numberCell(const std::string& written, int style,
                                   const CellReferences& references) {
     const std::optional<double> value = parseNumber(written);
-    if (!value) return missing();
+    if (!value) return unreadable();
     const int formatIndex = references.formats.ofCell(style);
     const NumberFormats::Format* format = references.formats.at(formatIndex);
     if (!format || format->type == EXCEL_FORMAT_NONE)
@@ -52,7 +58,7 @@ ExternalDataRecordCell numberCell(const std::string& written, int style,
 ExternalDataRecordCell dateTimeCell(const std::string& written, int style,
                                     CellReferences& references) {
     const std::optional<IsoDateTime> value = parseIsoDateTime(written);
-    if (!value) return missing();
+    if (!value) return unreadable();
     int formatIndex = references.formats.ofCell(style);
     const NumberFormats::Format* format = references.formats.at(formatIndex);
     if (!format || format->type == EXCEL_FORMAT_NONE)
@@ -63,12 +69,12 @@ ExternalDataRecordCell dateTimeCell(const std::string& written, int style,
 // Without a format: a number format does not show Booleans.
 ExternalDataRecordCell booleanCell(const std::string& written) {
     const std::optional<bool> value = parseBoolean(written);
-    return value ? number(CELL_NUMBER, *value ? 1.0 : 0.0, -1) : missing();
+    return value ? number(CELL_NUMBER, *value ? 1.0 : 0.0, -1) : unreadable();
 }
 
 Content sharedText(const std::string& written, const SharedStringTable& strings) {
     const std::optional<int> index = parseIndex(written);
-    if (!index || static_cast<std::size_t>(*index) >= strings.size()) return missing();
+    if (!index || static_cast<std::size_t>(*index) >= strings.size()) return unreadable();
     return text(std::string(strings[static_cast<std::size_t>(*index)]));
 }
 
@@ -84,7 +90,7 @@ std::optional<ExternalDataRecordCell> contentOf(const CellMarkup& markup,
     const std::string& type = markup.type;
     if (markup.inlineText) return text(*markup.inlineText);
     if (!markup.value || isAllSpaces(*markup.value)) return std::nullopt;
-    if (type == "e") return missing();
+    if (type == "e") return error();
     if (type == "s") return sharedText(*markup.value, references.strings);
     if (type == "str" || type == "inlineStr") return writtenText(*markup.value);
     if (type == "b") return booleanCell(*markup.value);

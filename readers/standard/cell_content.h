@@ -24,9 +24,9 @@ struct CellReferences {
     bool date1904 = false;
 };
 
-// What the cell holds; nothing for one without a value and for texts of spaces alone. An error, and
-// a value that is not what its type says, is CELL_EMPTY: a missing value that counts as a row.
-// May add formats to `references`.
+// What the cell holds; nothing for one without a value and for texts of spaces alone. An error is
+// CELL_EMPTY, and a value that is not what its type says kUnreadableContent: missing values that
+// count as rows. May add formats to `references`.
 std::optional<ExternalDataRecordCell> contentOf(const CellMarkup& markup,
                                                 CellReferences& references);
 

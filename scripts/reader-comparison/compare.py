@@ -47,7 +47,7 @@ def ours(book):
 def our_value(content):
     if content.startswith("'"):
         return ("text", content[1:content.rindex("'")])
-    if content == "missing":
+    if content in ("error", "unreadable"):
         return MISSING
     number = content.split("#")[0]
     return ("date", float(number[1:])) if number[0] == "d" else ("number", float(number))
