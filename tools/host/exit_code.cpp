@@ -26,8 +26,9 @@ constexpr ResultText kResultTexts[] = {
     {-22, kNoPackage,
      "is not an .xlsx package; save it as an Excel workbook (.xlsx) without a password"},
     {-25, kNoWorkbook,
-     "holds no workbook that can be read (xl/workbook.xml or xl/styles.xml is missing or damaged); "
-     "open it in a spreadsheet program and save it as .xlsx again"},
+     "holds no workbook that can be read (its workbook part or style sheet is missing or damaged, "
+     "or it is a document of another kind); open it in a spreadsheet program and save it as .xlsx "
+     "again"},
 };
 
 constexpr const char* kDamaged =
