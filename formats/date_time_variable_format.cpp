@@ -55,8 +55,8 @@ IVariableFormat::FormatType DateTimeVariableFormat::GetType() const { return For
 bool DateTimeVariableFormat::GetAuto() const { return autoFormat; }
 
 IString* DateTimeVariableFormat::FormatValue(double value, bool) const {
-    static icu::UnicodeString output;
-    static std::string utf8;
+    thread_local icu::UnicodeString output;
+    thread_local std::string utf8;
     output.remove();
     if (!formatter) formatter = createICUFormatter(pattern.text());
     formatter->format(icuMilliseconds(value), output);

@@ -16,13 +16,13 @@ namespace {
 // The decimal point of the environment's locale, determined once per process. Only LC_NUMERIC
 // counts; when its locale is not installed, the result is ".".
 char environmentDecimalPoint() {
-    static std::string output_decimal;
-    if (output_decimal.empty()) {
+    static const char output_decimal = [] {
         const locale_t numbers = newlocale(LC_NUMERIC_MASK, "", nullptr);
-        output_decimal.assign(1, numbers ? *nl_langinfo_l(RADIXCHAR, numbers) : '.');
+        const char point = numbers ? *nl_langinfo_l(RADIXCHAR, numbers) : '.';
         if (numbers) freelocale(numbers);
-    }
-    return output_decimal[0];
+        return point;
+    }();
+    return output_decimal;
 }
 
 }  // namespace

@@ -17,7 +17,7 @@ constexpr char kTypeName[] = "xlsx";
 bool IsMicrosoftXLSXFile(const char* fileName) { return hasXlsxExtension(textOrEmpty(fileName)); }
 
 const char* GetDataProviderFiletype(const char* fileName) {
-    static char fileType[sizeof kTypeName];
+    thread_local char fileType[sizeof kTypeName];
     // The buffer always holds the name; a zero as its first byte makes it empty.
     std::memcpy(fileType, kTypeName, sizeof kTypeName);
     if (!IsMicrosoftXLSXFile(fileName)) fileType[0] = '\0';

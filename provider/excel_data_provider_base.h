@@ -43,8 +43,8 @@ enum class ColumnType : int { Numeric = 0, Text = 1, Automatic = 2 };
 //   rows.cpp                      row layout
 //   columns.cpp                   columns on demand, and conversion
 //
-// One provider is used by one thread at a time; the static settings are
-// shared by all providers of the process, without locks.
+// One provider is used by one thread at a time; the static settings are shared by all providers of
+// the process, without locks: no thread may change one while others work.
 class DPXLSX_API ExcelDataProviderBase : public IExcelDataProvider,
                                          public IWorksheetFinder,
                                          public IVariableFinder {

@@ -30,24 +30,27 @@ struct CloseText {
     void operator()(UText* text) const { utext_close(text); }
 };
 
-// One iterator serves all calls, because creating one takes far longer than walking a name.
-const std::shared_ptr<icu::BreakIterator>& breakIterator() {
-    static UErrorCode status = U_ZERO_ERROR;
-    static const std::shared_ptr<icu::BreakIterator> iterator(
-        icu::BreakIterator::createCharacterInstance(icu::Locale::getDefault(), status));
-    return iterator;
+// One iterator serves all calls of a thread, because creating one takes far longer than walking a
+// name. Null when ICU makes none.
+icu::BreakIterator* breakIterator() {
+    thread_local const std::unique_ptr<icu::BreakIterator> iterator = [] {
+        UErrorCode status = U_ZERO_ERROR;
+        return std::unique_ptr<icu::BreakIterator>(
+            icu::BreakIterator::createCharacterInstance(icu::Locale::getDefault(), status));
+    }();
+    return iterator.get();
 }
 
 // The iterator over the characters of `text`, which the caller keeps until the next call; null when
 // there is none.
 icu::BreakIterator* charactersOf(std::string_view text) {
-    const auto& iterator = breakIterator();
+    icu::BreakIterator* const iterator = breakIterator();
     if (!iterator) return nullptr;
     UErrorCode status = U_ZERO_ERROR;
     const std::unique_ptr<UText, CloseText> walked(
         utext_openUTF8(nullptr, text.data(), static_cast<std::int64_t>(text.size()), &status));
     iterator->setText(walked.get(), status);
-    return U_FAILURE(status) ? nullptr : iterator.get();
+    return U_FAILURE(status) ? nullptr : iterator;
 }
 
 // Every byte is a character of its own; only a carriage return may join with a line feed.

@@ -7,11 +7,13 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/paths.h"
+
 // The rows of a table of cases in tests/cases: columns between bars, the first one the case's name.
 // Lines that begin with a hash are comments; \n, \r, \t, \0, \xNN and \\ stand for the characters.
 inline std::vector<std::vector<std::string>> caseTable(const std::string& name) {
     std::vector<std::vector<std::string>> rows;
-    std::ifstream file(std::string(DPXLSX_TEST_CASES) + "/" + name);
+    std::ifstream file(casesFile(name));
     for (std::string line; std::getline(file, line);) {
         if (line.empty() || line[0] == '#') continue;
         rows.emplace_back(1);

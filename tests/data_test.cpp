@@ -7,6 +7,7 @@
 #include <memory>
 #include <set>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -19,7 +20,9 @@
 #include "dpxlsx/model/host/i_string.h"
 #include "dpxlsx/model/host/i_worksheet.h"
 #include "dpxlsx/model/host/reference.h"
+#include "testkit/package_builder.h"
 #include "testkit/providers.h"
+#include "tests/paths.h"
 #include "tests/temporary_files.h"
 
 namespace {
@@ -117,7 +120,7 @@ json imported(const std::string& path, int rules = 0) {
 class DataTest : public TemporaryFiles, public testing::WithParamInterface<std::string> {};
 
 TEST_P(DataTest, GivesWhatOtherReadersFindInIt) {
-    const std::filesystem::path path = std::filesystem::path(DPXLSX_TEST_DATA) / GetParam();
+    const std::filesystem::path path = dataFile(GetParam());
     std::ifstream stored(std::filesystem::path(path).replace_extension(".expected.json"));
     const json expected = json::parse(stored);
     // A text may be cut within a character; the rest of that character becomes U+FFFD here.
@@ -138,9 +141,9 @@ class PackageTest : public DataTest {};
 // What the standard changes in the files is in standard_data.json, as patches: the values that other
 // programs read.
 TEST_P(PackageTest, GivesTheSameByTheStandardOrWhatItCures) {
-    const std::filesystem::path path = std::filesystem::path(DPXLSX_TEST_DATA) / GetParam();
+    const std::filesystem::path path = dataFile(GetParam());
     std::ifstream stored(std::filesystem::path(path).replace_extension(".expected.json"));
-    std::ifstream cured(DPXLSX_TEST_CASES "/standard_data.json");
+    std::ifstream cured(casesFile("standard_data.json"));
     const json patches = json::parse(cured);
     json expected = withoutDisplay(json::parse(stored));
     if (patches.contains(GetParam())) expected = expected.patch(patches[GetParam()]);
@@ -150,10 +153,42 @@ TEST_P(PackageTest, GivesTheSameByTheStandardOrWhatItCures) {
 
 std::vector<std::string> dataFiles(const std::set<std::string>& extensions) {
     std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::directory_iterator(DPXLSX_TEST_DATA))
+    for (const auto& entry : std::filesystem::directory_iterator(dataFile("")))
         if (extensions.count(entry.path().extension()) != 0) names.push_back(entry.path().filename().string());
     std::sort(names.begin(), names.end());
     return names;
+}
+
+class ThreadsTest : public TemporaryFiles {};
+
+#ifdef __SANITIZE_THREAD__
+constexpr int kOpens = 500;  // in each thread
+#else
+constexpr int kOpens = 25;
+#endif
+
+// What a host gets of a workbook, damaged or not.
+std::string outcome(const std::string& path) try {
+    const std::string type = dp::GetDataProviderFiletype(path.c_str());
+    return type + imported(path).dump(-1, ' ', false, json::error_handler_t::replace);
+} catch (const CmXmlException& error) {
+    return std::to_string(error.code());
+}
+
+TEST_F(ThreadsTest, DoNotNoticeEachOther) {
+    testkit::PackageBuilder::of({"<row><c><v>1</v></c></row><row"}).write(file("damaged.xlsx"));
+    std::vector<std::string> paths = {file("damaged.xlsx")};
+    for (const std::string& name : dataFiles({".xlsx"})) paths.push_back(dataFile(name));
+    std::vector<std::string> expected(paths.size());
+    std::transform(paths.begin(), paths.end(), expected.begin(), outcome);
+    const auto import = [&](std::size_t first) {
+        for (int open = 0; open < kOpens; ++open) {
+            const std::size_t at = (first + static_cast<std::size_t>(open)) % paths.size();
+            EXPECT_EQ(outcome(paths[at]), expected[at]) << paths[at];
+        }
+    };
+    std::vector<std::jthread> threads;
+    for (std::size_t thread = 0; thread < 8; ++thread) threads.emplace_back(import, thread * 5);
 }
 
 std::string testName(const testing::TestParamInfo<std::string>& file) {

@@ -15,6 +15,7 @@
 #include "dpxlsx/formats/number_format_code.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/model/host/i_string.h"
+#include "tests/paths.h"
 
 namespace dp {
 namespace {
@@ -42,7 +43,7 @@ std::string kindOf(const std::string& code) {
 
 // Each row is what other programs show; one with a reason where that is not what is wanted.
 TEST(NumberFormatCodes, ShowWhatOtherProgramsShow) {
-    std::ifstream file(DPXLSX_TEST_DATA "/number_format_codes.json");
+    std::ifstream file(dataFile("number_format_codes.json"));
     const nlohmann::json table = nlohmann::json::parse(file);
     ASSERT_GT(table["codes"].size(), 400u);
     for (const auto& row : table["codes"]) {

@@ -11,7 +11,7 @@ class IDataProvider;
 extern "C" {
 
 // "xlsx" when IsMicrosoftXLSXFile is true of the name, else the empty text; never null. The text
-// belongs to the library, is shared by all calls of the process and valid until the next one.
+// belongs to the library, is shared by all calls of a thread and valid until the next one.
 DPXLSX_API const char* GetDataProviderFiletype(const char* fileName);
 
 // True when the last element of the path has the extension ".xlsx" in any letter case. The file

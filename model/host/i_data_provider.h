@@ -20,7 +20,8 @@
 // and copied; a null text counts as the empty text. Settings and options hold for columns that are
 // loaded from then on, unless an operation says otherwise.
 //
-// One thread at a time uses the library, whatever the number of providers.
+// A provider, with all that it hands out, is used by one thread at a time. Different providers may
+// work in different threads at once while no thread changes a setting of the process.
 namespace dp {
 
 class IAnalysis;

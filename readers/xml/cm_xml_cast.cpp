@@ -89,8 +89,8 @@ ScannedInteger scanInteger(const char* text) {
 CmXmlCast* CmXmlCast::m_pInstance = nullptr;
 
 CmXmlCast& CmXmlCast::instance() {
-    if (!m_pInstance) m_pInstance = new CmXmlCast;
-    return *m_pInstance;
+    static CmXmlCast& made = *(m_pInstance = new CmXmlCast);
+    return made;
 }
 
 void CmXmlCast::mCast(double& value, const char* text) const {
