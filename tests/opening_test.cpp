@@ -128,7 +128,11 @@ TEST_F(Opening, UnpacksIntoAPrivateDirectoryThatGoesAgain) {
               ". C: C:/b:c book.xlsx docs docs/deep docs/deep/er docs/deep/er/a.txt xl xl/_rels "
               "xl/_rels/workbook.xml.rels xl/styles.xml xl/workbook.xml xl/worksheets "
               "xl/worksheets/sheet1.xml ");
+    dp::ExternalDataRecordCell dated;
+    dated.formatIndex = 12;  // of the short date
+    EXPECT_TRUE(provider.IsDateTimeFormatType(dated));
     EXPECT_EQ(provider.CloseFile(), 0);
+    EXPECT_FALSE(provider.IsDateTimeFormatType(dated)) << "the styles go with the file";
     EXPECT_FALSE(fs::exists(directory));
     EXPECT_EQ(provider.GetTempDirectoryPath(), "");
     EXPECT_EQ(provider.GetWorksheetPrimeKeys()->Count(), 2UL) << "the cells stay";

@@ -141,6 +141,8 @@ TEST_F(XmlReading, FailsWithOneCodeOrNotAtAll) {
                  {"marks in one behind odd markup",
                   marked("<!DOCTYPE a [<!--'-->]><a b='>'><!-->--><?c '?><!--'--><![CDATA[@]]></a>"), 0},
                  {"a CDATA section in front of attributes", repeated(9'000, "b", "<a><![CDATA[]]><b @/></a>"), 13},
+                 {"marks in one, and in attributes behind it",
+                  marked("<a><![CDATA[@]]>") + repeated(9'000, "b", "<b @/></a>"), 13},
                  {"one in a comment", repeated(9'000, "b", "<a><!--<![CDATA[--><b @/></a>"), 13},
                  {"one in an instruction", repeated(9'000, "b", "<a><?c <![CDATA[?><b @/></a>"), 13},
                  {"one by its bytes", repeated(9'000, "b", japanese + "<a>\x1B$B<![CDATA[x\x1B(B<b @/></a>"), 13},

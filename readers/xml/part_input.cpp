@@ -16,7 +16,6 @@
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/markup_marks.h"
 #include "dpxlsx/readers/xml/part_text.h"
-#include "dpxlsx/readers/xml/silence.h"
 
 namespace dp {
 
@@ -156,9 +155,13 @@ void noteText(void* payload, void* found, const xmlChar*) {
 
 }  // extern "C"
 
+// On its own libxml2 does this when it is first used, and two threads may do that at once.
+void initialiseLibxml2() { [[maybe_unused]] static const bool done = (xmlInitParser(), true); }
+
 }  // namespace
 
 xmlTextReaderPtr openDocument(const std::string& path) {
+    initialiseLibxml2();
     auto input = std::make_unique<PartInput>(path);
     if (!input->isOpen()) return nullptr;
     PartInput* const watching = input.get();
@@ -169,8 +172,6 @@ xmlTextReaderPtr openDocument(const std::string& path) {
         xmlReaderForIO(readPart, closePart, input.release(), nullptr, nullptr, options);
     if (!reader) return nullptr;
     watching->watch(reader);
-    // The options alone do not keep libxml2 quiet: it still prints a line for a text of over 10 MB.
-    xmlTextReaderSetStructuredErrorHandler(reader, SilentLibxml2::ignore, nullptr);
     return reader;
 }
 
