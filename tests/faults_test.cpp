@@ -12,8 +12,10 @@
 #include "dpxlsx/provider/unpacking_limits.h"
 #include "dpxlsx/provider/xlsx_data_provider.h"
 #include "dpxlsx/readers/xml/file_copy.h"
+#include "dpxlsx/readers/xml/xml_reader.h"
 #include "testkit/package_builder.h"
 #include "testkit/process_settings.h"
+#include "testkit/recording_provider.h"
 #include "testkit/zip_writer.h"
 #include "tests/temporary_files.h"
 
@@ -27,6 +29,7 @@ std::deque<std::uint64_t> freeBytes;
 std::function<bool()> copies = [] { return true; };  // called once; false makes the call fail
 bool slow = false;                                   // reads and writes are interrupted and transfer one byte at a time
 bool closes = true;                                  // called once; false makes the call fail
+int soundReads = -1;                                 // reads before one fails; -1 when none fails or it has failed
 
 constexpr std::uint64_t kNoBlocks = 0;  // free bytes of a file system that does not count them
 
@@ -59,6 +62,10 @@ extern "C" int statvfs(const char* path, struct statvfs* status) noexcept {
 // Replaces the function for the library only; the C++ library does not see it.
 extern "C" ssize_t read(int file, void* bytes, std::size_t size) {
     static const auto real = realOne(&read, "read");
+    if (soundReads >= 0 && soundReads-- == 0) {
+        errno = EIO;
+        return -1;
+    }
     return interrupted() ? -1 : real(file, bytes, slow ? std::min<std::size_t>(size, 1) : size);
 }
 extern "C" ssize_t write(int file, const void* bytes, std::size_t size) {
@@ -187,6 +194,32 @@ TEST_F(Faults, OfSlowAndBadDisks) {
     copies = [] { return false; };
     EXPECT_FALSE(dp::copyFile(good(), file("copy.xlsx")));
     EXPECT_FALSE(fs::exists(file("copy.xlsx")));
+}
+
+// A plain part is read again when reading it fails, so that an open may well succeed: with everything that is there.
+TEST_F(Faults, OfEveryRead) {
+    const PackageBuilder package = PackageBuilder::of({"<row><c><v>1</v></c></row><row><c t='s'><v>1</v></c></row>"});
+    PackageBuilder(package)
+        .set("xl/sharedStrings.xml", "<sst uniqueCount='2'><si><t>a</t></si><si><t>b</t></si></sst>")
+        .write(file("texts.xlsx"));
+    testkit::RecordingProvider recording;
+    int reads = 0;
+    for (bool failed = true; failed; ++reads) {
+        soundReads = reads;
+        bool opened = false;
+        try {
+            opened = recording.OpenFile(file("texts.xlsx").c_str(), dp::IDataProvider::FileAccess::Read) == 0;
+        } catch (const CmXmlException&) {
+        }
+        failed = std::exchange(soundReads, -1) < 0;
+        EXPECT_TRUE(opened || failed) << "read " << reads;
+        const std::string calls = recording.taken();
+        if (opened) EXPECT_EQ(calls, "+S1 @0 0,0=1 1,0='b' @0") << "read " << reads;
+        recording.CloseFile();
+        recording.ClearWorksheets();
+        EXPECT_TRUE(fs::is_empty(temporary())) << "read " << reads;
+    }
+    EXPECT_GT(reads, 10);
 }
 
 TEST_F(Faults, OfPackagesBeyondTheLimits) {
