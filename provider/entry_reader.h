@@ -8,9 +8,10 @@
 namespace dp {
 
 // The bytes of an archive's entries. minizip finds the entry and checks its headers; ISA-L, where
-// the library is built with it, inflates several times as fast as zlib does. The results are the
-// same, with one exception: ISA-L takes incomplete Huffman codes, which zlib refuses and no program
-// writes. A damaged entry that has them still fails, by its size or sum.
+// the library is built with it, inflates several times as fast as zlib does. An entry that is not
+// deflated, or that ISA-L finds damaged, is left to minizip, so that the results are the same, with
+// one exception: ISA-L takes incomplete Huffman codes, which zlib refuses and no program writes. An
+// entry that has them is read if its bytes have the sum that its header claims.
 class EntryReader {
   public:
     explicit EntryReader(unzFile archive);
@@ -30,6 +31,7 @@ class EntryReader {
     struct Inflating;
 
     int inflateSome(char* bytes, unsigned size);
+    int leaveToMinizip();
 
     unzFile archive_;
     std::unique_ptr<Inflating> inflating_;

@@ -22,12 +22,14 @@ const Bytef* bytesOf(std::string_view text) { return reinterpret_cast<const Byte
 void ZipWriter::add(const Entry& entry) {
     begin(entry.name, entry.deflated);
     write(entry.content);
-    end(entry.wrongSum ? ~written_.sum : written_.sum,
-        entry.claimedSize ? entry.claimedSize : written_.size);
+    if (entry.claimedMethod) written_.method = entry.claimedMethod;
+    const std::uint32_t sum = entry.claimedSum ? entry.claimedSum : written_.sum;
+    end(entry.wrongSum ? ~sum : sum, entry.claimedSize ? entry.claimedSize : written_.size);
 }
 
 void ZipWriter::begin(const std::string& name, bool deflated) {
-    written_ = {name, deflated, local_.size(), local_.size() + kHeader + name.size()};
+    const unsigned method = deflated ? Z_DEFLATED : 0;
+    written_ = {name, deflated, method, local_.size(), local_.size() + kHeader + name.size()};
     local_.resize(written_.content);  // the header comes when the sizes are known
     if (deflated && deflateInit2(&written_.stream, Z_BEST_SPEED, Z_DEFLATED, -MAX_WBITS, 8,
                                  Z_DEFAULT_STRATEGY) != Z_OK)
@@ -65,7 +67,7 @@ void ZipWriter::end(std::uint32_t sum, std::size_t size) {
     std::string common;
     put(common, 20, 2);  // version needed
     put(common, 0, 2);   // flags
-    put(common, written_.deflated ? Z_DEFLATED : 0, 2);
+    put(common, written_.method, 2);
     put(common, 0x21 << 16, 4);  // 1980-01-01, the first date of the format
     put(common, sum, 4);
     put(common, local_.size() - written_.content, 4);

@@ -17,7 +17,10 @@ class ZipWriter {
         std::string content;
         bool deflated = true;
         bool wrongSum = false;
-        std::uint32_t claimedSize = 0;  // bytes unpacked; 0 for the truth
+        // What the headers say; 0 for the truth.
+        std::uint32_t claimedSize = 0;  // bytes unpacked
+        std::uint32_t claimedSum = 0;
+        unsigned claimedMethod = 0;
     };
 
     void add(const Entry& entry);
@@ -35,6 +38,7 @@ class ZipWriter {
     struct Written {
         std::string name;
         bool deflated = true;
+        unsigned method = 0;      // as the headers say
         std::size_t start = 0;    // of its header
         std::size_t content = 0;  // where its packed bytes start
         std::uint32_t sum = 0;
