@@ -39,11 +39,14 @@ def part(name, content):
 
 
 def sources(stem, name, content):
-    """A part that is read both ways, in windows and a few bytes at a time."""
+    """A part that is read both ways, in windows and a few bytes at a time. The first byte with its
+    lowest bit is the size of a small window."""
     if name in (PARTS[2], PARTS[4]):
         strings = int(name == PARTS[2])
         yield "sources", stem, bytes([strings, 0]) + content
-        yield "sources", stem + "-by-few", bytes([strings, 1 + len(content) % 7]) + content
+        for step in (1, 2, 3, 7):
+            yield "sources", f"{stem}-by-{step}", bytes([strings, step]) + content
+        yield "sources", stem + "-small-window", bytes([strings + 14, 0]) + content
 
 
 def entry(name, content, bits=0, extra=b""):

@@ -1,129 +1,29 @@
 // A worksheet or shared-string part read both ways: by the reader of plain parts and by libxml2's.
-// The first byte chooses the part and the second how many bytes are read at a time.
+// The first byte chooses the part and the window, the second how many bytes are read at a time.
 
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
 #include <iterator>
-#include <memory>
 #include <random>
 #include <string>
 #include <string_view>
-#include <vector>
 
-#include "dpxlsx/formats/format_codes.h"
-#include "dpxlsx/model/host/reference.h"
-#include "dpxlsx/readers/xlsx/any_shared_strings.h"
-#include "dpxlsx/readers/xlsx/any_worksheet.h"
-#include "dpxlsx/readers/xlsx/cell_assembler.h"
-#include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
-#include "dpxlsx/readers/xlsx/plain_shared_strings.h"
-#include "dpxlsx/readers/xlsx/plain_worksheet.h"
+#include "fuzz/both_ways.h"
 #include "fuzz/checks.h"
 #include "fuzz/input.h"
-#include "testkit/package_builder.h"
-#include "testkit/recording_provider.h"
 #include "testkit/workspace.h"
-
-namespace {
-
-enum class End { Whole, NotPlain, Error };
-
-struct Outcome {
-    End end;
-    std::vector<std::string> records;
-};
-
-// The reader of a sound package, whose shared strings and styles the cells of any worksheet part
-// refer to.
-class Package {
-  public:
-    Package() : provider_(new testkit::RecordingProvider) {
-        const std::string directory = fuzz::ownFiles() + "/package";
-        testkit::PackageBuilder::small().unpackTo(directory);
-        reader_ = std::make_unique<dp::ExcelXLSXReader>(directory, true, dp::GetShortDateMask(),
-                                                        0.0, provider_.get(), nullptr);
-        reader_->mReadExcelWorkbook();
-    }
-
-    template <class Read>
-    Outcome readWorksheet(const Read& read) {
-        provider_->ClearWorksheets();
-        provider_->AddWorksheet("S");
-        provider_->SetWorksheetIndex(0);
-        provider_->takenCalls();
-        End end = End::Error;
-        try {
-            dp::CellAssembler cells(*reader_);
-            end = cells.take([&] { return read(cells); }) ? End::Whole : End::NotPlain;
-        } catch (const CmXmlException& e) {
-            fuzz::require(e.code() == kXmlError, "another code");
-        }
-        return {end, provider_->takenCalls()};
-    }
-
-  private:
-    dp::Reference<testkit::RecordingProvider> provider_;
-    std::unique_ptr<dp::ExcelXLSXReader> reader_;
-};
-
-template <class Read>
-Outcome readSharedStrings(const Read& read) {
-    End end = End::Error;
-    dp::SharedStringTable table;
-    try {
-        end = read(table) ? End::Whole : End::NotPlain;
-    } catch (const CmXmlException& e) {
-        fuzz::require(e.code() == kXmlError, "another code");
-    }
-    Outcome outcome{end, {}};
-    for (std::size_t i = 0; i < table.size(); ++i) outcome.records.emplace_back(table[i]);
-    return outcome;
-}
-
-bool beginsWith(const std::vector<std::string>& longer, const std::vector<std::string>& shorter) {
-    return longer.size() >= shorter.size() &&
-           std::equal(shorter.begin(), shorter.end(), longer.begin());
-}
-
-void compare(const Outcome& plain, const Outcome& any) {
-    if (plain.end == End::Whole) fuzz::require(any.end == End::Whole, "plain, but an error");
-    if (plain.end == End::Error) fuzz::require(any.end == End::Error, "an error, but sound");
-    if (plain.end == End::Whole)
-        return fuzz::require(plain.records == any.records, "other records");
-    // libxml2 finds errors before it hands out what stands before them.
-    fuzz::require(beginsWith(any.records, plain.records) ||
-                      (any.end == End::Error && beginsWith(plain.records, any.records)),
-                  "another beginning");
-}
-
-void readBothWays(bool strings, std::size_t chunk, const std::string& path) {
-    static Package package;
-    if (strings)
-        compare(readSharedStrings(
-                    [&](auto& table) { return dp::readPlainSharedStrings(path, table, chunk); }),
-                readSharedStrings([&](auto& table) {
-                    dp::readAnySharedStrings(path, table);
-                    return true;
-                }));
-    else
-        compare(package.readWorksheet(
-                    [&](auto& cells) { return dp::readPlainWorksheet(path, cells, chunk); }),
-                package.readWorksheet([&](auto& cells) {
-                    dp::readAnyWorksheet(path, cells);
-                    return true;
-                }));
-}
-
-}  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     static const std::string path = fuzz::ownFiles() + "/part.xml";
     fuzz::Input input(data, size);
-    const bool strings = input.flag();
-    const std::size_t step = input.byte();
-    testkit::writeFile(path, input.rest());
-    readBothWays(strings, step == 0 ? dp::PlainXml::kWindow : step, path);
+    const unsigned kind = input.byte();
+    const unsigned step = input.byte();
+    const std::string part = input.rest();
+    testkit::writeFile(path, part);
+    dp::ReadingWindow window = fuzz::windowOf(step, part.size());
+    if (kind > 1) window.size = 8 * std::size_t{kind / 2};
+    fuzz::readBothWays((kind & 1) != 0, path, window);
     return 0;
 }
 
@@ -292,6 +192,8 @@ extern "C" std::size_t LLVMFuzzerCustomMutator(std::uint8_t* data, std::size_t s
     if (size < kHead || random() % 4 == 0) return LLVMFuzzerMutate(data, size, largest);
     std::string part(reinterpret_cast<const char*>(data) + kHead, size - kHead);
     for (unsigned i = 0; i <= random() % 3; ++i) change(part, random);
+    if (random() % 8 == 0) data[0] = static_cast<std::uint8_t>(random());
+    if (random() % 8 == 0) data[0] &= 1;  // the window that the library has
     if (random() % 4 == 0) data[1] = static_cast<std::uint8_t>(random() % 16);
     part.resize(std::min(part.size(), largest - kHead));
     std::memcpy(data + kHead, part.data(), part.size());

@@ -14,8 +14,8 @@ class PlainXmlNodes : public TemporaryFiles {
 
     // The nodes of a document as they would be written, each value of an attribute `a` behind the name,
     // or "!" from where it is not plain.
-    std::string read(const std::string& document, std::size_t chunk) {
-        dp::PlainXml xml(chunk);
+    std::string read(const std::string& document, dp::ReadingWindow window = {}) {
+        dp::PlainXml xml(window);
         if (!xml.open(write("part.xml", document))) return "!";
         std::string nodes;
         for (Node node = xml.next(); node != Node::Finished; node = xml.next()) {
@@ -35,8 +35,8 @@ class PlainXmlNodes : public TemporaryFiles {
 // However the bytes arrive.
 TEST_F(PlainXmlNodes, AreThoseOfTheDocument) {
     for (const auto& c : caseTable("plain_xml.txt"))
-        for (const std::size_t chunk : {1U, 2U, 3U, 5U, 7U, 64U, 1U << 20})
-            EXPECT_EQ(read(c[1], chunk), c[2]) << c[0] << ", " << chunk << " bytes at a time";
+        for (const std::size_t step : {1U, 2U, 3U, 5U, 7U, 64U, 1U << 20})
+            EXPECT_EQ(read(c[1], {dp::ReadingWindow().size, step}), c[2]) << c[0] << ", " << step << " bytes at a time";
 }
 
 // Below what libxml2 and the readers allow, a document is left to them.
@@ -56,15 +56,15 @@ TEST_F(PlainXmlNodes, AreNotReadNearALimit) {
         {"bytes of a tag", within("<e a='" + std::string(8000, 'x') + "'/>"),
          within("<e a='" + std::string(8200, 'x') + "'/>")},
         {"attributes", within("<e " + repeated("aN='' ", 48) + "/>"), within("<e " + repeated("aN='' ", 49) + "/>")},
-        {"bytes of a text", within(std::string(dp::PlainXml::kWindow - 8, 'x')),
-         within(std::string(dp::PlainXml::kWindow + 1, 'x'))},
+        {"bytes of a text", within(std::string(dp::ReadingWindow().size - 8, 'x')),
+         within(std::string(dp::ReadingWindow().size + 1, 'x'))},
         {"bytes of names", within(repeated("<eN/>", 60'000)), within(repeated("<elementN/>", 60'000))},
         {"bytes of blank texts", within(repeated("<e/>    ", 100'000)), ""},
     };
     for (const auto& c : kCases) {
-        EXPECT_NE(read(c.plain, dp::PlainXml::kWindow).back(), '!') << c.name;
+        EXPECT_NE(read(c.plain).back(), '!') << c.name;
         if (c.beyond.empty()) continue;
-        EXPECT_EQ(read(c.beyond, dp::PlainXml::kWindow).back(), '!') << c.name;
+        EXPECT_EQ(read(c.beyond).back(), '!') << c.name;
     }
 }
 

@@ -83,8 +83,9 @@ class PlainSharedStrings {
 
 }  // namespace
 
-bool readPlainSharedStrings(const std::string& path, SharedStringTable& table, std::size_t chunk) {
-    PlainXml xml(chunk);
+bool readPlainSharedStrings(const std::string& path, SharedStringTable& table,
+                            ReadingWindow window) {
+    PlainXml xml(window);
     SharedStringEntries entries(table, path);
     return xml.open(path) && PlainSharedStrings(xml, entries).run();
 }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
 
 #include "dpxlsx/readers/xlsx/shared_string_table.h"
@@ -11,6 +10,6 @@ namespace dp {
 // Reads a plain shared-string part into an empty table, several times as fast as
 // readAnySharedStrings does. False, and the table is of no use, when the part is not plain.
 bool readPlainSharedStrings(const std::string& path, SharedStringTable& table,
-                            std::size_t chunk = PlainXml::kWindow);
+                            ReadingWindow window = {});
 
 }  // namespace dp

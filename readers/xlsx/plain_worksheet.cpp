@@ -128,8 +128,8 @@ class PlainWorksheet {
 
 }  // namespace
 
-bool readPlainWorksheet(const std::string& path, CellAssembler& cells, std::size_t chunk) {
-    PlainXml xml(chunk);
+bool readPlainWorksheet(const std::string& path, CellAssembler& cells, ReadingWindow window) {
+    PlainXml xml(window);
     return xml.open(path) && PlainWorksheet(xml, cells).run();
 }
 

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
 
 #include "dpxlsx/readers/xml/plain_xml.h"
@@ -11,7 +10,6 @@ class CellAssembler;
 
 // Does what readAnyWorksheet does for a plain part, several times as fast. False when the part
 // turned out not to be plain; `cells` has got what came before that.
-bool readPlainWorksheet(const std::string& path, CellAssembler& cells,
-                        std::size_t chunk = PlainXml::kWindow);
+bool readPlainWorksheet(const std::string& path, CellAssembler& cells, ReadingWindow window = {});
 
 }  // namespace dp

@@ -191,7 +191,7 @@ std::size_t slotOf(std::string_view text, std::size_t slots) {
 
 }  // namespace
 
-PlainXml::PlainXml(std::size_t chunk) : chunk_(chunk) {}
+PlainXml::PlainXml(ReadingWindow window) : window_(window) {}
 
 PlainXml::~PlainXml() {
     if (descriptor_ >= 0) ::close(descriptor_);
@@ -200,7 +200,7 @@ PlainXml::~PlainXml() {
 bool PlainXml::open(const std::string& path) {
     descriptor_ = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
     if (descriptor_ < 0) return false;
-    buffer_.reset(new char[kWindow + kZeros]);
+    buffer_.reset(new char[window_.size + kZeros]);
     at_ = end_ = buffer_.get();
     constexpr std::ptrdiff_t kLongestBeginning = 256;
     while (end_ - at_ < kLongestBeginning && fill()) {
@@ -215,7 +215,7 @@ bool PlainXml::open(const std::string& path) {
 // the file and when the window is full.
 bool PlainXml::fill() {
     const auto kept = static_cast<std::size_t>(end_ - at_);
-    const std::size_t size = std::min(chunk_, kWindow - kept);
+    const std::size_t size = std::min(window_.step, window_.size - kept);
     if (endOfFile_ || size == 0) return false;
     std::memmove(buffer_.get(), at_, kept);
     at_ = buffer_.get();

@@ -11,6 +11,15 @@
 
 namespace dp {
 
+// How a document comes into memory. A test makes both sizes small, so that the edges fall
+// everywhere.
+struct ReadingWindow {
+    // Bytes of the file in memory at a time. Longer tags and texts are not plain.
+    std::size_t size = std::size_t{256} << 10;
+    // Bytes that are read at most at a time.
+    std::size_t step = std::size_t{256} << 10;
+};
+
 // Reads XML as spreadsheet programs write it, several times as fast as libxml2's text reader.
 //
 // It accepts only what is well-formed beyond doubt and means the same to libxml2: UTF-8, elements,
@@ -29,11 +38,7 @@ class PlainXml {
         NotPlain,
     };
 
-    // Bytes of the file in memory at a time. Longer tags and texts are not plain.
-    static constexpr std::size_t kWindow = std::size_t{256} << 10;
-
-    // `chunk` is how many bytes are read at most at a time.
-    explicit PlainXml(std::size_t chunk = kWindow);
+    explicit PlainXml(ReadingWindow window = {});
     ~PlainXml();
     PlainXml(const PlainXml&) = delete;
     PlainXml& operator=(const PlainXml&) = delete;
@@ -105,7 +110,7 @@ class PlainXml {
     void popElement();
     std::string_view innermost() const;
 
-    std::size_t chunk_;
+    ReadingWindow window_;
     int descriptor_ = -1;
     std::unique_ptr<char[]> buffer_;
     char* at_ = nullptr;   // where the next node begins
