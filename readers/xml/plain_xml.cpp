@@ -402,8 +402,10 @@ PlainXml::Scan PlainXml::scanText() {
 bool PlainXml::acceptTag() {
     for (std::size_t i = 0; i < attributeCount_; ++i)
         if (!isUnique(i) || !acceptAttribute(attributes_[i])) return false;
-    for (std::size_t i = 0; i < attributeCount_; ++i)
-        if (!isDeclared(split(attributes_[i].name).prefix)) return false;
+    for (std::size_t i = 0; i < attributeCount_; ++i) {
+        const std::string_view prefix = split(attributes_[i].name).prefix;
+        if (prefix != "xml" && prefix != "xmlns" && !isDeclared(prefix)) return false;
+    }
     return acceptName(name_) && isDeclared(split(name_).prefix);
 }
 
@@ -444,9 +446,11 @@ bool PlainXml::acceptAttribute(const Attribute& attribute) {
     return true;
 }
 
+// Elements with a prefix that XML itself has are not plain: `xmlns` is undeclared there, whereby
+// the whole name, prefix and all, becomes the local one.
 bool PlainXml::isDeclared(std::string_view prefix) const {
-    if (prefix.empty() || prefix == "xml" || prefix == "xmlns") return true;
-    return std::any_of(prefixes_.begin(), prefixes_.end(),
+    return prefix.empty() ||
+           std::any_of(prefixes_.begin(), prefixes_.end(),
                        [prefix](const Prefix& known) { return known.name == prefix; });
 }
 
