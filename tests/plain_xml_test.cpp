@@ -47,6 +47,12 @@ TEST_F(PlainXmlNodes, AreNotReadNearALimit) {
         return all;
     };
     const auto within = [](const std::string& text) { return "<r>" + text + "</r>"; };
+    const auto blanks = [](std::size_t bytes) { return std::string(bytes, ' '); };
+    const auto nested = [](const std::string& attributes) {
+        return "<r " + attributes + "><e " + std::regex_replace(attributes, std::regex("p"), "q") + "/></r>";
+    };
+    const std::string kDeclared = "<?xml version='1.0'?>";
+    constexpr std::size_t kWindow = dp::ReadingWindow().size;
     const struct {
         const char* name;
         std::string plain;
@@ -56,9 +62,13 @@ TEST_F(PlainXmlNodes, AreNotReadNearALimit) {
         {"bytes of a tag", within("<e a='" + std::string(8000, 'x') + "'/>"),
          within("<e a='" + std::string(8200, 'x') + "'/>")},
         {"attributes", within("<e " + repeated("aN='' ", 48) + "/>"), within("<e " + repeated("aN='' ", 49) + "/>")},
-        {"bytes of a text", within(std::string(dp::ReadingWindow().size - 8, 'x')),
-         within(std::string(dp::ReadingWindow().size + 1, 'x'))},
-        {"bytes of names", within(repeated("<eN/>", 60'000)), within(repeated("<elementN/>", 60'000))},
+        {"bytes of an end tag", "<r></r" + std::string(8000, '\n') + ">", "<r></r" + std::string(8200, '\n') + ">"},
+        {"bytes of a text", within(std::string(kWindow - 8, 'x')), within(std::string(kWindow + 1, 'x'))},
+        {"white space outside the root", kDeclared + blanks(kWindow / 2) + "<r/>" + blanks(kWindow / 2),
+         kDeclared + blanks(kWindow / 2) + "<r/>" + blanks(kWindow / 2 + 1)},
+        {"prefixes in scope", nested(repeated("xmlns:pN='u' ", 32)), nested(repeated("xmlns:pN='u' ", 33))},
+        {"bytes of namespaces", within(repeated("<e xmlns='" + std::string(80, 'u') + "N'/>", 6000)),
+         within(repeated("<e xmlns='" + std::string(90, 'u') + "N'/>", 6000))},
         {"bytes of blank texts", within(repeated("<e/>    ", 100'000)), ""},
     };
     for (const auto& c : kCases) {

@@ -17,9 +17,11 @@ namespace {
 // Well below what libxml2 and the readers allow, so that neither has to be asked.
 constexpr std::size_t kPlainDepth = kXmlDepth / 2;
 constexpr std::ptrdiff_t kPlainTag = kLongMarkup / 2;
-// libxml2 keeps every name and every blank text once, 10 MB of them, and fails beyond.
+// libxml2 keeps every name, namespace and blank text once, 10 MB of them, and fails beyond.
 constexpr std::size_t kPlainNames = 512 << 10;
-constexpr std::size_t kBriefText = 3;  // of which there are too few to count
+constexpr std::size_t kBriefText = 3;            // of which there are too few to count
+constexpr std::size_t kPlainBlanks = 256 << 10;  // bytes in front of and behind the root
+constexpr std::size_t kPlainPrefixes = 64;       // in scope; each prefix is looked for among them
 
 constexpr unsigned char kNameStart = 1;
 constexpr unsigned char kNamePart = 2;
@@ -205,9 +207,11 @@ bool PlainXml::open(const std::string& path) {
     constexpr std::ptrdiff_t kLongestBeginning = 256;
     while (end_ - at_ < kLongestBeginning && fill()) {
     }
-    std::string_view beginning(at_, static_cast<std::size_t>(end_ - at_));
-    if (readError_ || !takeBeginning(beginning)) return false;
-    at_ = end_ - beginning.size();
+    const std::string_view beginning(
+        at_, static_cast<std::size_t>(std::min(end_ - at_, kLongestBeginning)));
+    std::string_view rest = beginning;
+    if (readError_ || !takeBeginning(rest)) return false;
+    at_ += beginning.size() - rest.size();
     return true;
 }
 
@@ -250,7 +254,10 @@ PlainXml::Node PlainXml::next() {
 PlainXml::Node PlainXml::nextOutsideRoot() {
     Node node = Node::Start;
     for (;;) {
-        at_ = skip(kSpace, at_);
+        char* const markup = skip(kSpace, at_);
+        blanksOutside_ += static_cast<std::size_t>(markup - at_);
+        at_ = markup;
+        if (blanksOutside_ > kPlainBlanks) return Node::NotPlain;
         Scan scan = stopAt(at_);
         if (*at_ == '<' && !rootSeen_) scan = scanStartTag(node);
         if (scan == Scan::Complete) return node;
@@ -274,7 +281,9 @@ PlainXml::Scan PlainXml::scanEndTag() {
     name_ = {p - expected.size(), expected.size()};
     p = skip(kSpace, p);
     if (*p != '>') return stopAt(p);
-    at_ = p + 1;
+    ++p;
+    if (p - at_ > kPlainTag) return Scan::NotPlain;
+    at_ = p;
     popElement();
     return Scan::Complete;
 }
@@ -440,8 +449,10 @@ bool PlainXml::acceptAttribute(const Attribute& attribute) {
     if (!std::all_of(value.begin(), value.end(),
                      [](char c) { return is(kNamePart, c) || c == '/'; }))
         return false;
+    if (!remember(value)) return false;
     if (name.prefix.empty()) return true;
     if (name.local == "xml" || name.local == "xmlns") return false;
+    if (prefixes_.size() == kPlainPrefixes) return false;
     prefixes_.push_back({std::string(name.local), openLengths_.size()});
     return true;
 }
@@ -454,7 +465,7 @@ bool PlainXml::isDeclared(std::string_view prefix) const {
                        [prefix](const Prefix& known) { return known.name == prefix; });
 }
 
-// False when the document has too many names and blank texts.
+// False when the document has too many names, namespaces and blank texts.
 bool PlainXml::remember(std::string_view text) {
     if (text.size() <= kBriefText) return true;
     std::string& lately = lately_[slotOf(text, lately_.size())];

@@ -118,7 +118,8 @@ class PlainXml {
     bool endOfFile_ = false;
     bool readError_ = false;
     bool rootSeen_ = false;
-    bool lessIsZero_ = false;  // at_ points to a zero that stands for a '<'
+    std::size_t blanksOutside_ = 0;  // bytes of white space outside the root so far
+    bool lessIsZero_ = false;        // at_ points to a zero that stands for a '<'
     std::string_view name_;
     char* text_ = nullptr;
     char* textEnd_ = nullptr;
