@@ -214,7 +214,9 @@ TEST_F(Faults, OfEveryRead) {
         failed = std::exchange(soundReads, -1) < 0;
         EXPECT_TRUE(opened || failed) << "read " << reads;
         const std::string calls = recording.taken();
-        if (opened) EXPECT_EQ(calls, "+S1 @0 0,0=1 1,0='b' @0") << "read " << reads;
+        if (opened) {
+            EXPECT_EQ(calls, "+S1 @0 0,0=1 1,0='b' @0") << "read " << reads;
+        }
         recording.CloseFile();
         recording.ClearWorksheets();
         EXPECT_TRUE(fs::is_empty(temporary())) << "read " << reads;
