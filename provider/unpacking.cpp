@@ -1,12 +1,14 @@
 #include "dpxlsx/provider/unpacking.h"
 
 #include <fcntl.h>
+#include <string.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstdint>
+#include <iterator>
 #include <limits>
 #include <sys/stat.h>
 #include <utility>
@@ -19,6 +21,7 @@
 #include "dpxlsx/provider/entry_reader.h"
 #include "dpxlsx/provider/temporary_directory.h"
 #include "dpxlsx/provider/unpacking_limits.h"
+#include "dpxlsx/readers/xml/progress.h"
 
 // The archive's entries, one after the other, into the private directory.
 namespace dp {
@@ -90,8 +93,17 @@ class OutputFile {
 // The contents that an archive claims. Entries never unpack to more bytes than they claim.
 struct Claims {
     std::uint64_t entries = 0;
-    std::uint64_t bytes = 0;  // saturates
+    std::uint64_t bytes = 0;   // saturates
+    std::uint64_t toRead = 0;  // bytes of the entries that are named like parts that are read
 };
+
+// Whether programs give such a name to the parts of a workbook that the library reads. Others,
+// pictures and pivot caches for example, are only unpacked. A wrong guess makes progress uneven.
+bool isNameOfReadPart(const char* name) {
+    constexpr const char* kWords[] = {"sheet", "sharedStrings", "styles", "workbook"};
+    return std::any_of(std::begin(kWords), std::end(kWords),
+                       [name](const char* word) { return ::strcasestr(name, word) != nullptr; });
+}
 
 // The sum over the entries before the first damaged one; stops when there are too many.
 Claims claimsOf(unzFile archive) {
@@ -99,10 +111,14 @@ Claims claimsOf(unzFile archive) {
     for (int result = unzGoToFirstFile(archive); result == UNZ_OK;
          result = unzGoToNextFile(archive)) {
         unz_file_info64 info{};
-        if (unzGetCurrentFileInfo64(archive, &info, nullptr, 0, nullptr, 0, nullptr, 0) != UNZ_OK)
+        std::array<char, kLongestName + 1> name{};
+        if (unzGetCurrentFileInfo64(archive, &info, name.data(), kLongestName, nullptr, 0, nullptr,
+                                    0) != UNZ_OK)
             break;
         const std::uint64_t room = std::numeric_limits<std::uint64_t>::max() - claims.bytes;
-        claims.bytes += std::min<std::uint64_t>(info.uncompressed_size, room);
+        const auto bytes = std::min<std::uint64_t>(info.uncompressed_size, room);
+        claims.bytes += bytes;
+        if (isNameOfReadPart(name.data())) claims.toRead += bytes;
         if (++claims.entries > kPackageEntries) break;
     }
     return claims;
@@ -122,10 +138,11 @@ class Unpacking {
         const std::uint64_t space = freeSpace(directory_);
         spareSpace_ = space / kSpareSpaceDivisor;
         struct stat status {};
-        if (::stat(archivePath_.c_str(), &status) != 0 ||
-            exceedsLimits(claimsOf(archive_), static_cast<std::uint64_t>(status.st_size),
-                          space - spareSpace_))
+        if (::stat(archivePath_.c_str(), &status) != 0) return PackageStatus::TooLarge;
+        const Claims claims = claimsOf(archive_);
+        if (exceedsLimits(claims, static_cast<std::uint64_t>(status.st_size), space - spareSpace_))
             return PackageStatus::TooLarge;
+        Progress::expect(claims.bytes, claims.toRead);
         package_ = identityOf(status);
         const int result = unpackEntries();
         if (spaceIsShort_) return PackageStatus::TooLarge;
@@ -144,6 +161,7 @@ class Unpacking {
     }
 
     int unpackEntry() {
+        count(0);  // an entry takes its time even when it is empty
         std::array<char, kLongestName + 1> name{};
         const int result = unzGetCurrentFileInfo64(archive_, nullptr, name.data(), kLongestName,
                                                    nullptr, 0, nullptr, 0);
@@ -186,11 +204,18 @@ class Unpacking {
         OutputFile file(path, package_);
         if (!file.isOpen()) return kEntryFailed;
         int size = 0;
-        while ((size = reader_.read(buffer_.data(), buffer_.size())) > 0)
-            if (!hasSpaceFor(size) || !file.write(buffer_.data(), static_cast<std::size_t>(size)))
-                return kEntryFailed;
+        while ((size = reader_.read(buffer_.data(), buffer_.size())) > 0) {
+            const auto bytes = static_cast<std::size_t>(size);
+            if (!hasSpaceFor(size) || !file.write(buffer_.data(), bytes)) return kEntryFailed;
+            count(bytes);
+        }
         if (!file.close()) return kEntryFailed;
         return size;
+    }
+
+    static void count(std::size_t bytes) {
+        Progress::countUnpacked(bytes);
+        Progress::tell();
     }
 
     // Asked again and again, because other processes write to the same file system.

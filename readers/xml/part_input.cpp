@@ -16,6 +16,7 @@
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/xml/markup_marks.h"
 #include "dpxlsx/readers/xml/part_text.h"
+#include "dpxlsx/readers/xml/progress.h"
 
 namespace dp {
 
@@ -162,6 +163,7 @@ void initialiseLibxml2() { [[maybe_unused]] static const bool done = (xmlInitPar
 
 xmlTextReaderPtr openDocument(const std::string& path) {
     initialiseLibxml2();
+    Progress::beginPart(path);
     auto input = std::make_unique<PartInput>(path);
     if (!input->isOpen()) return nullptr;
     PartInput* const watching = input.get();

@@ -8,6 +8,8 @@
 #include <cerrno>
 #include <utility>
 
+#include "dpxlsx/readers/xml/progress.h"
+
 namespace dp {
 
 namespace {
@@ -149,7 +151,9 @@ bool PartText::fill() {
     ssize_t count = -1;
     do count = ::read(descriptor_, bytes_.data() + size, bytes_.size() - size);
     while (count < 0 && errno == EINTR);
-    waiting_ = {bytes_.data(), size + static_cast<std::size_t>(std::max<ssize_t>(count, 0))};
+    const auto added = static_cast<std::size_t>(std::max<ssize_t>(count, 0));
+    waiting_ = {bytes_.data(), size + added};
+    Progress::countRead(added);
     return count >= 0;
 }
 

@@ -9,6 +9,7 @@
 #include <initializer_list>
 
 #include "dpxlsx/readers/limits.h"
+#include "dpxlsx/readers/xml/progress.h"
 
 namespace dp {
 
@@ -200,6 +201,7 @@ PlainXml::~PlainXml() {
 }
 
 bool PlainXml::open(const std::string& path) {
+    Progress::beginPart(path);
     descriptor_ = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
     if (descriptor_ < 0) return false;
     buffer_.reset(new char[window_.size + kZeros]);
@@ -231,6 +233,8 @@ bool PlainXml::fill() {
     endOfFile_ = count <= 0;
     if (count > 0) end_ += count;
     std::memset(end_, 0, kZeros);
+    if (!endOfFile_) Progress::countRead(static_cast<std::uint64_t>(count));
+    Progress::tell();
     return !endOfFile_;
 }
 

@@ -11,6 +11,7 @@
 #include "dpxlsx/readers/xml/file_copy.h"
 #include "dpxlsx/readers/xml/known_names.h"
 #include "dpxlsx/readers/xml/part_input.h"
+#include "dpxlsx/readers/xml/progress.h"
 #include "dpxlsx/readers/xml/silence.h"
 #include "dpxlsx/readers/xml/temporary_path.h"
 
@@ -84,6 +85,7 @@ bool XmlReader::readNode() {
     const int result = moveOn(textReader);
     endOfFile = result == 0;
     if (result == -1 || isTooDeep(textReader)) throw CmXmlException(kXmlError);
+    dp::Progress::tell();  // here, because no exception may pass through libxml2
     return !endOfFile;
 }
 
