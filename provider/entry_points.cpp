@@ -4,6 +4,7 @@
 
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/provider/file_type.h"
+#include "dpxlsx/provider/progress_reports.h"
 #include "dpxlsx/provider/xlsx_data_provider.h"
 
 namespace dp {
@@ -11,6 +12,8 @@ namespace dp {
 namespace {
 
 constexpr char kTypeName[] = "xlsx";
+constexpr long kFailed = -1;
+constexpr long kUnsupported = -50;
 
 }  // namespace
 
@@ -25,7 +28,6 @@ const char* GetDataProviderFiletype(const char* fileName) {
 }
 
 long CreateDataProvider(const char* typeName, IDataProvider** provider) {
-    constexpr long kFailed = -1;
     constexpr long kUnknownType = -22;
     if (!provider) return kFailed;
     *provider = nullptr;
@@ -39,12 +41,22 @@ long CreateDataProvider(const char* typeName, IDataProvider** provider) {
 }
 
 long SetReadingRules(IDataProvider* provider, int rules) {
-    constexpr long kUnsupported = -50;
     auto* const own = dynamic_cast<ExcelDataProviderBase*>(provider);
     const bool known = rules == static_cast<int>(ReadingRules::Default) ||
                        rules == static_cast<int>(ReadingRules::Standard);
     if (!own || !known) return kUnsupported;
     own->setReadingRules(static_cast<ReadingRules>(rules));
+    return 0;
+}
+
+long SetProgress(IDataProvider* provider, int (*report)(double done, void* user), void* user) {
+    const auto* const own = dynamic_cast<xlsxDataProvider*>(provider);
+    if (!own) return kUnsupported;
+    try {
+        setProgressReport(*own, {.report = report, .user = user});
+    } catch (...) {
+        return kFailed;
+    }
     return 0;
 }
 

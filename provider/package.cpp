@@ -4,7 +4,9 @@
 
 #include <boost/filesystem.hpp>
 
+#include "dpxlsx/model/host/entry_points.h"
 #include "dpxlsx/readers/standard/standard_reader.h"
+#include "dpxlsx/readers/xml/progress.h"
 #include "dpxlsx/readers/xml/silence.h"
 #include "dpxlsx/readers/xml/xml_reader.h"
 
@@ -49,6 +51,8 @@ long resultCode(PackageStatus status) {
             return -22;
         case PackageStatus::NotAWorkbook:
             return -25;
+        case PackageStatus::Cancelled:
+            return kCancelled;
         case PackageStatus::EntryError:
         case PackageStatus::TooLarge:
         case PackageStatus::ArchiveNotClosed:
@@ -58,6 +62,8 @@ long resultCode(PackageStatus status) {
 }
 
 PackageStatus checkWorkbook(const std::string& directory, ReadingRules rules) {
+    // Exceptions become a result here, which those of the host must not.
+    const Progress::Current nobodyIsTold(nullptr);
     const bool isWorkbook = rules == ReadingRules::Standard ? standard::isWorkbook(directory)
                                                             : hasUsualParts(directory);
     return isWorkbook ? PackageStatus::Success : PackageStatus::NotAWorkbook;

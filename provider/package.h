@@ -15,7 +15,8 @@ enum class PackageStatus : int {
     NotAPackage = 7,        // another extension, or not a ZIP archive
     DirectoryUnusable = 9,  // the temporary directory, or the copy in it, cannot be made
     ArchiveNotClosed = 10,
-    NotAWorkbook = 13  // no style sheet or workbook part, or the latter is not XML
+    NotAWorkbook = 13,  // no style sheet or workbook part, or the latter is not XML
+    Cancelled = 20      // by the host, when it was told of the progress
 };
 
 // The result code that the host gets.

@@ -10,11 +10,13 @@
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/provider/file_type.h"
 #include "dpxlsx/provider/package.h"
+#include "dpxlsx/provider/progress_reports.h"
 #include "dpxlsx/provider/temporary_directory.h"
 #include "dpxlsx/provider/unpacking.h"
 #include "dpxlsx/readers/standard/standard_reader.h"
 #include "dpxlsx/readers/xlsx/excel_xlsx_reader.h"
 #include "dpxlsx/readers/xml/file_copy.h"
+#include "dpxlsx/readers/xml/progress.h"
 
 namespace dp {
 
@@ -42,6 +44,23 @@ void listWorksheets(const std::string& directory, ReadingRules rules,
         excel_xlsx::GetWorksheets(directory, names);
 }
 
+// The result of `work`, which opens or lists. When the host stops it, `cleanUp` removes what it has
+// left.
+template <class Work, class CleanUp>
+long resultOf(Progress& progress, const Work& work, const CleanUp& cleanUp) {
+    try {
+        const PackageStatus status = work();
+        if (status == PackageStatus::Success) progress.finish();
+        return resultCode(status);
+    } catch (const Progress::Cancelled&) {
+        cleanUp();
+        return resultCode(PackageStatus::Cancelled);
+    } catch (...) {
+        if (progress.isStopped()) cleanUp();
+        throw;
+    }
+}
+
 }  // namespace
 
 xlsxDataProvider::xlsxDataProvider() = default;
@@ -49,6 +68,7 @@ xlsxDataProvider::xlsxDataProvider() = default;
 xlsxDataProvider::~xlsxDataProvider() {
     _reader.reset();
     removeUnpackedFile();
+    setProgressReport(*this, {});
 }
 
 PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
@@ -58,6 +78,7 @@ PackageStatus xlsxDataProvider::unzipFile(const char* fileName) {
     if (!source.native().starts_with('/')) source = fs::current_path() / source;
     if (!fs::is_regular_file(source)) return PackageStatus::SourceMissing;
     if (!hasXlsxExtension(source.string())) return PackageStatus::NotAPackage;
+    Progress::tell();
 
     std::string directory = makePrivateDirectory();
     if (directory.empty()) return PackageStatus::DirectoryUnusable;
@@ -85,25 +106,43 @@ void xlsxDataProvider::removeUnpackedFile() try {
 
 long xlsxDataProvider::OpenFile(const char* fileName, FileAccess access) {
     if (access != FileAccess::Read) return -1;
-    const PackageStatus status = unzipFile(fileName);
-    if (status != PackageStatus::Success) return resultCode(status);
-    _rulesOfCells = _readingRules;
-    _reader = makeReader(_tempDirectory, _readingRules, *this);
-    _reader->startAtWorksheet(static_cast<int>(_worksheetNames.size()));
-    _reader->mReadExcelWorkbook();
-    return resultCode(status);
+    Progress progress(progressReportOf(*this), Progress::Reading::Worksheets);
+    const ExcelXLSXReader* const readerBefore = _reader.get();
+    return resultOf(
+        progress,
+        [&] {
+            const PackageStatus status = unzipFile(fileName);
+            if (status != PackageStatus::Success) return status;
+            _rulesOfCells = _readingRules;
+            _reader = makeReader(_tempDirectory, _readingRules, *this);
+            _reader->startAtWorksheet(static_cast<int>(_worksheetNames.size()));
+            _reader->mReadExcelWorkbook();
+            return status;
+        },
+        [&] {
+            // The new one keeps a part open; one before still knows the styles of its cells.
+            if (_reader.get() != readerBefore) _reader.reset();
+            removeUnpackedFile();
+        });
 }
 
 long xlsxDataProvider::GetWorksheets(const char* fileName, std::vector<std::string>& names) {
-    PackageStatus status = unzipFile(fileName);
-    if (status != PackageStatus::Success) return resultCode(status);
-    try {
-        listWorksheets(_tempDirectory, _readingRules, names);
-    } catch (const CmXmlException&) {
-        status = PackageStatus::NotAWorkbook;
-    }
-    removeUnpackedFile();
-    return resultCode(status);
+    Progress progress(progressReportOf(*this), Progress::Reading::Names);
+    return resultOf(
+        progress,
+        [&] {
+            PackageStatus status = unzipFile(fileName);
+            if (status != PackageStatus::Success) return status;
+            try {
+                listWorksheets(_tempDirectory, _readingRules, names);
+            } catch (const CmXmlException&) {
+                if (progress.isStopped()) throw;  // it is the host's own
+                status = PackageStatus::NotAWorkbook;
+            }
+            removeUnpackedFile();
+            return status;
+        },
+        [this] { removeUnpackedFile(); });
 }
 
 long xlsxDataProvider::CloseFile() {

@@ -8,6 +8,10 @@ namespace dp {
 
 class IDataProvider;
 
+// The result of OpenFile and GetWorksheets when the host ended them by its answer to a report of
+// SetProgress.
+inline constexpr long kCancelled = -20;
+
 extern "C" {
 
 // "xlsx" when IsMicrosoftXLSXFile is true of the name, else the empty text; never null. The text
@@ -29,6 +33,19 @@ DPXLSX_API long CreateDataProvider(const char* typeName, IDataProvider** provide
 // -50, and changes nothing, for another number, a null provider and one that CreateDataProvider did
 // not make. Older libraries do not export it. Throws nothing.
 DPXLSX_API long SetReadingRules(IDataProvider* provider, int rules);
+
+// Lets `provider` tell `report`, with `user`, how far an OpenFile or a GetWorksheets is: on the
+// thread of the call, at its beginning, then about ten times a second, and when it has succeeded.
+// `done` never falls; it is the share of the bytes that are unpacked and read, and 1 only in the
+// last call. Columns that are loaded later are not reported. While the answer is 0 the work goes
+// on; any other ends it with kCancelled, and an exception leaves OpenFile or GetWorksheets as it
+// is. In both cases nothing is left on disk; worksheets read until then stay until ClearWorksheets.
+// `report` may use other providers, but not this one. Holds from the next OpenFile or GetWorksheets
+// on until it is called again; ClearWorksheets keeps it, and a null `report` switches it off.
+// Returns 0; -50, and changes nothing, for a null provider and one that CreateDataProvider did not
+// make; -1 without memory. Older libraries do not export it. Throws nothing.
+DPXLSX_API long SetProgress(IDataProvider* provider, int (*report)(double done, void* user),
+                            void* user);
 
 }  // extern "C"
 
