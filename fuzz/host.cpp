@@ -1,6 +1,7 @@
 #include "fuzz/host.h"
 
 #include <algorithm>
+#include <chrono>
 #include <cstdlib>
 #include <cstring>
 #include <memory>
@@ -10,6 +11,8 @@
 #include "dpxlsx/model/host/i_string.h"
 #include "dpxlsx/model/host/i_worksheet.h"
 #include "dpxlsx/model/host/reference.h"
+#include "dpxlsx/provider/progress_reports.h"
+#include "dpxlsx/provider/xlsx_data_provider.h"
 #include "fuzz/checks.h"
 
 namespace fuzz {
@@ -76,6 +79,24 @@ class Taking {
 };
 
 }  // namespace
+
+void ProgressWatch::watch(dp::IDataProvider& provider) {
+    const auto everyTime = [] {
+        static dp::ProgressReport::Time time;
+        return time += std::chrono::seconds(1);
+    };
+    dp::setProgressReport(dynamic_cast<dp::xlsxDataProvider&>(provider),
+                          {&ProgressWatch::report, this, everyTime});
+}
+
+int ProgressWatch::report(double done, void* watch) {
+    ProgressWatch& self = *static_cast<ProgressWatch*>(watch);
+    require(done == 0 || (done >= self.done_ && done <= 1), "progress that falls");
+    self.done_ = done;
+    self.ended_ = self.left_ == 1;
+    if (self.left_ > 0) --self.left_;
+    return self.ended_ ? 1 : 0;
+}
 
 bool Helper::ConvertToDatetime(const dp::IString* format, dp::IString* text, double& value) const {
     read(format);

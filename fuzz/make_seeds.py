@@ -55,8 +55,8 @@ def entry(name, content, bits=0, extra=b""):
     return which + bytes([bits]) + extra + struct.pack("<H", len(content)) + content
 
 
-def package(*entries, behind=b""):
-    return bytes([0, len(entries) - 1]) + b"".join(entries) + b"\0\0" + behind
+def package(*entries, behind=b"", end=0):
+    return bytes([2 * end, len(entries) - 1]) + b"".join(entries) + b"\0\0" + behind
 
 
 def edge(position):
@@ -156,6 +156,8 @@ def seeds_of_packages():
     strings = b"<sst uniqueCount='1'><si><t>" + b"a" * 2000 + b"</t></si></sst>"
     cells = b"<row>" + b"<c t='s'><v>0</v></c>" * 200 + b"</row>"
     yield "package", "described-strings", package(entry(2, strings), entry(4, worksheet(cells)))
+    for end in (1, 7, 12, 30):
+        yield "package", f"described-ended-{end}", package(entry(4, b"x"), end=end)
     gzip = bytes.fromhex("1f8b08000000000000ff4b04008300000000")
     yield "package", "described-gzip", package(entry(4, gzip))
 
@@ -183,6 +185,7 @@ def seeds_of_calls():
         "settings": b"".join(option(call, 3, 2, 65, 66, 1) for call in range(17)) + book + columns,
         "again": book + book + columns + change(7, 0, 1) + ask(4) + change(10) + book + columns,
         "list": change(11) + book + ask(7, 0) + ask(5),
+        "ended": book + change(13, 9) + book + columns + change(13, 3) + change(11) + book + columns,
     }
     for name, calls in plain.items():
         yield "provider_calls", name, calls

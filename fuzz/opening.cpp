@@ -19,18 +19,24 @@ bool isResultOfOpening(long result) {
     return std::find(std::begin(kResults), std::end(kResults), result) != std::end(kResults);
 }
 
-long open(const std::string& path, int rules) {
+long open(const std::string& path, int rules, unsigned end) {
+    ProgressWatch progress(end);
     dp::IDataProvider* created = nullptr;
     require(dp::CreateDataProvider("xlsx", &created) == 0, "no provider");
     const dp::Reference provider(created);
     require(dp::SetReadingRules(created, rules) == 0, "no rules");
+    progress.watch(*created);
+    const auto isAllowed = [&](long result) {
+        if (result != dp::kCancelled) return isResultOfOpening(result);
+        return progress.hasEnded() && provider->GetTempDirectoryPath().empty();
+    };
     provider->SetDateTimeVariableFormatHelper(new Helper);
     std::vector<std::string> names;
-    require(isResultOfOpening(provider->GetWorksheets(path.c_str(), names)), "another result");
+    require(isAllowed(provider->GetWorksheets(path.c_str(), names)), "another result");
     long result = 0;
     try {
         result = provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read);
-        require(isResultOfOpening(result), "another result");
+        require(isAllowed(result), "another result");
     } catch (const CmXmlException& e) {
         require(e.code() == kXmlError, "another code");
         result = e.code();
@@ -43,11 +49,11 @@ long open(const std::string& path, int rules) {
 
 }  // namespace
 
-long openAsHost(const std::string& path) {
+long openAsHost(const std::string& path, unsigned end) {
     constexpr int kDefault = 0;
     constexpr int kByStandard = 1;
-    open(path, kByStandard);
-    return open(path, kDefault);
+    open(path, kByStandard, end);
+    return open(path, kDefault, end);
 }
 
 }  // namespace fuzz

@@ -66,7 +66,7 @@ class Host {
 
     // --- what the provider holds ---
     void change(unsigned call) {
-        switch (call % 13) {
+        switch (call % 14) {
             case 0:
             case 1:
             case 2:
@@ -89,6 +89,9 @@ class Host {
                 return provider_->ClearWorksheets();
             case 12:
                 return setRules();
+            case 13:
+                progress_ = fuzz::ProgressWatch(input_.byte());
+                return progress_.watch(*provider_);
             default:
                 return list();
         }
@@ -97,7 +100,8 @@ class Host {
         const auto access = dp::IDataProvider::FileAccess(input_.byte() % 8 == 0);
         const char* path = input_.byte() % 8 == 0 ? "nowhere.xlsx" : bookPath().c_str();
         const long result = provider_->OpenFile(path, access);
-        require(result == 0 || result == -1 || result == -17, "another result of opening");
+        require(result == 0 || result == -1 || result == -17 || isEnd(result),
+                "another result of opening");
     }
     void setRules() {
         const int rules = static_cast<int>(input_.byte() % 4) - 1;
@@ -106,8 +110,12 @@ class Host {
     }
     void list() {
         std::vector<std::string> names;
-        require(provider_->GetWorksheets(bookPath().c_str(), names) == 0 && names.size() == 2,
-                "not listed");
+        const long result = provider_->GetWorksheets(bookPath().c_str(), names);
+        require((result == 0 && names.size() == 2) || isEnd(result), "not listed");
+    }
+    bool isEnd(long result) {
+        return result == dp::kCancelled && progress_.hasEnded() &&
+               provider_->GetTempDirectoryPath().empty();
     }
     // Rarely a large number, because long columns take as long as many short ones.
     unsigned row() {
@@ -314,6 +322,7 @@ class Host {
     }
 
     Input input_;
+    fuzz::ProgressWatch progress_;
     dp::Reference<dp::IExcelDataProvider> provider_;
     std::vector<dp::Reference<dp::IColumn>> columns_;  // released before the provider
     std::vector<dp::Reference<dp::IWorksheet>> worksheets_;
