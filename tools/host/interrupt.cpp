@@ -26,8 +26,10 @@ void noteInterrupts() {
     signal(SIGPIPE, SIG_IGN);
 }
 
+bool isInterrupted() { return noted != 0; }
+
 void stopIfInterrupted() {
-    if (noted != 0) throw Interrupted{noted};
+    if (isInterrupted()) throw Interrupted{noted};
 }
 
 }  // namespace dp::tool

@@ -12,6 +12,8 @@ struct Interrupted {
 // raising a signal.
 void noteInterrupts();
 
+bool isInterrupted();
+
 // Throws Interrupted after an interrupt.
 void stopIfInterrupted();
 

@@ -54,6 +54,7 @@ Library::Library(const std::string& path) {
     create_ = find<decltype(create_)>(handle, "CreateDataProvider", library);
     type_ = find<decltype(type_)>(handle, "GetDataProviderFiletype", library);
     rules_ = reinterpret_cast<decltype(rules_)>(dlsym(handle, "SetReadingRules"));
+    progress_ = reinterpret_cast<decltype(progress_)>(dlsym(handle, "SetProgress"));
 }
 
 std::string Library::fileType(const std::string& book) const { return type_(book.c_str()); }
@@ -75,6 +76,11 @@ void Library::readByStandard(IDataProvider& provider) const {
     throw Failure(kLibraryFailure,
                   "the import library cannot read by the standard; install a library of this "
                   "version, or leave out --standard");
+}
+
+void Library::setProgress(IDataProvider& provider, int (*report)(double done, void* user),
+                          void* user) const {
+    if (progress_ != nullptr) progress_(&provider, report, user);
 }
 
 }  // namespace dp::tool

@@ -22,11 +22,16 @@ class Library {
     IDataProvider* createProvider(const std::string& type) const;
     // Makes the provider read by the standard. Throws a Failure when the library cannot.
     void readByStandard(IDataProvider& provider) const;
+    // Lets the provider tell `report` how far it is, and be ended by its answer. Does nothing when
+    // the library cannot.
+    void setProgress(IDataProvider& provider, int (*report)(double done, void* user),
+                     void* user) const;
 
   private:
     decltype(&CreateDataProvider) create_;
     decltype(&GetDataProviderFiletype) type_;
     decltype(&SetReadingRules) rules_;  // null when the library is too old for it
+    decltype(&SetProgress) progress_;   // the same
 };
 
 }  // namespace dp::tool

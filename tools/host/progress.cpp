@@ -2,6 +2,7 @@
 
 #include <unistd.h>
 
+#include <algorithm>
 #include <chrono>
 #include <cstdio>
 
@@ -27,6 +28,11 @@ Progress::~Progress() { erase(); }
 
 void Progress::opening(const std::string& book) { show("Opening " + book); }
 
+void Progress::opening(const std::string& book, double done) {
+    const int percent = static_cast<int>(done * 100);
+    show("Opening " + book, ": " + std::to_string(percent) + " %");
+}
+
 void Progress::column(const std::string& worksheet, size_t number, size_t count) {
     if (now() - lastShown_ < kPause) return;
     show(worksheet + ": column " + std::to_string(number) + " of " + std::to_string(count));
@@ -37,11 +43,12 @@ void Progress::erase() {
     shown_ = false;
 }
 
-void Progress::show(const std::string& text) {
+void Progress::show(const std::string& text, const std::string& end) {
     if (!terminal_) return;
     // A line that wraps cannot be erased.
     const int width = terminalWidth(STDERR_FILENO).value_or(80) - 1;
-    std::fprintf(stderr, "\r\033[K%s", cutToWidth(printable(text), width).c_str());
+    const int room = std::max(width - static_cast<int>(end.size()), 0);
+    std::fprintf(stderr, "\r\033[K%s%s", cutToWidth(printable(text), room).c_str(), end.c_str());
     shown_ = true;
     lastShown_ = now();
 }

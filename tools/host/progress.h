@@ -15,12 +15,15 @@ class Progress {
     Progress& operator=(const Progress&) = delete;
 
     void opening(const std::string& book);
+    // `done` is from 0 to 1.
+    void opening(const std::string& book, double done);
     // `number` is 1-based. Prints at most ten times a second.
     void column(const std::string& worksheet, size_t number, size_t count);
     void erase();
 
   private:
-    void show(const std::string& text);
+    // Text that does not fit is cut before `end`.
+    void show(const std::string& text, const std::string& end = "");
 
     bool terminal_;
     bool shown_ = false;

@@ -33,14 +33,26 @@ Workbook::Workbook(const Library& library, const Options& options)
       provider_(library.createProvider(providerType(library, options.book))),
       losses_(options) {
     if (options.standard) library.readByStandard(*provider_);
+    library.setProgress(
+        *provider_,
+        [](double done, void* workbook) { return static_cast<Workbook*>(workbook)->note(done); },
+        this);
 }
 
 Workbook::~Workbook() { provider_->CloseFile(); }
+
+// What the library is answered: 0 lets it go on.
+int Workbook::note(double done) {
+    progress_.opening(options_.book, done);
+    return isInterrupted() ? 1 : 0;
+}
 
 std::vector<std::string> Workbook::worksheetNames() {
     std::vector<std::string> names;
     provider_->SetReadOptionCleanWorksheetNames(options_.settings.cleanSheetNames);
     const long result = provider_->GetWorksheets(options_.book.c_str(), names);
+    stopIfInterrupted();
+    progress_.erase();
     if (result != 0) throw readFailure(options_.book, result);
     return names;
 }
@@ -49,8 +61,8 @@ void Workbook::open() {
     applySettings(*provider_, options_.settings);
     progress_.opening(options_.book);
     const long result = provider_->OpenFile(options_.book.c_str(), IDataProvider::FileAccess::Read);
-    if (result != 0) throw readFailure(options_.book, result);
     stopIfInterrupted();
+    if (result != 0) throw readFailure(options_.book, result);
     try {
         plan_ = applyReadOptions(*provider_, options_);
     } catch (const UnknownWorksheet& unknown) {

@@ -71,6 +71,7 @@ class Workbook {
     double missing() const { return options_.settings.missing.value_or(kDefaultMissing); }
 
   private:
+    int note(double done);
     [[noreturn]] void refuse(const UnknownWorksheet& unknown);
     Reference<IWorksheet> findWorksheet(int key);
     void loadColumns(LoadedWorksheet& worksheet);
