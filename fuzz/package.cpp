@@ -107,8 +107,8 @@ std::string packageOf(Input input) {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     static const std::string path = fuzz::ownFiles() + "/book.xlsx";
     testkit::writeFile(path, packageOf(Input(data, size)));
-    const unsigned end = Input(data, size).byte() / 2;
-    fuzz::leavingNothing([end] { fuzz::openAsHost(path, end); });
+    const unsigned last = Input(data, size).byte() / 2;
+    fuzz::leavingNothing([last] { fuzz::openAsHost(path, last); });
     const boost::filesystem::directory_iterator files(fuzz::ownFiles());
     require(std::distance(begin(files), end(files)) == 1, "a file beside the workbook");
     return 0;

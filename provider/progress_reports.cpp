@@ -1,30 +1,45 @@
 #include "dpxlsx/provider/progress_reports.h"
 
+#include <array>
+#include <cstddef>
 #include <map>
+#include <mutex>
+#include <new>
 
 namespace dp {
 
 namespace {
 
-// Made with the first report and never destroyed: a host may release its last provider when the
-// process ends.
-std::map<const xlsxDataProvider*, ProgressReport>* reports = nullptr;
+// Locked, because providers in different threads share the table.
+struct Reports {
+    std::mutex mutex;
+    std::map<const xlsxDataProvider*, ProgressReport> ofProvider;
+};
+
+// Never destroyed, because a host may release its last provider when the process ends, and made
+// without memory of its own, because a provider's destructor may be the first to ask.
+Reports& reports() {
+    alignas(Reports) static std::array<std::byte, sizeof(Reports)> place;
+    static Reports& made = *new (place.data()) Reports;
+    return made;
+}
 
 }  // namespace
 
 void setProgressReport(const xlsxDataProvider& provider, const ProgressReport& report) {
-    if (report.report) {
-        if (!reports) reports = new std::map<const xlsxDataProvider*, ProgressReport>;
-        reports->insert_or_assign(&provider, report);
-    } else if (reports) {
-        reports->erase(&provider);
-    }
+    Reports& all = reports();
+    const std::lock_guard lock(all.mutex);
+    if (report.report)
+        all.ofProvider.insert_or_assign(&provider, report);
+    else
+        all.ofProvider.erase(&provider);
 }
 
 ProgressReport progressReportOf(const xlsxDataProvider& provider) {
-    if (!reports) return {};
-    const auto found = reports->find(&provider);
-    return found == reports->end() ? ProgressReport() : found->second;
+    Reports& all = reports();
+    const std::lock_guard lock(all.mutex);
+    const auto found = all.ofProvider.find(&provider);
+    return found == all.ofProvider.end() ? ProgressReport() : found->second;
 }
 
 }  // namespace dp

@@ -33,11 +33,9 @@ struct CloseText {
 // One iterator serves all calls of a thread, because creating one takes far longer than walking a
 // name. Null when ICU makes none.
 icu::BreakIterator* breakIterator() {
-    thread_local const std::unique_ptr<icu::BreakIterator> iterator = [] {
-        UErrorCode status = U_ZERO_ERROR;
-        return std::unique_ptr<icu::BreakIterator>(
-            icu::BreakIterator::createCharacterInstance(icu::Locale::getDefault(), status));
-    }();
+    thread_local UErrorCode status = U_ZERO_ERROR;
+    thread_local const std::unique_ptr<icu::BreakIterator> iterator(
+        icu::BreakIterator::createCharacterInstance(icu::Locale::getDefault(), status));
     return iterator.get();
 }
 
