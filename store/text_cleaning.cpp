@@ -31,12 +31,16 @@ struct CloseText {
 };
 
 // One iterator serves all calls of a thread, because creating one takes far longer than walking a
-// name. Null when ICU makes none.
+// name.
+thread_local std::unique_ptr<icu::BreakIterator> characters;
+
+// Null when ICU makes none.
 icu::BreakIterator* breakIterator() {
-    thread_local UErrorCode status = U_ZERO_ERROR;
-    thread_local const std::unique_ptr<icu::BreakIterator> iterator(
-        icu::BreakIterator::createCharacterInstance(icu::Locale::getDefault(), status));
-    return iterator.get();
+    UErrorCode status = U_ZERO_ERROR;
+    if (!characters)
+        characters.reset(
+            icu::BreakIterator::createCharacterInstance(icu::Locale::getDefault(), status));
+    return characters.get();
 }
 
 // The iterator over the characters of `text`, which the caller keeps until the next call; null when
