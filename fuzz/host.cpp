@@ -30,7 +30,8 @@ void show(dp::IString* text) { read(std::unique_ptr<dp::IString>(text).get()); }
 
 void readNumbers(const dp::INumericColumn& column, unsigned long rows) {
     const volatile double* values = column.GetValues();
-    require(column.GetConvertedMissingCount() >= 0, "a negative count");
+    const int converted = column.GetConvertedMissingCount();
+    require(converted >= 0 && converted <= column.GetRowCount(), "more converted values than rows");
     // Reads every value.
     for (unsigned long row = 0; row < rows; ++row) static_cast<void>(values[row]);
     for (unsigned long row = 0; row < std::min(rows, kShown); ++row) {

@@ -208,7 +208,7 @@ inline int expectGetters(void* object, const void* facet, const Contract& table,
         else if (field.type == "d")
             expectEcho(object, field.offset, facet, slot, 1.25);
         else if (field.type == "p")
-            EXPECT_EQ(call<void*>(facet, slot), peek<void*>(object, field.offset));
+            expectEcho(object, field.offset, facet, slot, object);
         else
             EXPECT_EQ(call<char*>(facet, slot), static_cast<char*>(object) + field.offset);
     }

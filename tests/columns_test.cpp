@@ -203,27 +203,6 @@ TEST_F(ColumnsOnDemand, BearsACleanName) {
     EXPECT_EQ(factsOf(provider, 1).name, "_given_");
 }
 
-TEST_F(ColumnsOnDemand, TellsTheSettingsOfTheProcess) {
-    using Settings = ExcelDataProviderBase;
-    provider.SetMissingValue(-1);
-    provider.SetNumericRange(-2, 3);
-    provider.SetMaximumTextLength(4);
-    provider.SetInputDecimal('i');
-    provider.SetOutputDecimal('o');
-    provider.SetOutputGroupingSymbol('g');
-    provider.SetMissingValueTextRepresentation("m");
-    provider.SetBooleanTrueValue("t");
-    provider.SetBooleanFalseValue("f");
-    EXPECT_EQ(
-        std::tuple(Settings::GetMissingValue(), Settings::GetNumericMinimumValue(), Settings::GetNumericMaximumValue(),
-                   Settings::GetNumericMaximumInt(), Settings::GetMaximumTextLength(), Settings::GetInputDecimal(),
-                   Settings::GetOutputDecimal(), Settings::GetOutputGroupingSymbol()),
-        std::tuple(-1.0, -2.0, 3.0, 2147000000.0, 4, 'i', 'o', 'g'));
-    EXPECT_EQ(std::string(Settings::GetMissingValueTextRepresentation()) + Settings::GetBooleanTrueValue() +
-                  Settings::GetBooleanFalseValue(),
-              "mtf");
-}
-
 TEST_F(ColumnsOnDemand, AnswersToKeysOverAllWorksheets) {
     const auto keysOf = [this](int worksheet) {
         std::string keys;
@@ -367,24 +346,6 @@ TEST_F(ColumnsOnDemand, GivesAKeyOutAgainWithoutItsRows) {
     file(provider, 1, "|1");
     provider.SetReadOptionIgnoreBlankRows(true);
     EXPECT_EQ(brief(1), "b: * 2 3") << "the blank rows are those at the time of the call";
-}
-
-TEST_F(ColumnsOnDemand, PassesOverBlankRowsForItsHost) {
-    const auto filled = [this](double from, double to) {
-        provider.SetMissingNumeric(from, to);
-        NumericColumn column;
-        column.values.reset(new double[4]{9, 9, 9, 9});
-        const CellColumn& cells = provider._cells[0].nth(0).second;
-        const unsigned slots = provider.HandleBlankRows(&column, 1, 2, 4, cells.lower_bound(4));
-        std::string text = std::to_string(slots) + ":";
-        for (std::size_t row = 0; row < 4; ++row) text += " " + std::to_string(static_cast<int>(column.values[row]));
-        return text;
-    };
-    fileSheet("'n|1|||4|5", {});
-    EXPECT_EQ(filled(1, -7), "2: 9 9 9 9") << "missing numbers stay";
-    EXPECT_EQ(filled(kMissing, -7), "2: 9 -7 -7 9");
-    provider.SetReadOptionIgnoreBlankRows(true);
-    EXPECT_EQ(filled(kMissing, -7), "0: 9 9 9 9");
 }
 
 TEST_F(ColumnsOnDemand, TakesItsOwnAnswersAsArguments) {
