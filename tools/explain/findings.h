@@ -23,6 +23,17 @@ struct Places {
     }
 };
 
+// Cells with texts where others belong: their places and the first text.
+struct WrongTexts {
+    Places cells;
+    std::string first;
+
+    void add(const std::string& place, const std::string& text) {
+        if (cells.count == 0) first = text;
+        cells.add(place);
+    }
+};
+
 // A part that the package has under another name than the one that the import looks for.
 struct MovedPart {
     std::string wanted;
@@ -108,8 +119,8 @@ struct Findings {
     Places inlineValues;          // inline texts of cells that have a value too
     Places pieces;                // values and inline texts of which only the first piece arrives
     Places booleanWords;          // TRUE in letters
-    Places notNumbers;            // texts where numbers belong
-    std::string notNumber;        // the first of them
+    WrongTexts notNumbers;        // in cells of numbers
+    WrongTexts notBooleans;       // in cells of Booleans
     Places lowerCase;             // cells with content whose reference has lower-case letters
     std::string lowerCaseColumn;  // the column in which the first of them arrives
     bool lowerCaseFails = false;  // one of them is beyond the last column

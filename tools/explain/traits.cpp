@@ -92,9 +92,12 @@ constexpr CellTrait kPieces{"values-in-pieces",
                             "with a value or text divided by CDATA sections or comments",
                             "only the first piece arrives",
                             kSaveAgain};
-constexpr CellTrait kBooleanWords{
-    "booleans-as-words",        &Findings::booleanWords,   "Boolean",
-    "written as the word true", "0 arrives, as for FALSE", kSaveAgain};
+constexpr CellTrait kBooleanWords{"booleans-as-words",
+                                  &Findings::booleanWords,
+                                  "Boolean",
+                                  "written as a word such as true",
+                                  "0 arrives, as for FALSE",
+                                  kSaveAgain};
 
 Found found(const Findings& findings, const CellTrait& trait) {
     const Places& cells = findings.*trait.cells;
@@ -269,14 +272,23 @@ Found hiddenWorksheets(const Findings& findings) {
         "to leave one out: --exclude-sheet " + shellWord(findings.hiddenWorksheets.first.front())};
 }
 
+std::string described(const WrongTexts& texts, const std::string& type) {
+    return placed(texts.cells, "cell") + " of type " + type + " with " +
+           (texts.cells.count == 1 ? "" : "texts such as ") + quoted(texts.first);
+}
+
 Found notNumbers(const Findings& findings) {
-    if (findings.notNumbers.count == 0) return std::nullopt;
-    return Trait{"not-a-number",
-                 placed(findings.notNumbers, "cell") + " of type number with " +
-                     (findings.notNumbers.count == 1 ? "" : "texts such as ") +
-                     quoted(findings.notNumber),
-                 "the number at the beginning of such a text arrives, or 0",
+    if (findings.notNumbers.cells.count == 0) return std::nullopt;
+    return Trait{"not-a-number", described(findings.notNumbers, "number"),
+                 "the number at the beginning of such a text arrives (0x10 is 16), or 0",
                  "let the program that makes the book write plain numbers, such as 1.5"};
+}
+
+Found notBooleans(const Findings& findings) {
+    if (findings.notBooleans.cells.count == 0) return std::nullopt;
+    return Trait{"not-a-boolean", described(findings.notBooleans, "Boolean"),
+                 "the number at the beginning of such a text arrives, or 0",
+                 "let the program that makes the book write 0 or 1"};
 }
 
 Found lowerCase(const Findings& findings) {
@@ -358,6 +370,7 @@ struct StandardEffect {
 constexpr StandardEffect kStandardEffects[] = {
     {"error-cells", "a missing value arrives"},
     {"not-a-number", "a missing value arrives"},
+    {"not-a-boolean", "a missing value arrives"},
 };
 
 }  // namespace
@@ -388,7 +401,8 @@ std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answer
             add(traits, trait(findings, answers));
     }
     addAll(traits, findings, kMergedCells, phoneticTexts, kErrorCells, hiddenWorksheets,
-           kInlineRuns, kInlineValues, kCdataTexts, kPieces, kBooleanWords, notNumbers, lowerCase);
+           kInlineRuns, kInlineValues, kCdataTexts, kPieces, kBooleanWords, notNumbers, notBooleans,
+           lowerCase);
     return traits;
 }
 

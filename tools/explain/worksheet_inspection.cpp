@@ -18,14 +18,15 @@ namespace {
 
 bool isSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
 
-// Whether the whole text is a number to an import. NaN and infinity count as numbers here, because
-// they do not arrive as another number.
+// Whether the whole text is a number to spreadsheet programs, or none to an import either. NaN and
+// infinity are such: a missing value arrives. Hexadecimal numbers are numbers to an import alone.
 bool isNumber(const std::string& text) {
     char* end = nullptr;
     const double value = std::strtod(text.c_str(), &end);
+    if (!std::isfinite(value)) return true;
     const bool found = end != text.c_str();
     while (isSpace(*end)) ++end;
-    return found && (*end == '\0' || !std::isfinite(value));
+    return found && *end == '\0' && text.find_first_of("xX") == text.npos;
 }
 
 // The text without the white space around it, in lower case.
@@ -267,11 +268,20 @@ class Pass {
 
     void checkNumber() {
         const std::string text = reader_.text();
-        const std::string word = cell_.type == "b" ? lowerWord(text) : std::string();
-        if (word == "true") findings_.booleanWords.add(cell_.place);
-        if (word == "true" || word == "false" || isNumber(text)) return;
-        if (findings_.notNumbers.count == 0) findings_.notNumber = text.substr(0, kLongest);
-        findings_.notNumbers.add(cell_.place);
+        const auto note = [&](WrongTexts& texts) {
+            texts.add(cell_.place, text.substr(0, kLongest));
+        };
+        if (cell_.type != "b") {
+            if (!isNumber(text)) note(findings_.notNumbers);
+            return;
+        }
+        const std::string word = lowerWord(text);
+        const auto isOne = [&word](auto... words) { return ((word == words) || ...); };
+        if (isOne("true", "on")) {
+            findings_.booleanWords.add(cell_.place);
+        } else if (!isOne("0", "1", "false", "off")) {
+            note(findings_.notBooleans);
+        }
     }
 
     // Whether the import reads the cell: it is not above the data, nor in a column that is left
