@@ -84,6 +84,12 @@ def with_format(code):
     return changed(STYLES, "m/d/yyyy", html.escape(code))
 
 
+def styled(number, code, first=0):
+    """The small workbook with a code under this number for its date, and a number for the first style."""
+    return {**PARTS, STYLES: with_format(code)[STYLES].replace("164", str(number)).replace(
+        '<xf numFmtId="0"/>', f'<xf numFmtId="{first}"/>')}
+
+
 SHEET_OF = f'<worksheet xmlns="{SPREADSHEET}"><sheetData>{{}}</sheetData></worksheet>'
 
 
@@ -176,7 +182,15 @@ TRAITS = [
      r"1 date \(My Data!B2\).*\(the count of numFmts\).*'My Data!B=datetime'", 0),
     ("number-format-count", changed(STYLES, "<numFmt ", '<numFmt numFmtId="170" formatCode="0.0"/>'
      "<numFmt "), '"m/d/yyyy": day numbers arrive', 0),
-    ("not-taken-for-dates", with_format("d" * 1025), "day numbers arrive", 0),
+    ("long-format-codes", with_format("d" * 1025), "1,024 bytes.*day numbers arrive; read .*'My Data!B=datetime'"
+     ", or use a shorter code", 0),
+    ("built-in-format-ids", styled(14, "0.00"), 'own under .*: "0.00": date-times arrive; .*B=numeric', 0),
+    ("built-in-format-ids", styled(2, "m/d/yyyy"), "own under .*: day numbers arrive; .*B=datetime", 0),
+    ("unlisted-formats", {**PARTS, STYLES: PARTS[STYLES].replace('"164" f', '"165" f').replace('t="1"', 't="2"').replace(
+        "</styleSheet>", '<dxfs><dxf><numFmt numFmtId="164" formatCode="d/m"/></dxf></dxfs></styleSheet>')},
+     'outside the list .*: "d/m": date-times arrive', 0),
+    ("cells-without-style", {**styled(164, "m/d/yyyy", first=164), SHEET: PARTS[SHEET].replace(' s="1"', "")},
+     r'1 date \(My Data!B2\) in cells without a style number, .*: "m/d/yyyy": day numbers arrive', 0),
     ("default-date-style", with_format("dd\\.mm\\.yyyy"), '"dd.mm.yyyy".*default date style', 0),
     ("default-date-style", with_format("[HH]:mm"), "values are right", 0),
     ("taken-for-dates", with_format('0.0_h"dmy"\\s*y[>5]'), "0.0_h", 0),
@@ -214,6 +228,7 @@ TRAITS = [
 CURED_BY_STANDARD = {
     "namespace-prefix", "shared-strings-without-count", "iso-dates", "date-system-1904", "no-style-sheet",
     "part-names", "taken-for-dates", "not-taken-for-dates", "number-format-count", "default-date-style",
+    "built-in-format-ids", "unlisted-formats", "cells-without-style",
     "phonetic-texts", "inline-runs", "inline-values", "cdata-texts", "values-in-pieces", "booleans-as-words",
     "lower-case-references"}
 # The traits that a plain import mentions when it succeeds.
@@ -658,8 +673,9 @@ class ToolTest(unittest.TestCase):
                 self.assertEqual({t["trait"] for t in left} & {key, "unreadable", *CURED_BY_STANDARD},
                                  {key} if key and not cured else set())
                 if cured:
-                    self.run_tool(book, "--standard")
+                    by_standard = self.run_tool(book, "--json", "--standard")
                     self.assertEqual([n for n in self.notes if "dpxlsx --explain" in n], [])
+                    self.assertNotEqual(by_standard, self.run_tool(book, "--json", expected=code))
                 self.run_tool(book, expected=code)
                 noted = [note for note in self.notes if "dpxlsx --explain" in note]
                 told = code != 0 or (key in WORST and text != r"1 cell \(My Data!A2\)")
@@ -717,6 +733,13 @@ class ToolTest(unittest.TestCase):
                 self.assertEqual([t["trait"] for t in explained["traits"]], wanted)
                 self.run_tool(book, *arguments)
                 self.assertEqual([n for n in self.notes if "if there are any" not in n], [])
+
+    def test_dates_among_numbers_are_judged_by_the_rules_chosen(self):
+        book = self.book({**rows('<c r="A2"><v>7</v></c>', '<c r="A3" s="1"><v>45296</v></c>'),
+                          STYLES: with_format("DD/MM/YYYY")[STYLES]})
+        for rules, key in (([], "not-taken-for-dates"), (["--standard"], "mixed-dates")):
+            traits = json.loads(self.run_tool(book, "--explain", "--json", *rules))["traits"]
+            self.assertEqual([trait["trait"] for trait in traits], [key])
 
     def test_the_advice_about_every_column_helps(self):
         cells = ('<row r="2"><c r="A2" s="1"><v>45296</v></c><c r="B2" s="1"><v>45297</v></c></row>'

@@ -82,9 +82,9 @@ std::vector<Trait> allTraits(const Library& library, Options options) {
     Findings findings = unpacked ? inspect(options.book, attempt.imported) : Findings();
     findings.lost = attempt.lost;
     findings.textLimit = options.settings.maxText.value_or(kDefaultLongestText);
-    std::vector<Trait> traits =
-        underRules(traitsOf(findings, askForStyles(library, options.book, findings.formats)),
-                   options.standard);
+    std::vector<Trait> traits = underRules(
+        traitsOf(findings, askForStyles(library, options.book, findings.formats, options.standard)),
+        options.standard);
     const bool explained =
         std::any_of(traits.begin(), traits.end(), [](const Trait& trait) { return trait.fatal; });
     if (failure && !explained) traits.push_back(unreadableTrait(findings, failure->code()));

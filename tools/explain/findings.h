@@ -40,20 +40,31 @@ struct MovedPart {
     std::string found;
 };
 
+// Where a number format stands, because of which an import may not find it.
+enum class FormatOrigin {
+    Usual,
+    TooLong,     // its code is longer than an import reads
+    BuiltInId,   // the workbook's own, under the id of a built-in one
+    Uncounted,   // beyond the number of formats that the style sheet declares
+    Unlisted,    // outside the list of number formats, as those of conditional formats are
+    FirstStyle,  // that of the first cell style, for cells that name no style
+};
+
 // The number format of a cell style that cells with numbers use.
 struct UsedFormat {
     std::string code;  // "built-in 30" for one that has none
     bool isDate;       // by the rules of spreadsheet programs
-    bool isUncounted;  // beyond the number of formats that the style sheet declares
+    FormatOrigin origin;
 };
 
 // The cells of one style in one column.
 struct StyledColumn {
     size_t worksheet;  // its place in the book
     unsigned column;   // 1-based, 0 when the cells name none
-    int style;         // kBoolean for Booleans, whose number format does not count
+    int style;         // or one of the following
 
-    static constexpr int kBoolean = -1;
+    static constexpr int kBoolean = -1;  // Booleans, whose number format does not count
+    static constexpr int kNone = -2;     // cells that name no style
     bool operator<(const StyledColumn& other) const {
         return std::tie(worksheet, column, style) <
                std::tie(other.worksheet, other.column, other.style);

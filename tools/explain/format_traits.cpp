@@ -4,6 +4,7 @@
 #include <cstdio>
 #include <set>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "tools/views/text.h"
@@ -61,52 +62,60 @@ Collected collected(const Findings& findings, const StyleAnswers& answers, Match
 
 bool mayBe(const std::optional<Kind>& kind, Kind wanted) { return !kind || *kind == wanted; }
 
-bool isUnknownDate(const UsedFormat& format, const StyleAnswer& answer,
-                   const std::optional<Kind>& kind) {
-    return format.isDate && !answer.isDate && mayBe(kind, Kind::Number);
-}
+// Formats of one origin that an import judges otherwise than spreadsheet programs do.
+struct Misjudged {
+    const char* key;
+    FormatOrigin origin;
+    bool isDate;              // to spreadsheet programs
+    const char* where;        // their cells are
+    const char* advice = "";  // beside another kind for the column
+};
 
-std::string asDates(const Collected& found) {
-    return "read the column as dates: " + found.types("datetime");
+constexpr const char* kLongCodes = "in formats with codes of more than 1,024 bytes";
+constexpr const char* kUnderBuiltIns =
+    "in formats of the book's own under the ids of built-in ones";
+
+constexpr Misjudged kMisjudged[] = {
+    {"taken-for-dates", FormatOrigin::Usual, false, "in formats with words or colours"},
+    {"not-taken-for-dates", FormatOrigin::Usual, true,
+     "in formats that the import does not know as dates"},
+    {"number-format-count", FormatOrigin::Uncounted, true,
+     "in formats beyond the number that the style sheet declares (the count of numFmts)",
+     kSaveAgain},
+    {"long-format-codes", FormatOrigin::TooLong, false, kLongCodes, "use a shorter code"},
+    {"long-format-codes", FormatOrigin::TooLong, true, kLongCodes, "use a shorter code"},
+    {"built-in-format-ids", FormatOrigin::BuiltInId, false, kUnderBuiltIns},
+    {"built-in-format-ids", FormatOrigin::BuiltInId, true, kUnderBuiltIns},
+    {"unlisted-formats", FormatOrigin::Unlisted, false,
+     "in formats that stand outside the list of number formats, as in dxfs"},
+    {"cells-without-style", FormatOrigin::FirstStyle, true,
+     "in cells without a style number, which stands for the first style"},
+};
+
+Found misjudged(const Findings& findings, const StyleAnswers& answers, const Misjudged& formats) {
+    const bool isDate = formats.isDate;
+    const Collected found = collected(findings, answers, [&](auto& format, auto answer, auto kind) {
+        return format.origin == formats.origin && format.isDate == isDate &&
+               answer.isDate != isDate && mayBe(kind, isDate ? Kind::Number : Kind::DateTime);
+    });
+    if (found.cells.count == 0) return std::nullopt;
+    std::string advice = isDate ? "read the column as dates: " + found.types("datetime")
+                                : "read the column as numbers: " + found.types("numeric");
+    if (*formats.advice != '\0') advice += std::string(", or ") + formats.advice;
+    return Trait{formats.key,
+                 placed(found.cells, isDate ? "date" : "number") + " " + formats.where + ": " +
+                     listed(found.codes, true),
+                 isDate ? "day numbers arrive" : "date-times arrive", advice};
 }
 
 }  // namespace
 
-Found takenForDates(const Findings& findings, const StyleAnswers& answers) {
-    const Collected found = collected(findings, answers, [](auto& format, auto answer, auto kind) {
-        return answer.isDate && !format.isDate && mayBe(kind, Kind::DateTime);
-    });
-    if (found.cells.count == 0) return std::nullopt;
-    return Trait{"taken-for-dates",
-                 placed(found.cells, "number") +
-                     " in formats with words or colours: " + listed(found.codes, true),
-                 "date-times arrive", "read the column as numbers: " + found.types("numeric")};
-}
-
-Found notTakenForDates(const Findings& findings, const StyleAnswers& answers) {
-    const Collected found = collected(findings, answers, [](auto& format, auto answer, auto kind) {
-        return isUnknownDate(format, answer, kind) && !format.isUncounted;
-    });
-    if (found.cells.count == 0) return std::nullopt;
-    return Trait{
-        "not-taken-for-dates",
-        placed(found.cells, "date") +
-            " in formats that the import does not know as dates: " + listed(found.codes, true),
-        "day numbers arrive", asDates(found)};
-}
-
-// An import reads no more formats than the style sheet declares.
-Found uncountedFormats(const Findings& findings, const StyleAnswers& answers) {
-    const Collected found = collected(findings, answers, [](auto& format, auto answer, auto kind) {
-        return isUnknownDate(format, answer, kind) && format.isUncounted;
-    });
-    if (found.cells.count == 0) return std::nullopt;
-    return Trait{"number-format-count",
-                 placed(found.cells, "date") +
-                     " in formats beyond the number that the style sheet declares (the count "
-                     "of numFmts): " +
-                     listed(found.codes, true),
-                 "day numbers arrive", asDates(found) + ", or " + kSaveAgain};
+std::vector<Trait> misjudgedFormats(const Findings& findings, const StyleAnswers& answers) {
+    std::vector<Trait> traits;
+    for (const Misjudged& formats : kMisjudged)
+        if (Found found = misjudged(findings, answers, formats))
+            traits.push_back(std::move(*found));
+    return traits;
 }
 
 Found defaultDateStyle(const Findings& findings, const StyleAnswers& answers) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <map>
+#include <vector>
 
 #include "tools/explain/style_probe.h"
 #include "tools/explain/trait.h"
@@ -11,9 +12,8 @@ namespace dp::tool {
 
 using StyleAnswers = std::map<int, StyleAnswer>;  // by index of the cell style
 
-Found takenForDates(const Findings& findings, const StyleAnswers& answers);
-Found notTakenForDates(const Findings& findings, const StyleAnswers& answers);
-Found uncountedFormats(const Findings& findings, const StyleAnswers& answers);
+// Numbers that arrive as dates, and dates that arrive as numbers, each cause on its own.
+std::vector<Trait> misjudgedFormats(const Findings& findings, const StyleAnswers& answers);
 Found mixedDates(const Findings& findings, const StyleAnswers& answers);
 Found defaultDateStyle(const Findings& findings, const StyleAnswers& answers);
 

@@ -37,10 +37,15 @@ constexpr std::pair<int, const char*> kBuiltInDates[] = {
 
 UsedFormat builtIn(int id) {
     for (const auto& [date, code] : kBuiltInDates) {
-        if (id == date) return {code, true, false};
+        if (id == date) return {code, true, FormatOrigin::Usual};
     }
     const bool eastAsian = (id >= 27 && id <= 36) || (id >= 50 && id <= 58);
-    return {"built-in " + std::to_string(id), eastAsian, false};
+    return {"built-in " + std::to_string(id), eastAsian, FormatOrigin::Usual};
+}
+
+// Whether an import has a format of its own for the id, which it takes whatever the book says.
+bool isImportedBuiltIn(int id) {
+    return (id >= 1 && id <= 11) || (id >= 14 && id <= 22) || (id >= 37 && id <= 48);
 }
 
 int number(const std::optional<std::string>& text) {
@@ -64,9 +69,7 @@ void NumberFormats::read(Package& package, const std::string& name, Findings& fi
             findings.notePrefix(name, reader.writtenName());
         }
         if (reader.element() == "numFmts") declared_ = number(reader.attribute("count"));
-        if (section == "numFmts" && reader.element() == "numFmt" && codes_.size() < kMostStyles) {
-            takeCode(reader);
-        }
+        if (reader.element() == "numFmt") takeCode(reader, section == "numFmts");
         if (section == "cellXfs" && reader.element() == "xf" && formatIds_.size() < kMostStyles) {
             formatIds_.push_back(number(reader.attribute("numFmtId")));
         }
@@ -74,22 +77,38 @@ void NumberFormats::read(Package& package, const std::string& name, Findings& fi
     if (reader.isBroken()) findings.broken.push_back(name);
 }
 
-void NumberFormats::takeCode(const PartReader& reader) {
+void NumberFormats::takeCode(const PartReader& reader, bool isListed) {
     const std::string text = reader.attribute("formatCode").value_or("");
-    Code& code = codes_[number(reader.attribute("numFmtId"))];
-    code.text = text.substr(0, kLongestCode);
-    const bool isLeftOut = text.empty() || text.size() > kLongestImported;
-    if (isLeftOut || taken_ < declared_) code.isUncounted = false;
-    if (!isLeftOut) ++taken_;
+    if (text.empty() || codes_.size() + others_.size() >= kMostStyles) return;
+    const int id = number(reader.attribute("numFmtId"));
+    const bool isTooLong = text.size() > kLongestImported;
+    const bool isCounted = isTooLong || taken_++ < declared_;
+    const std::string beginning = text.substr(0, kLongestCode);
+    if (!isListed) {
+        others_.emplace(id, beginning);
+        return;
+    }
+    const FormatOrigin origin = isTooLong               ? FormatOrigin::TooLong
+                                : isImportedBuiltIn(id) ? FormatOrigin::BuiltInId
+                                : isCounted             ? FormatOrigin::Usual
+                                                        : FormatOrigin::Uncounted;
+    codes_[id] = {beginning, origin};
 }
 
 UsedFormat NumberFormats::of(int style) const {
-    const int id = formatIds_[static_cast<size_t>(style)];
-    const auto code = codes_.find(id);
-    if (code != codes_.end()) {
-        return {code->second.text, isDateCode(code->second.text), code->second.isUncounted};
+    if (style == StyledColumn::kNone) {
+        const UsedFormat first = of(0);
+        return {first.code, first.isDate, FormatOrigin::FirstStyle};
     }
-    return builtIn(id);
+    const int id = formatIds_[static_cast<size_t>(style)];
+    if (const auto own = codes_.find(id); own != codes_.end()) {
+        const Code& code = own->second;
+        return {code.text, isDateCode(code.text), code.origin};
+    }
+    const auto other = others_.find(id);
+    if (other == others_.end() || isImportedBuiltIn(id)) return builtIn(id);
+    // Spreadsheet programs know no format under the id.
+    return {other->second, false, FormatOrigin::Unlisted};
 }
 
 bool isDateCode(const std::string& code) {

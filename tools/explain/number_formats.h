@@ -18,21 +18,23 @@ class NumberFormats {
 
     // How many cell styles there are.
     size_t size() const { return formatIds_.size(); }
-    // The format of the cell style with this 0-based index, which is below size().
+    // The format of the cell style with this 0-based index, which is below size(), or of cells
+    // without a style (StyledColumn::kNone) when there is a first one.
     UsedFormat of(int style) const;
 
   private:
     struct Code {
         std::string text;
-        bool isUncounted = true;  // after as many codes as the style sheet declares
+        FormatOrigin origin;
     };
 
-    void takeCode(const PartReader& reader);
+    void takeCode(const PartReader& reader, bool isListed);
 
-    std::map<int, Code> codes_;   // by id
-    int declared_ = 0;            // number of codes that the style sheet declares
-    int taken_ = 0;               // number of codes read so far
-    std::vector<int> formatIds_;  // by cell style
+    std::map<int, Code> codes_;          // by id, those in numFmts
+    std::map<int, std::string> others_;  // by id, those elsewhere
+    int declared_ = 0;                   // number of codes that the style sheet declares
+    int taken_ = 0;                      // number of codes read so far
+    std::vector<int> formatIds_;         // by cell style
 };
 
 // Whether spreadsheet programs show numbers under this code as dates or times: its first section

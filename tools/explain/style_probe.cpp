@@ -95,8 +95,9 @@ std::string worksheetOf(const std::vector<int>& styles) {
         "<worksheet xmlns=\"http://schemas.openxmlformats.org/spreadsheetml/2006/main\">"
         "<sheetData><row r=\"1\">";
     for (size_t i = 0; i < styles.size(); ++i) {
-        text += "<c r=\"" + columnLetters(static_cast<unsigned>(i + 1)) + "1\" s=\"" +
-                std::to_string(styles[i]) + "\"><v>45000.5</v></c>";
+        const bool isNone = styles[i] == StyledColumn::kNone;
+        text += "<c r=\"" + columnLetters(static_cast<unsigned>(i + 1)) + "1\"" +
+                (isNone ? "" : " s=\"" + std::to_string(styles[i]) + "\"") + "><v>45000.5</v></c>";
     }
     return text + "</row></sheetData></worksheet>";
 }
@@ -141,8 +142,10 @@ std::vector<StyleAnswer> readAnswers(IDataProvider& provider) {
     return answers;
 }
 
-std::vector<StyleAnswer> importProbe(const Library& library, const std::string& path) {
+std::vector<StyleAnswer> importProbe(const Library& library, const std::string& path,
+                                     bool standard) {
     const Reference<IDataProvider> provider(library.createProvider("xlsx"));
+    if (standard) library.readByStandard(*provider);
     std::vector<StyleAnswer> answers;
     provider->SetReadOptionDefaultUseVariableNameRow(VNR_NONE);
     try {
@@ -159,7 +162,7 @@ std::vector<StyleAnswer> importProbe(const Library& library, const std::string& 
 }  // namespace
 
 std::map<int, StyleAnswer> askForStyles(const Library& library, const std::string& book,
-                                        const std::map<int, UsedFormat>& formats) {
+                                        const std::map<int, UsedFormat>& formats, bool standard) {
     std::vector<int> styles;
     for (const auto& [style, format] : formats) {
         if (styles.size() < kMostColumns) styles.push_back(style);
@@ -168,7 +171,7 @@ std::map<int, StyleAnswer> askForStyles(const Library& library, const std::strin
     const TemporaryFolder folder;
     const std::string probe = folder.path() + "/styles.xlsx";
     if (styles.empty() || folder.path().empty() || !makeProbe(probe, book, styles)) return result;
-    const std::vector<StyleAnswer> answers = importProbe(library, probe);
+    const std::vector<StyleAnswer> answers = importProbe(library, probe, standard);
     if (answers.size() != styles.size()) return result;
     for (size_t i = 0; i < styles.size(); ++i) result.emplace(styles[i], answers[i]);
     return result;

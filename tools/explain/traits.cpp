@@ -337,23 +337,16 @@ void addAll(std::vector<Trait>& traits, const Findings& findings, const Sources&
 
 // An import by the standard gives what spreadsheet programs show.
 constexpr std::string_view kCuredByStandard[] = {
-    "namespace-prefix",
-    "shared-strings-without-count",
-    "iso-dates",
-    "date-system-1904",
-    "no-style-sheet",
-    "part-names",
-    "taken-for-dates",
-    "not-taken-for-dates",
-    "number-format-count",
-    "default-date-style",
-    "phonetic-texts",
-    "inline-runs",
-    "inline-values",
-    "cdata-texts",
-    "values-in-pieces",
-    "booleans-as-words",
-    "lower-case-references",
+    "namespace-prefix",    "shared-strings-without-count",
+    "iso-dates",           "date-system-1904",
+    "no-style-sheet",      "part-names",
+    "taken-for-dates",     "not-taken-for-dates",
+    "number-format-count", "built-in-format-ids",
+    "unlisted-formats",    "cells-without-style",
+    "default-date-style",  "phonetic-texts",
+    "inline-runs",         "inline-values",
+    "cdata-texts",         "values-in-pieces",
+    "booleans-as-words",   "lower-case-references",
 };
 
 bool isCuredByStandard(const Trait& trait) {
@@ -396,8 +389,8 @@ std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answer
     addAll(traits, findings, noStyleSheet, movedParts, lostCells, longTexts, shownInTexts,
            kFormulas, kNumbersAsNames);
     if (!findings.stylesPrefixed) {  // otherwise the prefix explains what happens to the formats
-        for (const auto trait :
-             {takenForDates, notTakenForDates, uncountedFormats, mixedDates, defaultDateStyle})
+        for (Trait& trait : misjudgedFormats(findings, answers)) add(traits, std::move(trait));
+        for (const auto trait : {mixedDates, defaultDateStyle})
             add(traits, trait(findings, answers));
     }
     addAll(traits, findings, kMergedCells, phoneticTexts, kErrorCells, hiddenWorksheets,

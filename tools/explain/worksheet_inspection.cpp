@@ -325,7 +325,6 @@ class Pass {
         if (has(tables_.texts.cdata)) findings_.cdataTexts.add(cell_.place);
     }
 
-    // A cell without a style has the first one.
     void countStyle() {
         const NumberFormats* const formats = tables_.formats;
         if (formats == nullptr) return;
@@ -333,7 +332,7 @@ class Pass {
         if (cell_.type != "b") {
             const long index = std::strtol(cell_.style.c_str(), nullptr, 10);
             if (index < 0 || index >= static_cast<long>(formats->size())) return;
-            style = static_cast<int>(index);
+            style = cell_.style.empty() ? StyledColumn::kNone : static_cast<int>(index);
             if (findings_.formats.count(style) == 0) {
                 findings_.formats.emplace(style, formats->of(style));
             }
