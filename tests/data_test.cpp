@@ -111,6 +111,8 @@ json imported(const std::string& path, int rules = 0) {
     EXPECT_EQ(dp::CreateDataProvider("xlsx", &made), 0);
     const dp::Reference provider(made);
     EXPECT_EQ(dp::SetReadingRules(made, rules), 0);
+    const auto goOn = [](double, void*) { return 0; };
+    EXPECT_EQ(dp::SetProgress(made, goOn, nullptr), 0);
     EXPECT_EQ(provider->OpenFile(path.c_str(), dp::IDataProvider::FileAccess::Read), 0);
     const json all = contents(*provider);
     EXPECT_EQ(provider->CloseFile(), 0);
