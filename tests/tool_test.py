@@ -14,6 +14,7 @@ import resource
 import signal
 import shlex
 import shutil
+import string
 import struct
 import subprocess
 import sys
@@ -541,6 +542,24 @@ class ToolTest(unittest.TestCase):
         self.run_tool(SAMPLE, "--json", "/dev/full", expected=3)
         self.run_tool(SAMPLE, "--json", "none/x.json", expected=3)
         self.run_tool(SAMPLE, "--csv", f"{SAMPLE}/x/", expected=3)
+
+    def test_output_is_written_whole_or_not_at_all(self):
+        letters = [a + b for a in "ABCDEFGH" for b in string.ascii_uppercase]
+        book = self.book({**PARTS, SHEET: SHEET_OF.format('<row r="2">' + "".join(
+            f'<c r="{letter}2"><v>1</v></c>' for letter in letters) + "</row>")})
+        target = self.folder / "out.json"
+        target.write_text("before")
+        target.chmod(0o640)
+        (self.folder / "link").symlink_to(target)
+        for limit, code in ((60000, 3), (resource.RLIM_INFINITY, 0)):
+            done = subprocess.run(
+                [TOOL, book, "--json", self.folder / "link"], env=self.environment(), check=False,
+                stderr=subprocess.PIPE, restore_signals=False,  # the limit is an error, not a signal
+                preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (limit, limit)))
+            self.assertEqual(done.returncode, code, done.stderr)
+            self.assertEqual(target.read_text() == "before", code != 0)
+            self.assertEqual(target.stat().st_mode & 0o777, 0o640)
+            self.assertEqual(sorted(os.listdir(self.folder)), ["book.xlsx", "link", "out.json", "temporary"])
 
     def test_a_relative_name_and_any_letter_case_open(self):
         shutil.copy(SAMPLE, self.folder / "BOOK.XLSX")
