@@ -18,6 +18,8 @@ namespace dp::tool {
 
 namespace {
 
+using Json = nlohmann::ordered_json;
+
 constexpr const char* kNothing = "nothing to explain";
 
 struct Attempt {
@@ -72,7 +74,46 @@ bool isOfTheSystem(const Failure& failure) {
            code == kLibraryFailure || code == kUsage;
 }
 
-std::vector<Trait> allTraits(const Library& library, Options options) {
+// Nothing when the inspection fails: the result of the import itself stands.
+Findings quickFindings(const std::string& book, const std::string& folder,
+                       const std::set<std::string>& leftOut) {
+    try {
+        return inspectQuickly(book, folder, leftOut);
+    } catch (const std::exception&) {
+        return {};
+    }
+}
+
+std::string line(const Trait& trait) {
+    std::string text = printable(trait.found + ": " + trait.effect + "; " + trait.advice);
+    text[0] = static_cast<char>(std::toupper(static_cast<unsigned char>(text[0])));
+    return text + "\n";
+}
+
+Json traitJson(const Trait& trait) {
+    Json cures = Json::array();
+    for (const std::string& cure : trait.cures) cures.push_back(validUtf8(cure));
+    Json places = Json::array();
+    for (const TraitPlace& place : trait.places) {
+        if (place.place.empty()) continue;  // a column that is not known
+        Json json = {{"place", validUtf8(place.place)}};
+        if (place.cells > 0) json["cells"] = place.cells;
+        if (!place.options.empty()) json["cure"] = validUtf8(place.options);
+        places.push_back(std::move(json));
+    }
+    return {{"trait", trait.key},
+            {"found", validUtf8(trait.found)},
+            {"effect", validUtf8(trait.effect)},
+            {"advice", validUtf8(trait.advice)},
+            {"importFails", trait.fatal},
+            {"cures", std::move(cures)},
+            {"places", std::move(places)}};
+}
+
+}  // namespace
+
+std::vector<Trait> findTraits(const Library& library, const Options& given) {
+    Options options = given;
     options.settings.cleanSheetNames = false;  // the book itself has the original names
     const Attempt attempt = tryImport(library, options);
     const std::optional<Failure>& failure = attempt.failure;
@@ -91,40 +132,17 @@ std::vector<Trait> allTraits(const Library& library, Options options) {
     return traits;
 }
 
-// Nothing when the inspection fails: the result of the import itself stands.
-Findings quickFindings(const std::string& book, const std::string& folder,
-                       const std::set<std::string>& leftOut) {
-    try {
-        return inspectQuickly(book, folder, leftOut);
-    } catch (const std::exception&) {
-        return {};
-    }
-}
-
-std::string line(const Trait& trait) {
-    std::string text = printable(trait.found + ": " + trait.effect + "; " + trait.advice);
-    text[0] = static_cast<char>(std::toupper(static_cast<unsigned char>(text[0])));
-    return text + "\n";
-}
-
-std::string jsonText(const std::string& book, const std::vector<Trait>& traits) {
-    using Json = nlohmann::ordered_json;
+Json explanationJson(const std::string& book, const std::vector<Trait>& traits) {
     Json list = Json::array();
-    for (const Trait& trait : traits) {
-        list.push_back({{"trait", trait.key},
-                        {"found", validUtf8(trait.found)},
-                        {"effect", validUtf8(trait.effect)},
-                        {"advice", validUtf8(trait.advice)},
-                        {"importFails", trait.fatal}});
-    }
-    return Json({{"file", validUtf8(book)}, {"traits", list}}).dump() + "\n";
+    for (const Trait& trait : traits) list.push_back(traitJson(trait));
+    return {{"file", validUtf8(book)}, {"traits", list}};
 }
-
-}  // namespace
 
 void explain(const Library& library, const Options& options, Output& output) {
-    const std::vector<Trait> traits = allTraits(library, options);
-    if (options.view == View::Json) return output.write(jsonText(options.book, traits));
+    const std::vector<Trait> traits = findTraits(library, options);
+    if (options.view == View::Json) {
+        return output.write(explanationJson(options.book, traits).dump() + "\n");
+    }
     for (const Trait& trait : traits) output.write(line(trait));
     if (traits.empty()) output.write(printable(options.book) + ": " + kNothing + "\n");
 }

@@ -2,13 +2,24 @@
 
 #include <set>
 #include <string>
+#include <vector>
 
+#include <nlohmann/json_fwd.hpp>
+
+#include "tools/explain/trait.h"
 #include "tools/host/exit_code.h"
 #include "tools/host/library.h"
 #include "tools/options/options.h"
 #include "tools/views/output.h"
 
 namespace dp::tool {
+
+// What an import of the book does that its user may not expect. Imports the book. Throws a Failure
+// when the file cannot be read at all.
+std::vector<Trait> findTraits(const Library& library, const Options& options);
+
+// The traits as --explain writes them with --json.
+nlohmann::ordered_json explanationJson(const std::string& book, const std::vector<Trait>& traits);
 
 // Writes, trait by trait, what an import of the book does that its user may not expect. Throws a
 // Failure when the file cannot be read at all.

@@ -22,25 +22,31 @@ std::string asDisplayed(std::string code) {
 // The cells of some styles in some columns.
 struct Collected {
     Places cells;
-    Names codes;                          // each one once
-    std::vector<std::string> references;  // the columns, each one once
+    Names codes;    // each one once
+    Tally columns;  // of those without a name only the number of cells
     std::set<std::string> seen;
 
     void add(const StyledCells& of, const std::string& code) {
         if (cells.count == 0) cells.first = of.cells.first;
         cells.count += of.cells.count;
         if (seen.insert(code).second) codes.add(asDisplayed(code));
-        const bool isNew = references.empty() || references.back() != of.reference;
-        if (isNew) references.push_back(of.reference);  // they come column by column
+        columns.add({of.reference, "", of.cells.count});  // they come column by column
     }
 
-    std::string types(const char* type) const {
-        std::string text;
-        for (const std::string& reference : references) {
-            const std::string column = reference.empty() ? "COLUMN" : reference;
-            text += (text.empty() ? "--type " : " --type ") + shellWord(column + "=" + type);
+    // The columns with the option that gives each of them the type.
+    std::vector<TraitPlace> typed(const char* type) const {
+        std::vector<TraitPlace> places = placesOf(columns);
+        for (TraitPlace& place : places) {
+            const std::string column = place.place.empty() ? "COLUMN" : place.place;
+            place.options = "--type " + shellWord(column + "=" + type);
         }
-        return text;
+        return places;
+    }
+
+    bool allNamed() const {
+        const auto& entries = columns.entries();
+        return std::none_of(entries.begin(), entries.end(),
+                            [](const Tally::Entry& entry) { return entry.place.empty(); });
     }
 };
 
@@ -71,6 +77,8 @@ struct Misjudged {
     const char* advice = "";  // beside another kind for the column
 };
 
+constexpr const char* kReadAsNumbers = "read the column as numbers: ";
+constexpr const char* kReadAsDates = "read the column as dates: ";
 constexpr const char* kLongCodes = "in formats with codes of more than 1,024 bytes";
 constexpr const char* kUnderBuiltIns =
     "in formats of the book's own under the ids of built-in ones";
@@ -99,13 +107,15 @@ Found misjudged(const Findings& findings, const StyleAnswers& answers, const Mis
                answer.isDate != isDate && mayBe(kind, isDate ? Kind::Number : Kind::DateTime);
     });
     if (found.cells.count == 0) return std::nullopt;
-    std::string advice = isDate ? "read the column as dates: " + found.types("datetime")
-                                : "read the column as numbers: " + found.types("numeric");
+    const std::vector<TraitPlace> places = found.typed(isDate ? "datetime" : "numeric");
+    const std::string cure = optionsOf(places);
+    std::string advice = (isDate ? kReadAsDates : kReadAsNumbers) + cure;
     if (*formats.advice != '\0') advice += std::string(", or ") + formats.advice;
-    return Trait{formats.key,
-                 placed(found.cells, isDate ? "date" : "number") + " " + formats.where + ": " +
-                     listed(found.codes, true),
-                 isDate ? "day numbers arrive" : "date-times arrive", advice};
+    return located({formats.key,
+                    placed(found.cells, isDate ? "date" : "number") + " " + formats.where + ": " +
+                        listed(found.codes, true),
+                    isDate ? "day numbers arrive" : "date-times arrive", advice},
+                   places, found.allNamed() ? cure : "");
 }
 
 }  // namespace
@@ -123,11 +133,12 @@ Found defaultDateStyle(const Findings& findings, const StyleAnswers& answers) {
         return answer.isDate && format.isDate && !answer.hasPattern && mayBe(kind, Kind::DateTime);
     });
     if (found.cells.count == 0) return std::nullopt;
-    return Trait{"default-date-style",
-                 placed(found.cells, "date") +
-                     " in formats without a counterpart: " + listed(found.codes, true),
-                 "the values are right, but are displayed in the default date style",
-                 "use a format such as m/d/yyyy to choose how they are displayed"};
+    return located({"default-date-style",
+                    placed(found.cells, "date") +
+                        " in formats without a counterpart: " + listed(found.codes, true),
+                    "the values are right, but are displayed in the default date style",
+                    "use a format such as m/d/yyyy to choose how they are displayed"},
+                   placesOf(found.columns));
 }
 
 // The first value decides the kind of the whole column.
@@ -143,10 +154,11 @@ Found mixedDates(const Findings& findings, const StyleAnswers& answers) {
         if (mixed && !styled.isChosen) cells.add({styled.reference, "", styled.cells.count});
     }
     if (cells.empty()) return std::nullopt;
-    return Trait{
-        "mixed-dates", "dates and numbers in one column: " + cells.text(cells.columns()),
-        "the first value of the column decides: dates arrive as day numbers, or numbers as dates",
-        "give them columns of their own"};
+    return located(
+        {"mixed-dates", "dates and numbers in one column: " + cells.text(cells.columns()),
+         "the first value of the column decides: dates arrive as day numbers, or numbers as dates",
+         "give them columns of their own"},
+        placesOf(cells));
 }
 
 }  // namespace dp::tool

@@ -17,6 +17,7 @@ class Tally {
 
     // Adds the cells of one column.
     void add(Entry entry);
+    const std::vector<Entry>& entries() const { return entries_; }
     bool empty() const { return entries_.empty(); }
     size_t total() const { return total_; }
     size_t columns() const { return entries_.size(); }

@@ -1,5 +1,7 @@
 #include "tools/explain/trait.h"
 
+#include <utility>
+
 #include "tools/views/text.h"
 
 namespace dp::tool {
@@ -24,6 +26,24 @@ std::string worksheets(const Names& names) {
 std::string placed(const Places& places, const std::string& unit) {
     const std::string first = places.count == 1 ? " (" : " (first: ";
     return counted(places.count, unit) + first + places.first + ")";
+}
+
+std::vector<TraitPlace> placesOf(const Tally& cells) {
+    std::vector<TraitPlace> places;
+    for (const Tally::Entry& entry : cells.entries()) places.push_back({entry.place, entry.count});
+    return places;
+}
+
+std::string optionsOf(const std::vector<TraitPlace>& places) {
+    std::string options;
+    for (const TraitPlace& place : places) options += (options.empty() ? "" : " ") + place.options;
+    return options;
+}
+
+Trait located(Trait trait, std::vector<TraitPlace> places, const std::string& options) {
+    trait.places = std::move(places);
+    if (!options.empty()) trait.cures.push_back(options);
+    return trait;
 }
 
 std::string joined(const std::vector<std::string>& texts, const char* between) {

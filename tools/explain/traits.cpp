@@ -22,6 +22,7 @@ struct CellTrait {
     const char* effect;
     const char* advice;
     const char* note = "";
+    const char* cure = "";
 };
 
 constexpr CellTrait kMissingTexts{
@@ -53,7 +54,9 @@ constexpr CellTrait kNumbersAsNames{
     "number",
     "and no text in the row of names",
     "they become names, not data",
-    "if they are data: --names none; if the names are in another row: --name-row ROW"};
+    "if they are data: --names none; if the names are in another row: --name-row ROW",
+    "",
+    "--names none"};
 constexpr CellTrait kMergedCells{
     "merged-cells",
     &Findings::mergedRanges,
@@ -99,12 +102,19 @@ constexpr CellTrait kBooleanWords{"booleans-as-words",
                                   "0 arrives, as for FALSE",
                                   kSaveAgain};
 
+std::vector<TraitPlace> placesOf(const Names& worksheets) {
+    std::vector<TraitPlace> places;
+    for (const std::string& title : worksheets.first) places.push_back({title});
+    return places;
+}
+
 Found found(const Findings& findings, const CellTrait& trait) {
     const Places& cells = findings.*trait.cells;
     if (cells.count == 0) return std::nullopt;
     std::string what = placed(cells, trait.unit);
     if (*trait.what != '\0') what += std::string(" ") + trait.what;
-    return Trait{trait.key, what, trait.effect, trait.advice, false, trait.note};
+    return located({trait.key, what, trait.effect, trait.advice, false, trait.note},
+                   {{cells.first}}, trait.cure);
 }
 
 Found found(const Findings& findings, Found (*trait)(const Findings&)) { return trait(findings); }
@@ -158,14 +168,14 @@ Found lostWorksheets(const Findings& findings) {
     const Names& sheets = findings.lostWorksheets;
     if (sheets.count == 0) return std::nullopt;
     const bool one = sheets.count == 1;
-    return Trait{"worksheet-without-part",
-                 worksheets(sheets) +
-                     " for which the package has no relationship to a worksheet's "
-                     "part (xl/_rels/workbook.xml.rels)",
-                 one ? "it is not imported" : "they are not imported",
-                 "get a fresh copy, or " + std::string(kSaveAgain),
-                 false,
-                 worksheets(sheets) + (one ? " is not imported" : " are not imported")};
+    return located(
+        {"worksheet-without-part",
+         worksheets(sheets) + " for which the package has no relationship to a worksheet's "
+                              "part (xl/_rels/workbook.xml.rels)",
+         one ? "it is not imported" : "they are not imported",
+         "get a fresh copy, or " + std::string(kSaveAgain), false,
+         worksheets(sheets) + (one ? " is not imported" : " are not imported")},
+        placesOf(sheets));
 }
 
 struct OtherFile {
@@ -239,37 +249,43 @@ Found movedParts(const Findings& findings) {
 Found shownInTexts(const Findings& findings) {
     const Tally& cells = findings.lost.shown;
     if (cells.empty()) return std::nullopt;
-    return Trait{
-        "shown-in-texts",
-        counted(cells.total(), "number or date", "numbers or dates") +
-            " in columns of texts: " + cells.text(cells.columns()),
-        "they arrive as displayed: what their formats do not show is lost",
-        "put them into columns of their own, or give them formats that show all of the value"};
+    return located(
+        {"shown-in-texts",
+         counted(cells.total(), "number or date", "numbers or dates") +
+             " in columns of texts: " + cells.text(cells.columns()),
+         "they arrive as displayed: what their formats do not show is lost",
+         "put them into columns of their own, or give them formats that show all of the value"},
+        placesOf(cells));
 }
 
 Found phoneticTexts(const Findings& findings) {
     std::vector<std::string> found;
     std::vector<std::string> effects;
+    std::vector<TraitPlace> places;
     if (findings.phoneticTexts.count > 0) {
+        places.push_back({findings.phoneticTexts.first});
         found.push_back(placed(findings.phoneticTexts, "cell") +
                         " with phonetic readings in a shared text");
         effects.emplace_back("the readings are appended to the texts");
     }
     if (findings.phoneticCells.count > 0) {
+        places.push_back({findings.phoneticCells.first});
         found.push_back(placed(findings.phoneticCells, "inline text") + " with phonetic readings");
         effects.emplace_back("the readings replace inline texts");
     }
     if (found.empty()) return std::nullopt;
-    return Trait{"phonetic-texts", joined(found, ", "), joined(effects, ", "),
-                 "delete the phonetic guides in a spreadsheet program"};
+    return located({"phonetic-texts", joined(found, ", "), joined(effects, ", "),
+                    "delete the phonetic guides in a spreadsheet program"},
+                   places);
 }
 
 Found hiddenWorksheets(const Findings& findings) {
     if (findings.hiddenWorksheets.count == 0) return std::nullopt;
-    return Trait{
-        "hidden-worksheets", "hidden " + worksheets(findings.hiddenWorksheets),
-        "imported like the visible ones",
-        "to leave one out: --exclude-sheet " + shellWord(findings.hiddenWorksheets.first.front())};
+    const std::string cure =
+        "--exclude-sheet " + shellWord(findings.hiddenWorksheets.first.front());
+    return located({"hidden-worksheets", "hidden " + worksheets(findings.hiddenWorksheets),
+                    "imported like the visible ones", "to leave one out: " + cure},
+                   placesOf(findings.hiddenWorksheets), cure);
 }
 
 std::string described(const WrongTexts& texts, const std::string& type) {
@@ -279,16 +295,18 @@ std::string described(const WrongTexts& texts, const std::string& type) {
 
 Found notNumbers(const Findings& findings) {
     if (findings.notNumbers.cells.count == 0) return std::nullopt;
-    return Trait{"not-a-number", described(findings.notNumbers, "number"),
-                 "the number at the beginning of such a text arrives (0x10 is 16), or 0",
-                 "let the program that makes the book write plain numbers, such as 1.5"};
+    return located({"not-a-number", described(findings.notNumbers, "number"),
+                    "the number at the beginning of such a text arrives (0x10 is 16), or 0",
+                    "let the program that makes the book write plain numbers, such as 1.5"},
+                   {{findings.notNumbers.cells.first}});
 }
 
 Found notBooleans(const Findings& findings) {
     if (findings.notBooleans.cells.count == 0) return std::nullopt;
-    return Trait{"not-a-boolean", described(findings.notBooleans, "Boolean"),
-                 "the number at the beginning of such a text arrives, or 0",
-                 "let the program that makes the book write 0 or 1"};
+    return located({"not-a-boolean", described(findings.notBooleans, "Boolean"),
+                    "the number at the beginning of such a text arrives, or 0",
+                    "let the program that makes the book write 0 or 1"},
+                   {{findings.notBooleans.cells.first}});
 }
 
 Found lowerCase(const Findings& findings) {
@@ -296,33 +314,40 @@ Found lowerCase(const Findings& findings) {
     const std::string found =
         placed(findings.lowerCase, "cell") + " with lower-case letters in the reference";
     if (findings.lowerCaseFails) {
-        return Trait{"lower-case-references", found, kOpenFails, kSaveAgain, true};
+        return located({"lower-case-references", found, kOpenFails, kSaveAgain, true},
+                       {{findings.lowerCase.first}});
     }
     const std::string first = findings.lowerCase.count == 1 ? "it" : "the first one";
-    return Trait{"lower-case-references", found,
-                 first + " arrives in column " + findings.lowerCaseColumn +
-                     (findings.lowerCase.count == 1 ? "" : ", the others are moved as well"),
-                 kSaveAgain};
+    return located({"lower-case-references", found,
+                    first + " arrives in column " + findings.lowerCaseColumn +
+                        (findings.lowerCase.count == 1 ? "" : ", the others are moved as well"),
+                    kSaveAgain},
+                   {{findings.lowerCase.first}});
 }
 
 Found lostCells(const Findings& findings) {
     const Tally& cells = findings.lost.cells;
     if (cells.empty()) return std::nullopt;
-    return Trait{"lost-on-conversion",
-                 counted(cells.total(), "cell") + (cells.total() == 1 ? " does" : " do") +
-                     " not fit the kind of the column: " + cells.text(cells.columns()),
-                 "a missing value arrives",
-                 "to keep the content as displayed: " + cells.textTypes(cells.columns())};
+    std::vector<TraitPlace> places = placesOf(cells);
+    for (TraitPlace& place : places) place.options = "--type " + shellWord(place.place + "=text");
+    const std::string cure = optionsOf(places);
+    return located({"lost-on-conversion",
+                    counted(cells.total(), "cell") + (cells.total() == 1 ? " does" : " do") +
+                        " not fit the kind of the column: " + cells.text(cells.columns()),
+                    "a missing value arrives", "to keep the content as displayed: " + cure},
+                   places, cure);
 }
 
 Found longTexts(const Findings& findings) {
     const Tally& texts = findings.lost.cutTexts;
     if (texts.empty()) return std::nullopt;
-    return Trait{"long-texts",
-                 counted(texts.total(), "text") + " longer than " +
-                     std::to_string(findings.textLimit) + " bytes: " + texts.text(texts.columns()),
-                 "the rest is cut off",
-                 "to keep all of it: --max-text " + std::to_string(findings.lost.longest)};
+    const std::string cure = "--max-text " + std::to_string(findings.lost.longest);
+    return located(
+        {"long-texts",
+         counted(texts.total(), "text") + " longer than " + std::to_string(findings.textLimit) +
+             " bytes: " + texts.text(texts.columns()),
+         "the rest is cut off", "to keep all of it: " + cure},
+        placesOf(texts), cure);
 }
 
 void add(std::vector<Trait>& traits, Found trait) {
@@ -373,6 +398,7 @@ std::vector<Trait> underRules(std::vector<Trait> traits, bool standard) {
         for (Trait& trait : traits) {
             if (!isCuredByStandard(trait)) continue;
             trait.advice.insert(0, "use --standard, or ");
+            trait.cures.insert(trait.cures.begin(), "--standard");
             if (!trait.note.empty()) trait.note += " (--standard cures it)";
         }
         return traits;
