@@ -10,6 +10,7 @@
 #include "tools/host/workbook.h"
 #include "tools/options/help.h"
 #include "tools/options/options.h"
+#include "tools/page/page_view.h"
 #include "tools/views/csv.h"
 #include "tools/views/json_view.h"
 #include "tools/views/output.h"
@@ -36,6 +37,12 @@ void refuseToOverwrite(const Options& options) {
     throw Failure(kUsage, options.target + ": is the workbook itself; name another file to write");
 }
 
+void showPage(const Library& library, Workbook& workbook, const Options& options) {
+    Output output(options.target);
+    writePage(library, workbook, options, output);
+    output.finish();
+}
+
 void show(Workbook& workbook, const Options& options) {
     workbook.open();
     if (options.view == View::Csv) return writeCsv(workbook, options);
@@ -54,6 +61,10 @@ void printNotes(const Workbook& workbook, const Options& options) {
 
 void importBook(const Library& library, const Options& options) {
     Workbook workbook(library, options);
+    if (options.view == View::Page) {
+        showPage(library, workbook, options);
+        return printNotes(workbook, options);
+    }
     if (options.view != View::Names) {
         show(workbook, options);
         return printNotes(workbook, options);

@@ -4,6 +4,7 @@
 #include <charconv>
 #include <memory>
 
+#include <dpxlsx/model/host/i_finders.h>
 #include <dpxlsx/model/host/i_string.h>
 #include <dpxlsx/model/host/i_variable_format.h>
 
@@ -150,6 +151,16 @@ std::string Column::formatText() const {
     }
     const auto& texts = static_cast<const ITextVariableFormat&>(*format);
     return "text, up to " + howMany(texts.GetCharacterCount(), "byte");
+}
+
+std::optional<Column> loadedAsTexts(IDataProvider& provider, const Column& column, bool preview) {
+    IColumn* found = nullptr;
+    auto type = IVariableFormat::FormatType::Numeric;
+    provider.GetVariableFinder()->FindColumn(column.host().GetPrimeKey(), &found,
+                                             IVariable::StorageType::Text, &type, true);
+    if (found == nullptr) return std::nullopt;
+    Column texts(found, kDefaultMissing, preview);
+    return texts.kind() == Kind::Text ? std::optional(texts) : std::nullopt;
 }
 
 const INumericColumn& Column::numeric() const {

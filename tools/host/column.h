@@ -1,8 +1,10 @@
 #pragma once
 
+#include <optional>
 #include <string>
 
 #include <dpxlsx/model/host/i_column.h>
+#include <dpxlsx/model/host/i_data_provider.h>
 #include <dpxlsx/model/host/reference.h>
 
 namespace dp::tool {
@@ -58,5 +60,8 @@ class Column {
     Kind kind_;
     size_t rows_;
 };
+
+// The column of numbers or date-times loaded again as texts; none when an option forces its kind.
+std::optional<Column> loadedAsTexts(IDataProvider& provider, const Column& column, bool preview);
 
 }  // namespace dp::tool

@@ -30,15 +30,10 @@ size_t lostRows(const Column& column, const Column& texts, const std::string& ma
 // Lost cells when a text marks missing numbers: the library's count includes the cells with that
 // text.
 size_t lostBesideWord(IDataProvider& provider, const Column& column, const Options& options) {
-    IColumn* found = nullptr;
-    auto type = IVariableFormat::FormatType::Numeric;
-    provider.GetVariableFinder()->FindColumn(column.host().GetPrimeKey(), &found,
-                                             IVariable::StorageType::Text, &type, true);
-    if (found == nullptr) return 0;
-    const Column texts(found, kDefaultMissing, options.settings.preview);
+    const std::optional<Column> texts = loadedAsTexts(provider, column, options.settings.preview);
     // When an option forces the kind of the column, only the library's count is available.
-    return texts.kind() == Kind::Text ? lostRows(column, texts, options.settings.missingWord->first)
-                                      : static_cast<size_t>(column.convertedMissing());
+    return texts ? lostRows(column, *texts, options.settings.missingWord->first)
+                 : static_cast<size_t>(column.convertedMissing());
 }
 
 // Lost cells when a number marks missing ones: the library's count includes the cells with that

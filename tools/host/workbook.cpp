@@ -87,6 +87,10 @@ void Workbook::refuse(const UnknownWorksheet& unknown) {
 
 std::vector<SheetEntry> Workbook::worksheets() { return listSheets(*provider_); }
 
+size_t Workbook::columnCount(const SheetEntry& sheet) {
+    return columnKeys(*provider_->GetVariableFinder(), sheet.key).size();
+}
+
 LoadedWorksheet Workbook::load(const SheetEntry& sheet) {
     LoadedWorksheet worksheet{findWorksheet(sheet.key), sheet.key, sheet.title, {}, {}, {}};
     loadColumns(worksheet);
@@ -142,6 +146,10 @@ void Workbook::notePositions(const LoadedWorksheet& worksheet) {
                               std::to_string(position) +
                               "; give one of them another place: --position COLUMN=N");
     }
+}
+
+std::optional<Column> Workbook::asTexts(const Column& column) {
+    return loadedAsTexts(*provider_, column, options_.settings.preview);
 }
 
 void Workbook::noteShown(const LoadedWorksheet& worksheet) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <set>
 #include <string>
 #include <vector>
@@ -53,8 +54,12 @@ class Workbook {
     void open();
     // The worksheets that the options select, in workbook order.
     std::vector<SheetEntry> worksheets();
+    size_t columnCount(const SheetEntry& sheet);
     LoadedWorksheet load(const SheetEntry& sheet);
 
+    // The column loaded as texts, which have the content of cells that did not fit its kind; none
+    // when an option forces the kind.
+    std::optional<Column> asTexts(const Column& column);
     // Counts, in the columns of texts, the numbers and dates that do not arrive in full.
     void noteShown(const LoadedWorksheet& worksheet);
     // What was lost of the columns loaded so far.

@@ -10,9 +10,8 @@ namespace dp::tool {
 
 namespace {
 
-constexpr const char* kIntroduction = R"(Usage: dpxlsx [OPTIONS] BOOK.xlsx
-Imports an Excel workbook as a host does and shows columns and first rows.
-)";
+constexpr const char* kIntroduction =
+    "Usage: dpxlsx [OPTIONS] BOOK.xlsx: import an Excel workbook as a host does\n";
 
 constexpr const char* kExitCodes =
     R"(Options with ... may be repeated. Defaults are in parentheses.

@@ -11,7 +11,7 @@
 
 namespace dp::tool {
 
-enum class View { Tables, Names, Csv, Json };
+enum class View { Tables, Names, Csv, Json, Page };
 
 // A number as the user writes it; no value stands for the word "missing".
 using NumberOrMissing = std::optional<double>;
@@ -56,7 +56,7 @@ struct Options {
     std::string book;
     std::string library;
     View view = View::Tables;
-    std::string target = "-";         // file or folder of a CSV or JSON view
+    std::string target = "-";         // file or folder of a CSV, JSON or page view
     std::vector<std::string> sheets;  // names or keys; empty for all
     std::optional<size_t> head;       // rows
     bool asShown = false;

@@ -77,23 +77,6 @@ Json formulaJson(const IFormulaManager& formulas) {
             {"nodes", formulas.GetFormulaNodeCount()}};
 }
 
-Json worksheetJson(const LoadedWorksheet& worksheet) {
-    const IWorksheet& host = *worksheet.host;
-    return {{"key", worksheet.key},
-            {"title", validUtf8(worksheet.title)},
-            {"layout", layoutJson(worksheet.layout)},
-            {"columnsLeftOut", worksheet.leftOut.size()},
-            {"version", number(host.GetVersion())},
-            {"osVersion", host.GetOSVersion()},
-            {"creator", validUtf8(host.GetCreator())},
-            {"creationDates", validUtf8(host.GetCreationDates())},
-            {"comments", validUtf8(host.GetComments())},
-            {"hiddenColumnsUsed", host.GetHiddenColumnsUsed()},
-            {"ddeLinks", host.GetDDELinkCount()},
-            {"view", viewJson(*host.GetView())},
-            {"formulas", formulaJson(*host.GetFormulaManager())}};
-}
-
 void addNumericFormat(Json& json, const INumericVariableFormat& format) {
     int decimals = 0;
     int significant = 0;
@@ -186,6 +169,29 @@ Json listJson(const Column& column, size_t rows, ValueOf valueOf) {
     return list;
 }
 
+}  // namespace
+
+Json bookJson(const Workbook& workbook, const Options& options) {
+    return {{"file", validUtf8(options.book)}, {"missingValue", workbook.missing()}};
+}
+
+Json worksheetJson(const LoadedWorksheet& worksheet) {
+    const IWorksheet& host = *worksheet.host;
+    return {{"key", worksheet.key},
+            {"title", validUtf8(worksheet.title)},
+            {"layout", layoutJson(worksheet.layout)},
+            {"columnsLeftOut", worksheet.leftOut.size()},
+            {"version", number(host.GetVersion())},
+            {"osVersion", host.GetOSVersion()},
+            {"creator", validUtf8(host.GetCreator())},
+            {"creationDates", validUtf8(host.GetCreationDates())},
+            {"comments", validUtf8(host.GetComments())},
+            {"hiddenColumnsUsed", host.GetHiddenColumnsUsed()},
+            {"ddeLinks", host.GetDDELinkCount()},
+            {"view", viewJson(*host.GetView())},
+            {"formulas", formulaJson(*host.GetFormulaManager())}};
+}
+
 Json columnJson(const Column& column, size_t most) {
     const size_t rows = std::min(column.rows(), most);
     Json json = columnHead(column);
@@ -204,6 +210,8 @@ Json columnJson(const Column& column, size_t most) {
     return json;
 }
 
+namespace {
+
 void writeWorksheet(const LoadedWorksheet& worksheet, size_t most, Output& output) {
     output.write(opened(worksheetJson(worksheet)) + ",\"columns\":[");
     for (const Column& column : worksheet.columns) {
@@ -217,8 +225,7 @@ void writeWorksheet(const LoadedWorksheet& worksheet, size_t most, Output& outpu
 
 void writeJson(Workbook& workbook, const Options& options, Output& output) {
     const std::vector<SheetEntry> sheets = workbook.worksheets();
-    const Json head = {{"file", validUtf8(options.book)}, {"missingValue", workbook.missing()}};
-    output.write(opened(head) + ",\"worksheets\":[");
+    output.write(opened(bookJson(workbook, options)) + ",\"worksheets\":[");
     for (size_t i = 0; i < sheets.size(); ++i) {
         output.write(i == 0 ? "\n" : ",\n");
         writeWorksheet(workbook.load(sheets[i]), options.head.value_or(SIZE_MAX), output);

@@ -1,9 +1,18 @@
 #pragma once
 
+#include <nlohmann/json_fwd.hpp>
+
 #include "tools/host/workbook.h"
 #include "tools/views/output.h"
 
 namespace dp::tool {
+
+// The members of the JSON document before its worksheets.
+nlohmann::ordered_json bookJson(const Workbook& workbook, const Options& options);
+// What a host can read of a worksheet besides its columns.
+nlohmann::ordered_json worksheetJson(const LoadedWorksheet& worksheet);
+// What a host can read of a column, with the first values, at most `most`.
+nlohmann::ordered_json columnJson(const Column& column, size_t most);
 
 // One JSON document with everything that a host can read of the workbook: a line per column.
 // Values are in full precision, date-times are serial day numbers with their ISO and displayed
