@@ -93,11 +93,11 @@ bool isShownBesideDates(Kind kind) {
 // Collects the patterns between the counts of elapsed times, and the pattern of it all.
 class Translation {
   public:
-    explicit Translation(const FormatSection& section) : section_(section) {
-        halfDays_ = std::any_of(section.begin(), section.end(), [](const FormatToken& token) {
+    explicit Translation(const FormatSection& section) : tokens_(section.tokens) {
+        halfDays_ = std::any_of(tokens_.begin(), tokens_.end(), [](const FormatToken& token) {
             return token.kind == Kind::DayHalf;
         });
-        for (std::size_t i = 0; i < section.size(); ++i) translate(i);
+        for (std::size_t i = 0; i < tokens_.size(); ++i) translate(i);
         endPattern();
     }
 
@@ -106,7 +106,7 @@ class Translation {
 
   private:
     void translate(std::size_t i) {
-        const FormatToken& token = section_[i];
+        const FormatToken& token = tokens_[i];
         if (elapsedUnit(token.kind))
             count(token);
         else if (isDateOrTime(token.kind))
@@ -119,9 +119,9 @@ class Translation {
 
     // Whether it is the digits behind the point of the seconds.
     bool isFraction(std::size_t i) const {
-        if (i < 2 || section_[i].kind != Kind::Digits || section_[i - 1].kind != Kind::Point)
+        if (i < 2 || tokens_[i].kind != Kind::Digits || tokens_[i - 1].kind != Kind::Point)
             return false;
-        const Kind before = section_[i - 2].kind;
+        const Kind before = tokens_[i - 2].kind;
         return before == Kind::Second || before == Kind::ElapsedSeconds;
     }
 
@@ -144,7 +144,7 @@ class Translation {
         parts_.push_back({0, 0, std::exchange(pattern_, {})});
     }
 
-    const FormatSection& section_;
+    const std::vector<FormatToken>& tokens_;
     bool halfDays_ = false;  // hours count to twelve
     std::string literal_;    // since the last field
     std::string pattern_;    // since the last count
@@ -157,7 +157,7 @@ class Translation {
 EXCEL_FORMAT_TYPE dateTimeType(const FormatSection& section) {
     bool date = false;
     bool time = false;
-    for (const FormatToken& token : section) {
+    for (const FormatToken& token : section.tokens) {
         if (isDateOrTime(token.kind))
             (showsTime(token.kind) ? time : date) = true;
         else if (!date && !time &&
@@ -176,7 +176,7 @@ std::string toIcuPattern(const FormatSection& section) {
 std::unique_ptr<IDateTimeVariableFormat> createDateTimeFormat(const FormatSection& section) {
     Translation translation(section);
     const std::string pattern = translation.takePattern();
-    if (std::none_of(section.begin(), section.end(),
+    if (std::none_of(section.tokens.begin(), section.tokens.end(),
                      [](const FormatToken& token) { return elapsedUnit(token.kind) != 0; }))
         return std::make_unique<DateTimeVariableFormat>(pattern);
     return std::make_unique<ElapsedTimeVariableFormat>(pattern, translation.takeParts());

@@ -1,6 +1,7 @@
 #include "dpxlsx/formats/number_display.h"
 
 #include <cstddef>
+#include <vector>
 
 #include "dpxlsx/formats/automatic_format.h"
 #include "dpxlsx/formats/numeric_variable_format.h"
@@ -22,16 +23,16 @@ struct Placeholders {
 };
 
 // A comma between two digits groups thousands, one behind the last digit divides by a thousand.
-bool divides(const FormatSection& section, std::size_t comma) {
-    const bool behindDigits = comma > 0 && section[comma - 1].kind != Kind::Literal;
-    const bool beforeDigits = comma + 1 < section.size() && section[comma + 1].kind == Kind::Digits;
+bool divides(const std::vector<FormatToken>& tokens, std::size_t comma) {
+    const bool behindDigits = comma > 0 && tokens[comma - 1].kind != Kind::Literal;
+    const bool beforeDigits = comma + 1 < tokens.size() && tokens[comma + 1].kind == Kind::Digits;
     return behindDigits && !beforeDigits;
 }
 
-Placeholders placeholdersOf(const FormatSection& section) {
+Placeholders placeholdersOf(const std::vector<FormatToken>& tokens) {
     Placeholders found;
-    for (std::size_t i = 0; i < section.size(); ++i) {
-        const FormatToken& token = section[i];
+    for (std::size_t i = 0; i < tokens.size(); ++i) {
+        const FormatToken& token = tokens[i];
         if (token.kind == Kind::Digits && !found.exponent) {
             found.digits += token.text.size();
             if (found.behindPoint) found.decimals += token.text.size();
@@ -41,7 +42,7 @@ Placeholders placeholdersOf(const FormatSection& section) {
         found.percents += token.kind == Kind::Percent;
         found.others |= token.kind == Kind::FractionBar || token.kind == Kind::General ||
                         token.kind == Kind::Text || isDateOrTime(token.kind) ||
-                        (token.kind == Kind::Comma && divides(section, i));
+                        (token.kind == Kind::Comma && divides(tokens, i));
     }
     return found;
 }
@@ -56,7 +57,7 @@ std::unique_ptr<INumericVariableFormat> createNumeric(NumericSubtype subtype, in
 }  // namespace
 
 NumberDisplay numberDisplay(const FormatSection& section) {
-    const Placeholders found = placeholdersOf(section);
+    const Placeholders found = placeholdersOf(section.tokens);
     const int decimals = static_cast<int>(found.decimals);
     if (found.digits == 0 || found.others || found.percents + found.exponent > 1) return {};
     if (found.exponent) return {NumberDisplay::Kind::Scientific, decimals};

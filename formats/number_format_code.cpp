@@ -1,8 +1,11 @@
 #include "dpxlsx/formats/number_format_code.h"
 
 #include <algorithm>
+#include <charconv>
+#include <cmath>
 #include <cstddef>
 #include <iterator>
+#include <system_error>
 #include <utility>
 
 namespace dp {
@@ -34,6 +37,19 @@ constexpr Letter kElapsedLetters[] = {
 constexpr Letter kSymbols[] = {
     {'.', Kind::Point}, {',', Kind::Comma}, {'%', Kind::Percent}, {'@', Kind::Text}};
 
+struct Operator {
+    std::string_view text;
+    FormatCondition::Comparison comparison;
+};
+
+// An operator comes before those that it begins with.
+constexpr Operator kOperators[] = {{"<=", FormatCondition::Comparison::LessOrEqual},
+                                   {"<>", FormatCondition::Comparison::NotEqual},
+                                   {"<", FormatCondition::Comparison::Less},
+                                   {"=", FormatCondition::Comparison::Equal},
+                                   {">=", FormatCondition::Comparison::GreaterOrEqual},
+                                   {">", FormatCondition::Comparison::Greater}};
+
 template <std::size_t N>
 const Letter* find(const Letter (&table)[N], char c) {
     const Letter* found = std::find_if(std::begin(table), std::end(table),
@@ -59,11 +75,25 @@ std::size_t characterSize(std::string_view text) {
 bool isHour(Kind kind) { return kind == Kind::Hour || kind == Kind::ElapsedHours; }
 bool isSecond(Kind kind) { return kind == Kind::Second || kind == Kind::ElapsedSeconds; }
 
+// None unless the text is an operator and a number.
+std::optional<FormatCondition> conditionOf(std::string_view text) {
+    for (const Operator& each : kOperators) {
+        if (!text.starts_with(each.text)) continue;
+        text.remove_prefix(each.text.size());
+        double number = 0;
+        const char* const end = text.data() + text.size();
+        const auto result = std::from_chars(text.data(), end, number);
+        if (result.ec != std::errc() || result.ptr != end || !std::isfinite(number)) break;
+        return FormatCondition{each.comparison, number};
+    }
+    return std::nullopt;
+}
+
 // "m" means minutes right behind the hours or right before the seconds, whatever literals stand
 // between them.
-void tellMinutesFromMonths(FormatSection& section) {
+void tellMinutesFromMonths(std::vector<FormatToken>& tokens) {
     std::vector<FormatToken*> fields;
-    for (FormatToken& token : section)
+    for (FormatToken& token : tokens)
         if (isDateOrTime(token.kind)) fields.push_back(&token);
     for (std::size_t i = 0; i < fields.size(); ++i) {
         FormatToken& field = *fields[i];
@@ -88,9 +118,10 @@ class CodeParser {
   private:
     FormatSection section() {
         tokens_.clear();
+        condition_.reset();
         while (!rest_.empty() && rest_.front() != ';') token();
         tellMinutesFromMonths(tokens_);
-        return std::move(tokens_);
+        return {std::move(tokens_), condition_};
     }
 
     void token() {
@@ -162,6 +193,7 @@ class CodeParser {
     void bracketed(std::string_view inside) {
         if (inside.empty()) return;
         if (inside.front() == '$') return literal(inside.substr(1, inside.find('-') - 1));
+        if (const auto condition = conditionOf(inside)) condition_ = condition;
         const std::string text = lowered(inside);
         const Letter* elapsed = find(kElapsedLetters, text.front());
         if (elapsed && text.find_first_not_of(text.front()) == text.npos) add(elapsed->kind, text);
@@ -203,7 +235,8 @@ class CodeParser {
     }
 
     std::string_view rest_;
-    FormatSection tokens_;
+    std::vector<FormatToken> tokens_;
+    std::optional<FormatCondition> condition_;
 };
 
 }  // namespace

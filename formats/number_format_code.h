@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -41,8 +42,19 @@ struct FormatToken {
 // Whether the token shows part of a date, of a time of day or of an elapsed time.
 bool isDateOrTime(FormatToken::Kind kind) noexcept;
 
-// Without colours, conditions, languages, calendars and fillings, which no format here shows.
-using FormatSection = std::vector<FormatToken>;
+// "[>=100]": the numbers that a section is for.
+struct FormatCondition {
+    enum class Comparison { Less, LessOrEqual, Equal, NotEqual, GreaterOrEqual, Greater };
+
+    Comparison comparison;
+    double number;  // finite
+};
+
+struct FormatSection {
+    // Without colours, languages, calendars and fillings, which no format here shows.
+    std::vector<FormatToken> tokens;
+    std::optional<FormatCondition> condition;  // the last one written
+};
 
 // One section at least, possibly empty.
 struct NumberFormatCode {

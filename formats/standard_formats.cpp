@@ -4,7 +4,6 @@
 #include <iterator>
 
 #include "dpxlsx/formats/date_time_translation.h"
-#include "dpxlsx/formats/number_display.h"
 
 namespace dp {
 namespace {
@@ -84,12 +83,6 @@ std::string_view builtInFormatCode(int id) {
 
 EXCEL_FORMAT_TYPE formatType(const NumberFormatCode& code) {
     return dateTimeType(code.sections.front());
-}
-
-std::unique_ptr<IVariableFormat> createVariableFormat(const NumberFormatCode& code) {
-    const FormatSection& section = code.sections.front();
-    if (dateTimeType(section) != EXCEL_FORMAT_NONE) return createDateTimeFormat(section);
-    return createNumberFormat(numberDisplay(section));
 }
 
 }  // namespace dp

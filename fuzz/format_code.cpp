@@ -12,6 +12,7 @@
 #include "dpxlsx/formats/number_text.h"
 #include "dpxlsx/formats/numeric_variable_format.h"
 #include "dpxlsx/formats/percentage_variable_format.h"
+#include "dpxlsx/formats/sectioned_format.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/formats/style_classification.h"
 #include "dpxlsx/formats/text_variable_format.h"

@@ -13,6 +13,8 @@
 #include "dpxlsx/formats/date_time_translation.h"
 #include "dpxlsx/formats/excel_to_icu.h"
 #include "dpxlsx/formats/number_format_code.h"
+#include "dpxlsx/formats/section_choice.h"
+#include "dpxlsx/formats/sectioned_format.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/model/host/i_string.h"
 #include "tests/paths.h"
@@ -55,6 +57,77 @@ TEST(NumberFormatCodes, ShowWhatOtherProgramsShow) {
         for (std::size_t i = 0; i < row["shows"].size(); ++i)
             EXPECT_EQ(shown(*format, isNumber ? table["number"] : table["values"][i]), row["shows"][i]);
     }
+    ASSERT_GT(table["sectioned"].size(), 90u);
+    for (const auto& row : table["sectioned"]) {
+        const auto format = createVariableFormat(parseNumberFormat(row["code"].get<std::string>()));
+        for (std::size_t i = 0; i < table["numbers"].size(); ++i)
+            EXPECT_EQ(shown(*format, table["numbers"][i]), row["shows"][i]) << row << table["numbers"][i];
+    }
+}
+
+// Which section shows -1, 0, 1 and what is not a number; "-" for none.
+std::string choices(const std::string& code) {
+    const SectionChoice choice(parseNumberFormat(code));
+    std::string text;
+    for (const double value : {-1.0, 0.0, 1.0, std::numeric_limits<double>::quiet_NaN()}) {
+        const auto section = choice.of(value);
+        text += section ? std::to_string(*section) : "-";
+    }
+    return text;
+}
+
+TEST(NumberFormatCodes, SectionsByValue) {
+    const char* const cases[][2] = {
+        {"0", "0000"},           {"0;0", "1000"},        {"0;0;0", "1200"},    {"0;0;0;0;0", "1200"},
+        {"0;@", "0000"},         {"0;0;\"x\"@", "1000"}, {"@;0", "1000"},      {"0;0;0;@", "1200"},
+        {"[<0]0;0", "0110"},     {"[<=0]0;0", "0010"},   {"[=0]0;0", "1010"},  {"[<>0]0;0", "0100"},
+        {"[>=0]0;0", "1000"},    {"[>0]0;0", "1100"},    {"[<0]0", "0--0"},    {"[>0]0;[<0]0", "1-00"},
+        {"[<0]0;0;0", "0220"},   {"0;[=0]0;0", "2100"},  {"0;[<-1]0", "-000"}, {"[Red][>-1e0]0;0", "1000"},
+        {"[=0][=1]0;0", "1100"}, {"[>]0;0", "1000"},     {"[<0x]0;0", "1000"}, {"[<-inf]0;0", "1000"},
+        {"[<1e999]0;0", "1000"}, {"[=<1]0;0", "1000"},   {"0[>0]0;0", "1100"}, {"\"[<0]\"0;0", "1000"}};
+    for (const auto& [code, expected] : cases) EXPECT_EQ(choices(code), expected) << code;
+}
+
+// What a host asks for is of the first section, whatever the others show.
+TEST(NumberFormatCodes, SectionedFormatsForHosts) {
+    const struct {
+        const char* code;
+        NumericSubtype subtype;
+        int decimals;
+        bool automatic;
+    } numbers[] = {{"0.00;(0)", NumericSubtype::Fixed, 2, false},
+                   {"0.0E+00;yyyy", NumericSubtype::Scientific, 1, false},
+                   {"0.0%;0.00", NumericSubtype::Percentage, 1, false},
+                   {"\"up\";0.00", NumericSubtype::General, 0, true}};
+    for (const auto& c : numbers) {
+        const auto format = createVariableFormat(parseNumberFormat(c.code));
+        const auto& numeric = dynamic_cast<const INumericVariableFormat&>(*format);
+        EXPECT_EQ(numeric.GetNumericSubtype(), c.subtype) << c.code;
+        EXPECT_EQ(numeric.GetAuto(), c.automatic) << c.code;
+        int decimals = 0;
+        numeric.GetDecimalPlaces(&decimals, nullptr);
+        if (const auto* percentage = dynamic_cast<const IPercentageVariableFormat*>(&numeric))
+            decimals = percentage->GetDecimalPlaces();
+        EXPECT_EQ(decimals, c.decimals) << c.code;
+    }
+    const auto dates = createVariableFormat(parseNumberFormat("yyyy-mm;[Red]\"before \"0"));
+    EXPECT_STREQ(dynamic_cast<IDateTimeVariableFormat&>(*dates).GetFormatString()->database_str(), "yyyy-MM");
+    EXPECT_EQ(shown(*dates, -2), "before 2");
+}
+
+// Sections of dates and numbers in one code.
+TEST(NumberFormatCodes, SectionsOfDates) {
+    const struct {
+        const char* code;
+        double value;
+        const char* expected;
+    } cases[] = {{"[<100]0;yyyy-mm-dd", 45351, "2024-02-29"},
+                 {"h:mm;-h:mm", -0.25, "-6:00"},
+                 {"[h]:mm;([h]:mm)", -1.5, "(36:00)"},
+                 {"[h]:mm;[Red][h]:mm", -1.5, "-36:00"},
+                 {"[<1]h:mm;0.0", 2.5, "2.5"},
+                 {"[>1]yyyy;[h]\"x\"", -1.5, "-36x"}};
+    for (const auto& c : cases) EXPECT_EQ(shown(c.code, c.value), c.expected) << c.code;
 }
 
 // One letter a token: its kind, and the literals as they are.
@@ -63,7 +136,7 @@ std::string outline(const std::string& code) {
     std::string text;
     for (const FormatSection& section : parseNumberFormat(code).sections) {
         text += ';';
-        for (const FormatToken& token : section) {
+        for (const FormatToken& token : section.tokens) {
             const char name = names[static_cast<int>(token.kind)];
             text += name == 'L' ? '\'' + token.text + '\'' : std::string(1, name) + std::to_string(token.text.size());
         }
@@ -159,7 +232,7 @@ TEST(NumberFormatCodes, BuiltInFormats) {
 
 // Every text is some code, and every format of it shows something without complaint.
 TEST(NumberFormatCodes, RandomCodes) {
-    const std::string alphabet = "dymhsegbAaPM/[]$-.0#?;\\\"_*,%E+ :'@\x80\xE5";
+    const std::string alphabet = "dymhsegbAaPM/[]<>=$-.0#?;\\\"_*,%E+ :'@\x80\xE5";
     std::mt19937 random(4711);
     for (int i = 0; i < 20000; ++i) {
         std::string code(random() % 24, ' ');
@@ -168,7 +241,7 @@ TEST(NumberFormatCodes, RandomCodes) {
         ASSERT_FALSE(parsed.sections.empty());
         const auto format = createVariableFormat(parsed);
         ASSERT_EQ(format->GetType() == IVariableFormat::FormatType::DateTime, kindOf(code) != "number") << code;
-        if (i % 10 == 0) shown(*format, 45351.25);
+        if (i % 10 == 0) shown(*format, i % 20 == 0 ? 45351.25 : -2);
     }
 }
 

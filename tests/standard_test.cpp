@@ -133,6 +133,22 @@ TEST_F(Standard, ColumnsOfErrors) {
     provider.CloseFile();
 }
 
+// In a column of texts each number is a text as its own section shows it.
+TEST_F(Standard, NumbersAmongTexts) {
+    const auto package = PackageBuilder::of({"<row/><row><c t='str'><v>a</v></c></row><row><c s='0'><v>-5</v></c></row>"
+                                             "<row><c s='0'><v>0</v></c></row><row><c s='1'><v>5</v></c></row>"})
+                             .set("xl/styles.xml",
+                                  "<styleSheet><numFmts><numFmt numFmtId='164' formatCode='0.0;(0.0);\"none\"'/>"
+                                  "<numFmt numFmtId='165' formatCode='[=5]\"five\";0'/></numFmts>"
+                                  "<cellXfs><xf numFmtId='164'/><xf numFmtId='165'/></cellXfs></styleSheet>");
+    const testkit::KeptSettings kept;
+    RecordingProvider provider;
+    EXPECT_EQ(open(provider, package, kStandard), 0);
+    provider.GetWorksheetPrimeKeys();
+    EXPECT_EQ(dp::factsOf(provider, 1).rows(), "'a' '(5.0)' 'none' 'five'");
+    provider.CloseFile();
+}
+
 TEST(StandardTexts, EndAtWholeCharacters) {
     struct Case {
         const char* name;

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "dpxlsx/formats/automatic_format.h"
+#include "dpxlsx/formats/sectioned_format.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/standard/cell_values.h"
@@ -20,8 +21,8 @@ constexpr int kDateTime = 22;
 
 bool showsElapsedTime(const NumberFormatCode& code) {
     using Kind = FormatToken::Kind;
-    const FormatSection& section = code.sections.front();
-    return std::any_of(section.begin(), section.end(), [](const FormatToken& token) {
+    const std::vector<FormatToken>& tokens = code.sections.front().tokens;
+    return std::any_of(tokens.begin(), tokens.end(), [](const FormatToken& token) {
         return token.kind == Kind::ElapsedHours || token.kind == Kind::ElapsedMinutes ||
                token.kind == Kind::ElapsedSeconds;
     });

@@ -2,7 +2,8 @@
 // A row for each code of number_format_codes.txt and many more: whether it shows dates, times, both
 // or numbers, and what values look like. SheetJS tells dates from numbers; it and LibreOffice must
 // show the same. Where they do not, or where an import shows something else on purpose, a row of
-// `decisions` says which text holds and why; without one the run fails.
+// `decisions` says which text holds and why; without one the run fails. So it is with the rows of
+// `sectioned`, of number codes with several sections or conditions, and `chosen`.
 'use strict';
 const {execFileSync} = require('child_process');
 const fs = require('fs');
@@ -132,8 +133,8 @@ const decisions = [
         codes: ['h*-mm'], text: office,
         why: 'SheetJS shows the character that fills the cell',
     }, {
-        codes: ['[<1]h:mm;yyyy'], text: (_, code, value) => ssf('h:mm', value),
-        why: 'the first section decides, whatever its condition: a column has one format',
+        codes: ['[<1]h:mm;yyyy'], kind: 'time', text: sheetjs,
+        why: 'the first section decides the kind, whatever the others show',
     }, {
         codes: ['General d', 'General;yyyy', '0;yyyy', '@ yyyy', '0.00;-0.00;zero'], kind: 'number',
         why: 'the first section decides, and what it begins with; SheetJS says date but shows numbers too',
@@ -150,14 +151,136 @@ const decisions = [
         codes: ['# ?/?', '# ?/8', '#/##', '0,', '0.0,,', '0, "k"', '#,##0.00,', '0%%', '0.0E+00%'], text: allDigits,
         why: 'the numeric formats have no fractions, no division by thousands and no powers of percent',
     }, {
-        codes: ['"yyyy"', ';;;', ';yyyy', 'x', '"WAAR";"WAAR";"ONWAAR"'], kind: 'number', text: allDigits,
-        why: 'a section without digits hides the number; the format shows it',
+        codes: ['"yyyy"', ';;;', ';yyyy', 'x'], kind: 'number', text: allDigits,
+        why: 'the only section, or an empty one, hides the number; the format shows it',
+    }, {
+        codes: ['"WAAR";"WAAR";"ONWAAR"'], text: () => 'WAAR',
+        why: 'the text stands in place of the number',
     },
 ];
 
-// What LibreOffice shows, by way of a workbook and a text file: one row a code, one column a value.
+// Number codes with several sections or conditions. Behind some stands the code without what the numeric
+// formats do not show: grouping, units, widths, and texts around the numbers of the first section.
+const numbers = [-1234.567, -5, -0.4, 0, 0.4, 5, 100, 1234.567];
+const sectioned = [
+    // Two sections
+    ['0;-0'], ['0;(0)'], ['0.00;-0.00'], ['0.00;(0.00)'], ['0.0;- 0.0'], ['0.0;"minus "0.0'], ['0.0;0.0"-"'],
+    ['0.0;0.0" below"'], ['0.0;\\-0'], ['0;-0.000'], ['0.0%;-0.0%'], ['0%;(0.0%)'], ['0.00;-0%'], ['0%;-0.00'],
+    ['0.0E+00;-0.0E+00'], ['0.00E+00;(0.00E+00)'], ['0.00;-0.0E+00'], ['General;-General'], ['General;(General)'],
+    ['0.0;"below"'], ['"above";0.0'], ['0.0;[Red]-0.0'], ['[Blue]0.0;[Red](0.0)'], ['0.0;0.0'], ['0.0;[Red]0.0'],
+    ['0.00;@'], ['0.0;'], [';-0.0'],
+    // Three and four
+    ['0.0;-0.0;0'], ['0.0;-0.0;"-"'], ['0.0;(0.0);"zero"'], ['0.00;-0.00;0%'], ['0.0;-0.0;"none";@'],
+    ['0.0;-0.0;0.00;"text "@'], ['0.00;-0.00;@'], ['"up";"down";"same"'], ['0.0;-0.0;"about "0.0'],
+    ['General;-General;"nil"'], ['0.0%;-0.0%;-'], ['0;-0;;@'], ['0.0;;'], [';;0.0'], ['0.0;-0.0;#'],
+    ['0.0;-0.0;"none"#'],
+    // Grouping, units, widths
+    ['#,##0.00_);(#,##0.00)', '0.00;(0.00)'], ['#,##0_);[Red]\\(#,##0\\)', '0;(0)'],
+    ['"$"#,##0.00_);[Red]\\("$"#,##0.00\\)', '0.00;(0.00)'], ['"$"#,##0;-"$"#,##0', '0;-0'],
+    ['#,##0.00\\ "€";[Red]\\-#,##0.00\\ "€"', '0.00;-0.00'], ['[$€-2]\\ #,##0.00;\\-[$€-2]\\ #,##0.00', '0.00;-0.00'],
+    ['_(* #,##0.00_);_(* \\(#,##0.00\\);_(* "-"??_);_(@_)', '0.00;(0.00);"-"'],
+    ['_("$"* #,##0_);_("$"* \\(#,##0\\);_("$"* "-"_);_(@_)', '0;(0);"-"'],
+    ['_-* #,##0.00\\ "zł"_-;\\-* #,##0.00\\ "zł"_-;_-* "-"??\\ "zł"_-;_-@_-', '0.00;-0.00;"-"'],
+    ['0.0" kg";-0.0" kg"', '0.0;-0.0'], ['0.0" kg";0.0" kg"', '0.0'], ['0.00 %;-0.00 %', '0.00%;-0.00%'],
+    ['"$"0.0_);("$"0.0)', '0.0;(0.0)'], ['0.0" m"_);(0.0" m")', '0.0;(0.0)'], ['0.0;000-000', '0.0;-0'],
+    // Conditions
+    ['[>=100]0.0;[<-5]0;General'], ['[>=100]0.0;[<-5]-0.00;0.000'], ['[>=100]0.0;[<-5](0.00);0.000'], ['[<100]0.0;0.00'],
+    ['[>100]0.0;0.00'], ['[>=0]0.0;(0.00)'], ['[>=0]0.0;-0.00'], ['[<0]-0.0;0.00'], ['[<0](0.0);0.00'],
+    ['[<0]-0.0;[=0]"zero";0.00'], ['[=0]"zero";0.0'], ['[>0]"+"0.0;[<0]-0.0;0', '[>0]0.0;[<0]-0.0;0'],
+    ['[>0]0.0;[<0]"minus "0.0;"zero"'], ['[<>5]0.0;"five"'], ['[=5]"five";[=100]"hundred";General'],
+    ['[<100]"low";[>1000]"high"'], ['[>=100]0.0;[<=-5]-0.00'], ['[<5]0.0;[>=5]0.00'], ['[<=-5]0.0;0.00'],
+    ['[>-5]0.0;-0.00'], ['[<-100]0.0;[<0]-0.00;0'], ['[>=1000]0.0;[>=0]0.00;0.000'], ['[<-5]-0.0;[<0](0.00);0'],
+    ['[<1]0.0%;0.00'], ['[>=1000]0.00E+00;0.0'], ['[>100]0.0'], ['0.00;[<0]-0.0'], ['0.00;[<-100]-0.0'],
+    ['0.0;[=0]"zero";-0.00'], ['[>=100]0.0;-0.0;0.000'], ['[>=100]"over "0;0.0', '[>=100]0;0.0'],
+    ['[<5]0.0;"at least "0'], ['[Red][<0]-0.0;[Blue]0.00'],
+    // Sections that the numeric formats show with all digits
+    ['0.0;-0.0,"k"'], ['0;-# ?/?'],
+];
+
+// For these codes the one that shows the value, where programs disagree, hide it or lose its sign.
+const dropped = 'the minus is left out only for a text in a section for negative numbers alone';
+const chosen = [
+    {
+        codes: ['General;(General)', '0.0E+00;-0.0E+00', '0.00E+00;(0.00E+00)', '0.00;-0.0E+00', 'General;-General;"nil"'],
+        why: 'SheetJS has no sections for General and shows exponents with a minus of their own',
+    },
+    {codes: ['0.0;0.0', '0.0;[Red]0.0', '"above";0.0'], code: (x, code) => (x < 0 ? '0.0' : code), why: dropped},
+    {
+        codes: ['0.0;', '0.0;;', ';-0.0', ';;0.0', '0;-0;;@', '0.0;-0.0;#'],
+        code: (x, code) => (ssf(code, x) === '' ? 'General' : code),
+        why: 'a section without a text hides the number; the format shows it',
+    },
+    {
+        codes: ['0.0;-0.0,"k"', '0;-# ?/?'], code: (x, code) => (x < 0 ? 'General' : code),
+        why: 'the numeric formats have no fractions and no division by thousands',
+    },
+    {codes: ['[<0](0.0);0.00'], code: (x) => (x < 0 ? '0.0' : '0.00'), why: 'the first section shows the number alone'},
+    {
+        codes: ['[>=100]0.0;[<-5]0;General'],
+        code: (x) => (x >= 100 ? '0.0' : x < -5 ? '0' : 'General'), why: dropped,
+    },
+    {
+        codes: ['[>=100]0.0;[<-5]-0.00;0.000'],
+        code: (x) => (x >= 100 ? '0.0' : x < -5 ? '0.00' : '0.000'), why: dropped,
+    },
+    {
+        codes: ['[>=100]0.0;[<-5](0.00);0.000'],
+        code: (x) => (x >= 100 ? '0.0' : x < -5 ? '0;(0.00)' : '0.000'), why: dropped,
+    },
+    {codes: ['[<100]0.0;0.00'], code: (x) => (x < 100 ? '0.0' : '0.00'), why: dropped},
+    {codes: ['[>100]0.0;0.00'], code: (x) => (x > 100 ? '0.0' : '0.00'), why: dropped},
+    {codes: ['[=0]"zero";0.0'], code: (x) => (x === 0 ? '"zero"' : '0.0'), why: dropped},
+    {codes: ['[<>5]0.0;"five"'], code: (x) => (x === 5 ? '"five"' : '0.0'), why: dropped},
+    {codes: ['[<5]0.0;[>=5]0.00'], code: (x) => (x < 5 ? '0.0' : '0.00'), why: dropped},
+    {codes: ['[<=-5]0.0;0.00'], code: (x) => (x <= -5 ? '0.0' : '0.00'), why: dropped},
+    {codes: ['[>-5]0.0;-0.00'], code: (x) => (x > -5 ? '0.0' : '0.00'), why: dropped},
+    {codes: ['[<-100]0.0;[<0]-0.00;0'], code: (x) => (x < -100 ? '0.0' : x < 0 ? '0.00' : '0'), why: dropped},
+    {
+        codes: ['[>=1000]0.0;[>=0]0.00;0.000'],
+        code: (x) => (x >= 1000 ? '0.0' : x >= 0 ? '0.00' : '0.000'), why: dropped,
+    },
+    {codes: ['[<-5]-0.0;[<0](0.00);0'], code: (x) => (x < -5 ? '0.0' : x < 0 ? '0;(0.00)' : '0'), why: dropped},
+    {codes: ['[<1]0.0%;0.00'], code: (x) => (x < 1 ? '0.0%' : '0.00'), why: dropped},
+    {codes: ['[>=1000]0.00E+00;0.0'], code: (x) => (x >= 1000 ? '0.00E+00' : '0.0'), why: dropped},
+    {codes: ['[>=100]0;0.0'], code: (x) => (x >= 100 ? '0' : '0.0'), why: dropped},
+    {codes: ['[<5]0.0;"at least "0'], code: (x) => (x < 5 ? '0.0' : '"at least "0'), why: dropped},
+    {
+        codes: ['[=5]"five";[=100]"hundred";General'],
+        code: (x) => (x === 5 ? '"five"' : x === 100 ? '"hundred"' : 'General'), why: dropped,
+    },
+    {
+        codes: ['[<100]"low";[>1000]"high"'], code: (x) => (x < 100 ? '"low"' : x > 1000 ? '"high"' : 'General'),
+        why: 'a number that no section is for is shown with all digits',
+    },
+    {
+        codes: ['[>=100]0.0;[<=-5]-0.00'], code: (x) => (x >= 100 ? '0.0' : x <= -5 ? '0.00' : 'General'),
+        why: 'a number that no section is for is shown with all digits',
+    },
+    {
+        codes: ['[>100]0.0'], code: (x) => (x > 100 ? '0.0' : 'General'),
+        why: 'a number that no section is for is shown with all digits',
+    },
+    {
+        codes: ['0.00;[<-100]-0.0'], code: (x) => (x >= 0 ? '0.00' : x < -100 ? '0.0' : 'General'),
+        why: 'a number that no section is for is shown with all digits',
+    },
+    {
+        codes: ['0.00;[<0]-0.0'], code: (x) => (x < 0 ? '0.0' : '0.00'),
+        why: 'a first section without a condition is for positive numbers, whatever the second is for',
+    },
+    {
+        codes: ['0.0;[=0]"zero";-0.00'], code: (x) => (x > 0 ? '0.0' : x === 0 ? '"zero"' : '0.00'),
+        why: 'a first section without a condition is for positive numbers, whatever the second is for',
+    },
+    {
+        codes: ['[>=100]0.0;-0.0;0.000'], code: (x) => (x >= 100 || x < 0 ? '0.0' : '0.000'),
+        why: 'a second of three sections is for negative numbers, whatever the first is for',
+    },
+];
+
+// What LibreOffice shows of the values, by way of a workbook and a text file: one row a code, one column a value.
 // The package is put together here because SheetJS writes only some 200 codes.
-function showByOffice(codes) {
+function showByOffice(codes, values) {
     const main = 'xmlns="http://schemas.openxmlformats.org/spreadsheetml/2006/main"';
     const relations = 'http://schemas.openxmlformats.org/officeDocument/2006/relationships';
     const packages = 'http://schemas.openxmlformats.org/package/2006';
@@ -185,7 +308,7 @@ function showByOffice(codes) {
             '<cellStyleXfs><xf/></cellStyleXfs><cellXfs>' +
             list(codes, (_, i) => `<xf numFmtId="${200 + i}" applyNumberFormat="1"/>`) + '</cellXfs></styleSheet>',
         'xl/sheet.xml': `<worksheet ${main}><sheetData>` +
-            list(codes, (_, i) => `<row>${list(columns, (value) => `<c s="${i}"><v>${value}</v></c>`)}</row>`) +
+            list(codes, (_, i) => `<row>${list(values, (value) => `<c s="${i}"><v>${value}</v></c>`)}</row>`) +
             '</sheetData></worksheet>',
     };
     const zip = X.CFB.utils.cfb_new();
@@ -234,19 +357,41 @@ function row(code, shown) {
     return {code, kind, shows, ...(decision.why && {why: decision.why})};
 }
 
+// Without the spaces around it, and the zeros at the end of a mantissa.
+const trimmed = (text) => text.trim().replace(/(\.\d*?)0+(?=E)/, '$1').replace('.E', 'E');
+
+// `plain` is the code that other programs are asked for.
+function sectionedRow(code, plain, shown) {
+    const decision = chosen.find(({codes}) => codes.includes(plain));
+    const shows = numbers.map((value, i) => {
+        const texts = [ssf(plain, value), shown[i]].map((text) => trimmed(text || ''));
+        if (!decision && texts[0] !== texts[1]) throw new Error(`${code}: "${texts[0]}" or "${texts[1]}"?`);
+        if (decision && decision.code) return trimmed(ssf(decision.code(value, plain), value));
+        return texts[1];
+    });
+    return {code, shows, ...(decision && {why: decision.why})};
+}
+
 const found = fs.readFileSync(path.join(__dirname, 'number_format_codes.txt'), 'utf8').trimEnd().split('\n');
 const codes = [...new Set([...found, ...made])];
-const shown = showByOffice(codes);
-const rows = codes.map((code, i) => {
+const orComplaint = (makeRow) => {
     try {
-        return row(code, shown[i]);
+        return makeRow();
     } catch (error) {
         console.error(error.message);
         process.exitCode = 1;
         return {};
     }
-});
+};
+const shown = showByOffice(codes, columns);
+const rows = codes.map((code, i) => orComplaint(() => row(code, shown[i])));
+const plainCodes = sectioned.map(([code, plain]) => plain || code);
+const numbersShown = showByOffice(plainCodes, numbers);
+const sectionedRows = sectioned.map(([code], i) =>
+    orComplaint(() => sectionedRow(code, plainCodes[i], numbersShown[i])));
+const lines = (entries) => entries.map((entry) => JSON.stringify(entry)).join(',\n');
 const cutting = 'times are cut off after their last unit, not rounded';
 console.log(`{"halfSecond": "${cutting}",`);
 console.log(`"values": ${JSON.stringify(values)}, "number": ${number}, "codes": [`);
-console.log(`${rows.map((entry) => JSON.stringify(entry)).join(',\n')}\n]}`);
+console.log(`${lines(rows)}\n],`);
+console.log(`"numbers": ${JSON.stringify(numbers)}, "sectioned": [\n${lines(sectionedRows)}\n]}`);
