@@ -193,6 +193,7 @@ TEST(StandardValues, IsoDateTimes) {
     const auto both = dp::EXCEL_FORMAT_DATETIME;
     const Case cases[] = {{"2024-01-05", 45296, date},
                           {"1970-01-01Z", 25569, date},
+                          {"1970-01-01+01:00", 25569, date},
                           {"1900-03-01", 61, date},
                           {"1900-02-28", 59, date},
                           {"1900-01-01", 1, date},
@@ -213,6 +214,8 @@ TEST(StandardValues, IsoDateTimes) {
                           {"2024-13-01", -1, date},
                           {"2024-1-05", -1, date},
                           {"2024-01-05T", -1, date},
+                          {"2024-01-05ZT06:30", -1, date},
+                          {"2024-01-05+01:00T06:30", -1, date},
                           {"2024-01-05T25:00", -1, date},
                           {"2024-01-05T06:60", -1, date},
                           {"2024-01-05T06:00x", -1, date},

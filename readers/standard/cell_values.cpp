@@ -191,7 +191,8 @@ std::optional<IsoDateTime> parseIsoDateTime(std::string_view text) {
         const std::optional<double> date = takeDate(scanner);
         if (!date) return std::nullopt;
         result = {*date, EXCEL_FORMAT_DATE};
-        if (takeZone(scanner) && scanner.atEnd()) return result;
+        Scanner zone = scanner;
+        if (takeZone(zone) && zone.atEnd()) return result;
         if (!scanner.takeOneOf("Tt ")) return std::nullopt;
         result.type = EXCEL_FORMAT_DATETIME;
     } else {
