@@ -2,6 +2,7 @@
 
 #include "dpxlsx/readers/standard/cell_values.h"
 #include "dpxlsx/readers/standard/element_walker.h"
+#include "dpxlsx/readers/standard/string_items.h"
 
 namespace dp::standard {
 
@@ -11,6 +12,7 @@ Sheet readSheet(ElementWalker& walker) {
     Sheet sheet{walker.attribute("name").value_or(""),
                 walker.attribute("id", Vocabulary::Relationships).value_or("")};
     if (sheet.name.empty() || sheet.relationshipId.empty()) throw CmXmlException(kXmlError);
+    decodeEscapes(sheet.name);
     return sheet;
 }
 
