@@ -14,8 +14,8 @@ namespace dp {
 
 namespace {
 
-using standard::PackageParts;
 using standard::Relationship;
+using standard::WorkbookPackage;
 
 struct NamedPart {
     std::string name;
@@ -40,37 +40,36 @@ std::vector<NamedPart> worksheetsOf(const std::vector<standard::Sheet>& sheets,
 
 StandardReader::StandardReader(const std::string& dir, std::string shortDate, double missing,
                                IExcelDataProvider* receiver, IDateTimeVariableFormat* helper)
-    : StandardReader(PackageParts(dir), std::move(shortDate), missing, receiver, helper) {}
+    : StandardReader(WorkbookPackage(dir), std::move(shortDate), missing, receiver, helper) {}
 
-StandardReader::StandardReader(PackageParts parts, std::string shortDate, double missing,
+StandardReader::StandardReader(WorkbookPackage package, std::string shortDate, double missing,
                                IExcelDataProvider* receiver, IDateTimeVariableFormat* helper)
-    : ExcelXLSXReader(parts.pathOf(parts.workbookPart()), std::move(shortDate), missing, receiver,
-                      helper),
-      parts_(std::move(parts)) {}
+    : ExcelXLSXReader(package.parts.pathOf(package.workbookPart), std::move(shortDate), missing,
+                      receiver, helper),
+      package_(std::move(package)) {}
 
 StandardReader::~StandardReader() = default;
 
 void StandardReader::mReadExcelWorkbook() {
     const SilentLibxml2 silent;
-    const std::string workbookPart = parts_.workbookPart();
-    const standard::WorkbookPart workbook = standard::readWorkbookPart(parts_.pathOf(workbookPart));
-    const std::vector<Relationship> relationships = parts_.relationshipsOf(workbookPart);
+    const auto& [parts, workbookPart] = package_;
+    const standard::WorkbookPart workbook = standard::readWorkbookPart(parts.pathOf(workbookPart));
+    const std::vector<Relationship> relationships = parts.relationshipsOf(workbookPart);
     references_.date1904 = workbook.date1904;
-    readReferences(workbookPart, relationships);
+    readReferences(relationships);
     std::vector<unsigned> emptySheets;
     for (const auto& [name, part] : worksheetsOf(workbook.sheets, relationships)) {
         beginWorksheet(name);
-        readWorksheet(parts_.pathOf(part));
+        readWorksheet(parts.pathOf(part));
         if (worksheetEmpty) emptySheets.push_back(static_cast<unsigned>(worksheetIndex - 1));
     }
     removeEmptyWorksheets(emptySheets);
 }
 
 // A workbook may have no styles and no shared strings.
-void StandardReader::readReferences(const std::string& workbookPart,
-                                    const std::vector<Relationship>& relationships) {
+void StandardReader::readReferences(const std::vector<Relationship>& relationships) {
     const auto pathByType = [&](std::string_view type) {
-        return parts_.pathByType(relationships, type, workbookPart);
+        return package_.parts.pathByType(relationships, type, package_.workbookPart);
     };
     if (const std::string styleSheet = pathByType("styles"); !styleSheet.empty())
         references_.formats.read(styleSheet);
@@ -109,13 +108,15 @@ EXCEL_FORMAT_TYPE StandardReader::GetExcelFormatType(int styleIndex) const {
 
 namespace standard {
 
+WorkbookPackage::WorkbookPackage(const std::string& dir)
+    : parts(dir), workbookPart(parts.workbookPart()) {}
+
 bool isWorkbook(const std::string& dir) {
     const SilentLibxml2 silent;
-    const PackageParts parts(dir);
     try {
-        const std::string part = parts.workbookPart();
-        readWorkbookPart(parts.pathOf(part));
-        return mayBeWorkbook(parts, part);
+        const WorkbookPackage package(dir);
+        readWorkbookPart(package.parts.pathOf(package.workbookPart));
+        return mayBeWorkbook(package.parts, package.workbookPart);
     } catch (const CmXmlException&) {
         return false;
     }
@@ -123,8 +124,7 @@ bool isWorkbook(const std::string& dir) {
 
 void listWorksheets(const std::string& dir, std::vector<std::string>& names) {
     const SilentLibxml2 silent;
-    const PackageParts parts(dir);
-    const std::string workbookPart = parts.workbookPart();
+    const auto& [parts, workbookPart] = WorkbookPackage(dir);
     const WorkbookPart workbook = readWorkbookPart(parts.pathOf(workbookPart));
     const std::vector<Relationship> relationships = parts.relationshipsOf(workbookPart);
     names.clear();

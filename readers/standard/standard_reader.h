@@ -12,6 +12,19 @@
 
 namespace dp {
 
+namespace standard {
+
+// An unpacked package and the name of its workbook part, empty when it has none.
+struct WorkbookPackage {
+    // Throws the file system's error and CmXmlException.
+    explicit WorkbookPackage(const std::string& dir);
+
+    PackageParts parts;
+    std::string workbookPart;
+};
+
+}  // namespace standard
+
 // Reads an unpacked .xlsx package by the standard, as spreadsheet programs practise it.
 class StandardReader : public ExcelXLSXReader {
   public:
@@ -26,15 +39,15 @@ class StandardReader : public ExcelXLSXReader {
     EXCEL_FORMAT_TYPE GetExcelFormatType(int styleIndex) const override;
 
   private:
-    StandardReader(standard::PackageParts parts, std::string shortDateFormat, double missingValue,
-                   IExcelDataProvider* provider, IDateTimeVariableFormat* dateTimeHelper);
+    StandardReader(standard::WorkbookPackage package, std::string shortDateFormat,
+                   double missingValue, IExcelDataProvider* provider,
+                   IDateTimeVariableFormat* dateTimeHelper);
 
-    void readReferences(const std::string& workbookPart,
-                        const std::vector<standard::Relationship>& relationships);
+    void readReferences(const std::vector<standard::Relationship>& relationships);
     void readWorksheet(const std::string& path);
     void take(standard::CellPosition position, ExternalDataRecordCell&& content);
 
-    standard::PackageParts parts_;
+    standard::WorkbookPackage package_;
     standard::CellReferences references_;
     TextBudget textBudget_;
     RepeatedParts repeatedParts_;
