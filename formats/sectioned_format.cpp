@@ -90,6 +90,9 @@ class SectionedDisplay {
         const FormatSection& section = code.sections[position];
         SectionTexts texts = textsOf(code, position);
         if (isTextAlone(section) && !texts.empty()) return {nullptr, Sign::None, std::move(texts)};
+        // Date letters among numbers are those of a word that lacks its quotes: "0;-0;zero".
+        if (isDateTime(section) && !isDateTime(code.sections.front()))
+            return {createAutomaticFormat()};
         Display display{createFormat(section)};
         if (position == 0 || texts.empty()) return display;
         const bool replacesMinus = choice_.isForNegativesOnly(position);

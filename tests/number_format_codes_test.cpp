@@ -121,7 +121,8 @@ TEST(NumberFormatCodes, SectionsOfDates) {
         const char* code;
         double value;
         const char* expected;
-    } cases[] = {{"[<100]0;yyyy-mm-dd", 45351, "2024-02-29"},
+    } cases[] = {{"0.0;-0.0;zero", 0, "0"},
+                 {"[<100]h;yyyy-mm-dd", 45351, "2024-02-29"},
                  {"h:mm;-h:mm", -0.25, "-6:00"},
                  {"[h]:mm;([h]:mm)", -1.5, "(36:00)"},
                  {"[h]:mm;[Red][h]:mm", -1.5, "-36:00"},
