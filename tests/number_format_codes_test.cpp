@@ -115,19 +115,24 @@ TEST(NumberFormatCodes, SectionedFormatsForHosts) {
     EXPECT_EQ(shown(*dates, -2), "before 2");
 }
 
-// Sections of dates and numbers in one code.
-TEST(NumberFormatCodes, SectionsOfDates) {
+TEST(NumberFormatCodes, SectionsAndTheirTexts) {
     const struct {
         const char* code;
         double value;
         const char* expected;
     } cases[] = {{"0.0;-0.0;zero", 0, "0"},
                  {"[<100]h;yyyy-mm-dd", 45351, "2024-02-29"},
+                 {"[<1]h:mm;0.0", 2.5, "2.5"},
                  {"h:mm;-h:mm", -0.25, "-6:00"},
                  {"[h]:mm;([h]:mm)", -1.5, "(36:00)"},
                  {"[h]:mm;[Red][h]:mm", -1.5, "-36:00"},
-                 {"[<1]h:mm;0.0", 2.5, "2.5"},
-                 {"[>1]yyyy;[h]\"x\"", -1.5, "-36x"}};
+                 {"[>1]yyyy;[h]\"x\"", -1.5, "-36x"},
+                 // With the minus, for the section shows zero or some positive numbers too
+                 {"[>0]0;\"~\"0", -5, "-~5"},
+                 {"[>=1]0;[=0]0;\"~\"0", -5, "-~5"},
+                 {"\"x\";\"x\"0", -5, "x5"},
+                 {"0;(000) 000-000", -5, "-5"},
+                 {"0;(# ##0)", -5, "(5)"}};
     for (const auto& c : cases) EXPECT_EQ(shown(c.code, c.value), c.expected) << c.code;
 }
 
