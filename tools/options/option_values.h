@@ -15,7 +15,7 @@ struct Given {
 };
 
 constexpr const char* kOneView =
-    "choose one of --list, --csv, --json and --explain, or --explain with --json";
+    "choose one of --list, --csv, --json, --page and --explain, or --explain with --json";
 
 // Throws a Failure for wrong usage.
 [[noreturn]] void wrongUsage(const std::string& text);
