@@ -391,7 +391,9 @@ function printTables(sheet) {
         `${counted(columns.length, "column")} of ${whole.format(sheet.columns.length)}`)];
     for (let at = 0; at < columns.length; at += width) {
         const block = columns.slice(at, at + width);
-        blocks.push(rowsTable(sheet, block, Math.min(rows, mostValues(block))));
+        const table = rowsTable(sheet, block, Math.min(rows, mostValues(block)));
+        table.style.setProperty("--columns", block.length);
+        blocks.push(table);
     }
     return blocks;
 }
