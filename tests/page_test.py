@@ -199,6 +199,10 @@ class PageTest(unittest.TestCase):
             self.assertIn(f'<a href="#c{key}"><bdi>Measurements!{letter}</bdi>', page)
         self.assertEqual([t["trait"] for t in data["explanation"]["traits"]],
                          re.findall('<li class="finding" data-trait="(.*?)"', page))
+        self.written(workbook(self.folder / "lost.xlsx", [["a", "b"], [1, 1], ["x", "y"], [2, "z"]]))
+        found = re.findall('<div class="finding"[^>]*><p>(?:<b></b>)?(.*?)</p>.*?data-copy="(.*?)"', self.opened()[0])
+        self.assertEqual(found, [(f"{count} of 3 cells do not fit the kind of the column; a missing value arrives.",
+                                  f"--type 'Data!{column}=text'") for count, column in ((1, "A"), (2, "B"))])
 
     def test_summaries_of_many_values(self):
         chance = random.Random(7)

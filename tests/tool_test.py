@@ -772,6 +772,12 @@ class ToolTest(unittest.TestCase):
                 advice = re.findall("--type .*", line)[0]
                 self.assertEqual(advice, f"--type '1!A={type_}' --type '1!B={type_}'")
                 self.assertIn("nothing to", self.run_tool(book, "--explain", *shlex.split(advice)))
+                traits = json.loads(self.run_tool(book, "--explain", "--json"))["traits"]
+                self.assertEqual([(t["cures"][-1], [p["cells"] for p in t["places"]]) for t in traits], [(advice, [2, 1])])
+        unread = self.book({**prefixed(LINKS), STYLES: with_format("[Red]0")[STYLES]})  # its columns are not known
+        dates = json.loads(self.run_tool(unread, "--explain", "--json"))["traits"][-1]
+        self.assertIn("--type COLUMN=numeric", dates["advice"])
+        self.assertEqual((dates["cures"], dates["places"]), (["--standard"], []))
 
     def test_traits_come_in_order_and_each_says_where(self):
         book = self.book(renamed(WORKBOOK, "x.xml") | {WORKBOOK: PARTS[WORKBOOK].replace(
