@@ -168,16 +168,20 @@ std::string embeddable(std::string_view json) {
         {"<", "\\u003c"},    {">", "\\u003e"},      {"&", "\\u0026"},
         {"\x7F", "\\u007f"}, {"\u2028", "\\u2028"}, {"\u2029", "\\u2029"},
     };
+    constexpr const char* kFirstBytes = "<>&\x7F\xE2";
     std::string text;
     text.reserve(json.size());
-    while (!json.empty()) {
+    for (size_t plain = 0; (plain = json.find_first_of(kFirstBytes)) != std::string_view::npos;) {
+        text += json.substr(0, plain);
+        json.remove_prefix(plain);
         const auto escape =
             std::find_if(std::begin(kEscapes), std::end(kEscapes),
                          [&](const auto& entry) { return json.starts_with(entry.first); });
-        const bool plain = escape == std::end(kEscapes);
-        text += plain ? json.substr(0, 1) : std::string_view(escape->second);
-        json.remove_prefix(plain ? 1 : escape->first.size());
+        const bool found = escape != std::end(kEscapes);
+        text += found ? std::string_view(escape->second) : json.substr(0, 1);
+        json.remove_prefix(found ? escape->first.size() : 1);
     }
+    text += json;
     return text;
 }
 
