@@ -5,41 +5,41 @@ namespace dp {
 
 namespace {
 
-constexpr long kUnsupported = -50;
+constexpr long kNoOperation = -50;
 
 }  // namespace
 
-long ExcelDataProviderBase::AddWorksheet(IWorksheet*) { return kUnsupported; }
-long ExcelDataProviderBase::AddDesign(IDesign*) { return kUnsupported; }
-long ExcelDataProviderBase::AddTaguchiDesign(ITaguchiDesign*) { return kUnsupported; }
-long ExcelDataProviderBase::AddTaguchiAnalysis(ITaguchiAnalysis*) { return kUnsupported; }
-long ExcelDataProviderBase::AddTaguchiPrediction(ITaguchiPrediction*) { return kUnsupported; }
-long ExcelDataProviderBase::AddAnalysis(IAnalysis*) { return kUnsupported; }
-long ExcelDataProviderBase::AddResponseModels(IResponseModels*) { return kUnsupported; }
+long ExcelDataProviderBase::AddWorksheet(IWorksheet*) { return kNoOperation; }
+long ExcelDataProviderBase::AddDesign(IDesign*) { return kNoOperation; }
+long ExcelDataProviderBase::AddTaguchiDesign(ITaguchiDesign*) { return kNoOperation; }
+long ExcelDataProviderBase::AddTaguchiAnalysis(ITaguchiAnalysis*) { return kNoOperation; }
+long ExcelDataProviderBase::AddTaguchiPrediction(ITaguchiPrediction*) { return kNoOperation; }
+long ExcelDataProviderBase::AddAnalysis(IAnalysis*) { return kNoOperation; }
+long ExcelDataProviderBase::AddResponseModels(IResponseModels*) { return kNoOperation; }
 
 long ExcelDataProviderBase::AddVariabilityDataCollection(IVariabilityDataCollection*) {
-    return kUnsupported;
+    return kNoOperation;
 }
 
 long ExcelDataProviderBase::AddMultipleResponseOptimization(IMultipleResponseOptimization*) {
-    return kUnsupported;
+    return kNoOperation;
 }
 
 long ExcelDataProviderBase::AddMixtureResponseModelCollection(IMixtureResponseModelCollection*) {
-    return kUnsupported;
+    return kNoOperation;
 }
 
-long ExcelDataProviderBase::AddColumn(INumericColumn*) { return kUnsupported; }
-long ExcelDataProviderBase::AddColumn(ITextColumn*) { return kUnsupported; }
-long ExcelDataProviderBase::AddConstant(INumericConstant*) { return kUnsupported; }
-long ExcelDataProviderBase::AddConstant(ITextConstant*) { return kUnsupported; }
-long ExcelDataProviderBase::AddMatrix(IMatrix*) { return kUnsupported; }
-long ExcelDataProviderBase::AddModel(IModel*) { return kUnsupported; }
-long ExcelDataProviderBase::AddFactorialPlot(IFactorialPlot*) { return kUnsupported; }
-long ExcelDataProviderBase::AddMixturePlot(IMixturePlot*) { return kUnsupported; }
-long ExcelDataProviderBase::AddCustomDesign(ICustomDesign*) { return kUnsupported; }
-long ExcelDataProviderBase::AddFormulaNode(IFormulaNode*) { return kUnsupported; }
-long ExcelDataProviderBase::AddDDELink(IDDELink*) { return kUnsupported; }
+long ExcelDataProviderBase::AddColumn(INumericColumn*) { return kNoOperation; }
+long ExcelDataProviderBase::AddColumn(ITextColumn*) { return kNoOperation; }
+long ExcelDataProviderBase::AddConstant(INumericConstant*) { return kNoOperation; }
+long ExcelDataProviderBase::AddConstant(ITextConstant*) { return kNoOperation; }
+long ExcelDataProviderBase::AddMatrix(IMatrix*) { return kNoOperation; }
+long ExcelDataProviderBase::AddModel(IModel*) { return kNoOperation; }
+long ExcelDataProviderBase::AddFactorialPlot(IFactorialPlot*) { return kNoOperation; }
+long ExcelDataProviderBase::AddMixturePlot(IMixturePlot*) { return kNoOperation; }
+long ExcelDataProviderBase::AddCustomDesign(ICustomDesign*) { return kNoOperation; }
+long ExcelDataProviderBase::AddFormulaNode(IFormulaNode*) { return kNoOperation; }
+long ExcelDataProviderBase::AddDDELink(IDDELink*) { return kNoOperation; }
 
 IDOEReader* ExcelDataProviderBase::GetDOEReader() { return nullptr; }
 long ExcelDataProviderBase::RereadFile() { return -1; }

@@ -150,7 +150,7 @@ TEST(HostContract, ReferenceHoldsOneCount) {
 
 // A format that records how it was called.
 template <class Format>
-struct Told : Format {
+struct Recording : Format {
     dp::IString* FormatValue(double, bool full) const override { return new dp::String(full ? "full 1.5" : "1.5"); }
 };
 
@@ -161,10 +161,10 @@ TEST(HostContract, ValuesShowInFullWithTheSymbolOfTheHost) {
         const std::unique_ptr<dp::IString> text(column.GetFormattedValue(1.5, decimal));
         return text ? text->database_str() : "null";
     };
-    using Number = Told<dp::NumericVariableFormat>;
+    using Number = Recording<dp::NumericVariableFormat>;
     EXPECT_EQ(shown(nullptr, ','), "null");
     EXPECT_EQ(shown(std::make_unique<Number>(), '.') + shown(std::make_unique<Number>(), ','), "full 1.5full 1,5");
-    EXPECT_EQ(shown(std::make_unique<Told<dp::DateTimeVariableFormat>>(), ','), "1.5");
+    EXPECT_EQ(shown(std::make_unique<Recording<dp::DateTimeVariableFormat>>(), ','), "1.5");
 }
 
 TEST(HostContract, NumericColumn) {

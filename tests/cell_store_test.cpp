@@ -24,8 +24,8 @@ namespace {
 
 using Model = std::map<unsigned, std::map<unsigned, ExternalDataRecordCell>>;
 
-ExternalDataRecordCell cellOf(std::uint32_t type, std::int32_t integer, std::int32_t boolean, double number,
-                              std::string text, std::int32_t format) {
+ExternalDataRecordCell cellWith(std::uint32_t type, std::int32_t integer, std::int32_t boolean, double number,
+                                std::string text, std::int32_t format) {
     ExternalDataRecordCell cell;
     cell.type = static_cast<ExternalCellType>(type);
     std::tie(cell.intValue, cell.boolValue, cell.numValue) = std::tuple(integer, boolean, number);
@@ -39,7 +39,7 @@ auto fieldsOf(const ExternalDataRecordCell& cell) {
                       std::bit_cast<std::uint64_t>(cell.numValue), cell.textValue, cell.formatIndex);
 }
 
-ExternalDataRecordCell textCell(const std::string& text) { return cellOf(CELL_TEXT, 0, 0, 0.0, text, -1); }
+ExternalDataRecordCell textCell(const std::string& text) { return cellWith(CELL_TEXT, 0, 0, 0.0, text, -1); }
 
 ExternalDataRecord recordOf(unsigned row, unsigned column, const ExternalDataRecordCell& cell) {
     ExternalDataRecord record(0, 0, row, column);
@@ -57,12 +57,12 @@ class RandomCells {
         const std::uint32_t type =
             usual ? oneOf({3U, 4U, 5U, 6U, 8U}) : oneOf({0U, 1U, 2U, 4U, 5U, 7U, 15U, 16U, 0xFFFFFFFFU});
         const auto holds = [&](std::uint32_t named) { return usual ? type == named : below(2) == 0; };
-        return cellOf(type, holds(CELL_INTEGER) ? oneOf({1, -1, INT32_MIN, INT32_MAX}) : 0,
-                      holds(CELL_BOOLEAN) ? oneOf({1, -1, 0, 256}) : 0,
-                      holds(CELL_NUMBER) || holds(CELL_DATETIME) ? number() : 0.0,
-                      holds(CELL_TEXT) ? std::string(below(300), static_cast<char>(below(3))) : "",
-                      usual ? static_cast<std::int32_t>(below(300)) - 1
-                            : oneOf({-1, 0, 268435454, 268435455, INT32_MAX, INT32_MIN, -2}));
+        return cellWith(type, holds(CELL_INTEGER) ? oneOf({1, -1, INT32_MIN, INT32_MAX}) : 0,
+                        holds(CELL_BOOLEAN) ? oneOf({1, -1, 0, 256}) : 0,
+                        holds(CELL_NUMBER) || holds(CELL_DATETIME) ? number() : 0.0,
+                        holds(CELL_TEXT) ? std::string(below(300), static_cast<char>(below(3))) : "",
+                        usual ? static_cast<std::int32_t>(below(300)) - 1
+                              : oneOf({-1, 0, 268435454, 268435455, INT32_MAX, INT32_MIN, -2}));
     }
 
   private:
@@ -178,7 +178,7 @@ TEST(CellStore, MovesKeepCellsAndClearForgetsThem) {
     EXPECT_EQ(cells.nth(0).first, 5U);
     column.clear();
     EXPECT_EQ(column.begin(), column.end());
-    column.assign(4, cellOf(CELL_TEXT, 1, 2, 3.0, "rare", -7));
+    column.assign(4, cellWith(CELL_TEXT, 1, 2, 3.0, "rare", -7));
     EXPECT_EQ(column.begin()->second.intValue(), 1);
 }
 
@@ -188,8 +188,8 @@ TEST(CellStore, KeepsEqualTextsOnce) {
     WorksheetCells second(pool);
     const std::string text(26, 'x');
     first.add(recordOf(0, 0, textCell(text)));
-    first.add(recordOf(9, 7, cellOf(CELL_TEXT, 0, 0, 1.0, text, 2)));
-    second.add(recordOf(3, 1, cellOf(CELL_TEXT, 0, 0, 0.0, text, 0x7FFFFFFF)));
+    first.add(recordOf(9, 7, cellWith(CELL_TEXT, 0, 0, 1.0, text, 2)));
+    second.add(recordOf(3, 1, cellWith(CELL_TEXT, 0, 0, 0.0, text, 0x7FFFFFFF)));
     const auto address = [](const WorksheetCells& cells, unsigned column) {
         return cells.find(column)->second.begin()->second.textValue().data();
     };
@@ -202,7 +202,7 @@ TEST(CellStore, KeepsEqualTextsOnce) {
 // New cells reuse the memory of cells that were destroyed while the pool still looked up their texts.
 TEST(CellStore, DeliversTextsBeforeTheirCellsGo) {
     const auto pool = std::make_shared<TextPool>();
-    const ExternalDataRecordCell number = cellOf(CELL_NUMBER, 0, 0, 5.0, "", -1);
+    const ExternalDataRecordCell number = cellWith(CELL_NUMBER, 0, 0, 5.0, "", -1);
     std::optional<CellColumn> gone(std::in_place, pool);
     gone->assign(0, textCell("gone"));
     gone.reset();
@@ -220,7 +220,7 @@ TEST(CellStore, CellsThatAreFiledAgainTakeNoMemory) {
     WorksheetCells cells;
     const std::size_t before = testkit::allocatedBytes();
     for (unsigned i = 0; i < 100000; ++i)
-        cells.add(recordOf(i / 2 % 3, i % 7 ? 0 : 1, cellOf(CELL_TEXT, 1, 2, 3.0, "rare", -7)));
+        cells.add(recordOf(i / 2 % 3, i % 7 ? 0 : 1, cellWith(CELL_TEXT, 1, 2, 3.0, "rare", -7)));
     EXPECT_LT(testkit::allocatedBytes() - before, 100000U);
 }
 
@@ -305,7 +305,7 @@ TEST(ExternalDataRecord, CopiesAllAndInitializesAll) {
                               std::tuple(record.reserved0, record.reserved1, record.row, record.column));
     };
     ExternalDataRecord record(1, 2, 3, 4);
-    record.cell = cellOf(CELL_TEXT, 5, 6, 7.0, "text", 8);
+    record.cell = cellWith(CELL_TEXT, 5, 6, 7.0, "text", 8);
     const ExternalDataRecord copy = record;
     record.initialize();
     EXPECT_EQ(allOf(record), std::tuple(0U, 0, 0, 0ULL, "", -1, 0U, 0U, 0U, 0U));

@@ -135,7 +135,7 @@ TEST(FormatCodes, RightSubString) {
 }
 
 // Kind, automatic flag and decimal places of a number format; the pattern of a date-time format.
-std::string describe(const IVariableFormat& format) {
+std::string inWords(const IVariableFormat& format) {
     if (const auto* dateTime = dynamic_cast<const DateTimeVariableFormat*>(&format))
         return dateTime->GetFormatString()->database_str();
     if (const auto* percentage = dynamic_cast<const PercentageVariableFormat*>(&format))
@@ -147,7 +147,7 @@ std::string describe(const IVariableFormat& format) {
 }
 
 std::string formatOf(std::vector<xStyle>& styles, int index, bool isDateTime) {
-    return describe(*std::unique_ptr<IVariableFormat>(createStyleFormat(styles, index, isDateTime)));
+    return inWords(*std::unique_ptr<IVariableFormat>(createStyleFormat(styles, index, isDateTime)));
 }
 
 TEST(StyleClassification, CodesFromTheFile) {

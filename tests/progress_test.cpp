@@ -104,7 +104,7 @@ TEST(ProgressTest, IsToldTenTimesASecond) {
     EXPECT_EQ(toldAt, (std::vector<int>{0, 105, 210, 315, 420}));
 }
 
-struct Case {
+struct BookCase {
     const char* name;
     PackageBuilder package;
     int rules;
@@ -126,7 +126,7 @@ class ProgressOfProvider : public TemporaryFiles {
     }
 
     // The whole work; every call is checked.
-    std::size_t expectRise(const Case& c, Call call, std::string& cells) {
+    std::size_t expectRise(const BookCase& c, Call call, std::string& cells) {
         RecordingProvider provider;
         Told told;
         dp::SetReadingRules(&provider, c.rules);
@@ -144,7 +144,7 @@ class ProgressOfProvider : public TemporaryFiles {
     }
 
     // The work is ended at one of the calls, and done again.
-    void expectEnd(const Case& c, Call call, std::size_t at, bool throws, const std::string& cells) {
+    void expectEnd(const BookCase& c, Call call, std::size_t at, bool throws, const std::string& cells) {
         RecordingProvider provider;
         Told told{{}, at, throws};
         dp::SetReadingRules(&provider, c.rules);
@@ -202,15 +202,15 @@ std::vector<std::size_t> endsAmong(std::size_t calls) {
 
 TEST_F(ProgressOfProvider, RisesAndEndsWhereTheHostSays) {
     const PackageBuilder& small = PackageBuilder::small();
-    const Case cases[] = {{"small", small, 0},
-                          {"small, libxml2", commented(small, false), 0},
-                          {"small, read twice", commented(small, true), 0},
-                          {"small, by the standard", small, 1},
-                          {"large", large(), 0},
-                          {"large, libxml2", commented(large(), false), 0},
-                          {"large, read twice", commented(large(), true), 0},
-                          {"large, by the standard", large(), 1}};
-    for (const Case& c : cases)
+    const BookCase cases[] = {{"small", small, 0},
+                              {"small, libxml2", commented(small, false), 0},
+                              {"small, read twice", commented(small, true), 0},
+                              {"small, by the standard", small, 1},
+                              {"large", large(), 0},
+                              {"large, libxml2", commented(large(), false), 0},
+                              {"large, read twice", commented(large(), true), 0},
+                              {"large, by the standard", large(), 1}};
+    for (const BookCase& c : cases)
         for (const Call call : {Call::Open, Call::List}) {
             SCOPED_TRACE(std::string(c.name) + (call == Call::Open ? ", opened" : ", listed"));
             c.package.write(file("book.xlsx"));
