@@ -242,8 +242,8 @@ class PageTest(unittest.TestCase):
         self.assertEqual((len(re.findall("(?i)<script", body)), len(re.findall("<img|\u202e", body))), (1, 0))
         self.assertIn("32,767 characters", body)
         self.assertIn(html.escape(HOSTILE[0], False), body)
-        self.written(book, "--clean-sheet-names")  # the book has another title than the worksheet
-        self.assertIn('<a href="#c1"><bdi>&lt;/title&gt;&lt;img&gt;!A', self.opened()[0])
+        self.written(book, "--clean-sheet-names")
+        self.assertIn('<a href="#c1"><bdi>__title__img_!A', self.opened()[0])
 
     def test_two_thousand_columns_and_a_hundred_thousand_rows_stay_small(self):
         rows = [[f"Column {c}" for c in range(2000)]] + [

@@ -763,16 +763,17 @@ class ToolTest(unittest.TestCase):
     def test_the_advice_about_every_column_helps(self):
         cells = ('<row r="2"><c r="A2" s="1"><v>45296</v></c><c r="B2" s="1"><v>45297</v></c></row>'
                  '<row r="3"><c r="A3" s="1"><v>45000</v></c></row>')
-        title = 'name="a=b"'
-        for code, type_ in (("DD/MM/YYYY", "datetime"), ("[Red]0", "numeric")):
-            with self.subTest(code):
+        for code, type_, title, more, place in (
+                ("DD/MM/YYYY", "datetime", 'name="a=b"', [], "1"), ("[Red]0", "numeric", 'name="a=b"', [], "1"),
+                ("[Red]0", "numeric", 'name=" a:b? "', ["--clean-sheet-names"], "a_b_")):
+            with self.subTest((code, title)):
                 book = self.book({**PARTS, SHEET: SHEET_OF.format(cells), STYLES: with_format(
                     code)[STYLES], WORKBOOK: PARTS[WORKBOOK].replace('name="My Data"', title)})
-                line = self.run_tool(book, "--explain")
+                line = self.run_tool(book, "--explain", *more)
                 advice = re.findall("--type .*", line)[0]
-                self.assertEqual(advice, f"--type '1!A={type_}' --type '1!B={type_}'")
-                self.assertIn("nothing to", self.run_tool(book, "--explain", *shlex.split(advice)))
-                traits = json.loads(self.run_tool(book, "--explain", "--json"))["traits"]
+                self.assertEqual(advice, f"--type '{place}!A={type_}' --type '{place}!B={type_}'")
+                self.assertIn("nothing to", self.run_tool(book, "--explain", *more, *shlex.split(advice)))
+                traits = json.loads(self.run_tool(book, "--explain", "--json", *more))["traits"]
                 self.assertEqual([(t["cures"][-1], [p["cells"] for p in t["places"]]) for t in traits], [(advice, [2, 1])])
         unread = self.book({**prefixed(LINKS), STYLES: with_format("[Red]0")[STYLES]})  # its columns are not known
         dates = json.loads(self.run_tool(unread, "--explain", "--json"))["traits"][-1]

@@ -53,6 +53,7 @@ Attempt tryImport(const Library& library, const Options& options) {
         Workbook workbook(library, options);
         workbook.open();
         attempt.imported.leftOut = workbook.leftOut();
+        attempt.imported.cleaned = options.settings.cleanSheetNames;
         for (const SheetEntry& sheet : workbook.worksheets()) {
             const LoadedWorksheet worksheet = workbook.load(sheet);
             workbook.noteShown(worksheet);
@@ -112,9 +113,7 @@ Json traitJson(const Trait& trait) {
 
 }  // namespace
 
-std::vector<Trait> findTraits(const Library& library, const Options& given) {
-    Options options = given;
-    options.settings.cleanSheetNames = false;  // the book itself has the original names
+std::vector<Trait> findTraits(const Library& library, const Options& options) {
     const Attempt attempt = tryImport(library, options);
     const std::optional<Failure>& failure = attempt.failure;
     if (failure && isOfTheSystem(*failure)) throw *failure;

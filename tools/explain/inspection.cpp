@@ -43,6 +43,17 @@ bool isTrue(const std::optional<std::string>& text) {
     return text && (*text == "1" || *text == "true" || *text == "on");
 }
 
+// The title that an import gives a worksheet with this name when it cleans names.
+std::string cleaned(std::string name) {
+    constexpr std::string_view kForbidden = "?*/:<>|\"\\";
+    constexpr const char* kSpaces = " \t\n\v\f\r";
+    for (char& c : name) {
+        if (kForbidden.find(c) != std::string_view::npos) c = '_';
+    }
+    name.erase(name.find_last_not_of(kSpaces) + 1);
+    return name.erase(0, name.find_first_not_of(kSpaces));
+}
+
 class Inspector {
   public:
     explicit Inspector(const std::string& book) : package_(book) {
@@ -56,6 +67,7 @@ class Inspector {
         const std::string styles = located(kStyles, "styles");
         if (!styles.empty()) formats_.read(package_, styles, findings_);
         readStrings();
+        if (imported.cleaned) cleanNames();
         for (const WorksheetPart& worksheet : worksheets_) {
             if (imported.leftOut.count(worksheet.name) != 0) continue;
             const auto sheet = imported.sheets.find(worksheet.name);
@@ -85,6 +97,10 @@ class Inspector {
     }
 
   private:
+    void cleanNames() {
+        for (WorksheetPart& worksheet : worksheets_) worksheet.name = cleaned(worksheet.name);
+    }
+
     // Finds the workbook part under any name, because it leads to all other parts.
     void findWorkbook() {
         readRelationships("_rels/.rels", "");

@@ -22,6 +22,7 @@ struct ImportedSheet {
 struct Imported {
     std::map<std::string, ImportedSheet> sheets;  // by title
     std::set<std::string> leftOut;                // worksheets, by an option
+    bool cleaned = false;  // whether the titles are without the characters that hosts cannot have
 };
 
 }  // namespace dp::tool

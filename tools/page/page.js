@@ -106,13 +106,8 @@ for (const sheet of sheets) {
         columnOf.set(column.summary.reference, column);
     });
 }
-// A place is a column, a cell, a range or a worksheet. It has the title that the workbook gives the
-// worksheet; here the title may be one with other characters.
-const cleaned = (title) => title.replace(/[?*/:<>|"\\]/g, "_");
-const columnAt = (place) => {
-    const column = place.replace(/(![A-Z]+)\d+(:[A-Z]+\d+)?$/, "$1");
-    return columnOf.get(column) || columnOf.get(cleaned(column));
-};
+// A place is a column, a cell, a range or a worksheet.
+const columnAt = (place) => columnOf.get(place.replace(/(![A-Z]+)\d+(:[A-Z]+\d+)?$/, "$1"));
 for (const trait of book.explanation.traits) {
     for (const place of trait.places) columnAt(place.place)?.findings.push({ trait, place });
 }
@@ -143,7 +138,7 @@ function headOf(found) {
 
 function placeLink(place) {
     const column = columnAt(place.place);
-    const sheet = sheetOf.get(place.place) || sheetOf.get(cleaned(place.place));
+    const sheet = sheetOf.get(place.place);
     const target = column ? `#c${column.key}` : sheet ? `#w${sheet.key}` : null;
     const words = plain(place.place, 60);
     return el("li", {}, target ? el("a", { href: target }, el("bdi", {}, words)) : el("bdi", {}, words));
