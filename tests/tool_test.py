@@ -475,15 +475,17 @@ class ToolTest(unittest.TestCase):
         self.assertEqual(sheet["columns"][0]["values"], ["sensor 0", "sensor 2", "sensor 4"])
 
     def test_wrong_usage(self):
+        link = self.folder / "link.json"
+        link.symlink_to(SAMPLE)
         cases = [["--list"], ["--no-such"], [SAMPLE, "--head", "x"], [SAMPLE, "--sheet", "Nowhere"],
                  [SAMPLE, "--names", "none", "--name-row", "3"], [SAMPLE, "--type", "A=colour"],
                  [SAMPLE, "--exclude", "XFE"], [SAMPLE, "--rename", "A"], [SAMPLE, "--range", "5"],
                  [SAMPLE, "--range", "2:1"], [SAMPLE, "--decimal", "1"], [SAMPLE, "--list", "--csv"],
                  [SAMPLE, "--csv", "--json"], [SAMPLE, "--list", "--sheet", "1"],
                  [SAMPLE, "--explain", "--csv"], [SAMPLE, "--explain", "--list"], [SAMPLE, "--rows", "0"], [SAMPLE, "--missing", "nan"],
-                 [SAMPLE, "--exclude", "Nowhere!A"], [SAMPLE, SAMPLE], [SAMPLE, "--as-shown"],
+                 [SAMPLE, "--exclude", "Nowhere!A"], [SAMPLE, "--as-shown"],
                  [SAMPLE, "--missing-word", "a=1", "--missing-number", "1=2"],
-                 [SAMPLE, "--json", SAMPLE], [SAMPLE, "--max-text", "0"], [SAMPLE, "--list=no"],
+                 [SAMPLE, "--json", link], [SAMPLE, SAMPLE, "--json", link], [SAMPLE, "--max-text", "0"], [SAMPLE, "--list=no"],
                  [SAMPLE, "--type", "Measurements!Q=text"], [SAMPLE, "--position", "2!K=1"]]
         for arguments in cases:
             with self.subTest(arguments):
@@ -492,8 +494,12 @@ class ToolTest(unittest.TestCase):
                     (["--sheet", "3"], 'no worksheet "3" with values; it has "Measurements" .1.'),
                     (["--head"], "--head: its value is missing; see"),
                     (["--csv", "a", "--csv", "b"], "--csv: give it once, with one value; see"),
-                    (["--bogus"], "--bogus: there is no such option"),
+                    (["--bogus"], "--bogus: there is no such option; see"),
+                    ([link.with_suffix(".xlsx"), "--csv", "x.csv"], "need a folder for their CSV files: --csv FOLDER/"),
+                    ([SAMPLE.with_suffix(".XLSX"), "--csv", "no/"],
+                     "sample.xlsx and .*sample.XLSX would both be written to no/sample/; nothing was written"),
                     (["--pad=no"], "--pad: it takes no value; see"),
+                    ([SAMPLE, "--page", "x.html"], "--page shows one workbook"),
                     (["--csv", "--explain"], "or --explain with --json"),
                     (["--exclude", "Measurements!Q"], 'the worksheet "Measurements" has no column Q')]
         for arguments, text in messages:
@@ -531,6 +537,7 @@ class ToolTest(unittest.TestCase):
             with self.subTest(name):
                 book = self.damaged(name)
                 self.assertIn(f"{book}: ", self.run_tool(book, expected=code))
+        self.assertIn("is a folder; name the workbooks in it", self.run_tool(self.folder, expected=17))
         other = shutil.copy(SAMPLE, self.folder / "book.xlsm")
         self.run_tool(other, expected=22)
         for view in ("--list", "--explain", "--json"):
@@ -560,6 +567,65 @@ class ToolTest(unittest.TestCase):
             self.assertEqual(target.read_text() == "before", code != 0)
             self.assertEqual(target.stat().st_mode & 0o777, 0o640)
             self.assertEqual(sorted(os.listdir(self.folder)), ["book.xlsx", "link", "out.json", "temporary"])
+
+    def outcome(self, *arguments, **more):
+        done = subprocess.run([TOOL, *map(str, arguments)], capture_output=True, cwd=self.folder, check=False,
+                              env=self.environment(), text=True, **more)
+        return done.returncode, done.stdout, done.stderr.splitlines()
+
+    def test_several_workbooks_have_outcomes_of_their_own(self):
+        small, bad = self.book(PARTS, "small.xlsx"), self.book("no package", "bad.xlsx")
+        books = [small, "none.xlsx", bad, SAMPLE]
+        for view in ([], ["--list"], ["--json"]):
+            with self.subTest(view):
+                alone = [self.run_tool(book, *view) for book in (small, SAMPLE)]
+                code, text, errors = self.outcome(*view, *books)
+                self.assertEqual((code, errors[-1]), (22, "dpxlsx: 4 workbooks: 2 done, 2 failed "
+                                                          "(exit code 17: 1, 22: 1)"))
+                self.assertRegex("\n".join(errors), f"dpxlsx: none.xlsx: there is no(.*\n)+dpxlsx: {bad}: the file is")
+                if view != ["--json"]:
+                    self.assertEqual(text, f"{small}:\n{alone[0]}\n{SAMPLE}:\n{alone[1]}")
+                    continue
+                lines = text.splitlines(keepends=True)
+                self.assertEqual([lines[0], lines[3]], alone)
+                failures = [json.loads(line) for line in lines[1:3]]
+                for line in failures:
+                    SCHEMA.validate(line)
+                self.assertEqual([(line["file"], line["failure"]["exitCode"]) for line in failures],
+                                 [("none.xlsx", 17), (str(bad), 22)])
+        explained = "\n".join(f"{book}:\n{self.run_tool(book, '--explain')}" for book in (bad, SAMPLE))
+        self.assertEqual(self.outcome("--explain", bad, "none.xlsx", SAMPLE)[:2], (17, explained))
+        self.assertEqual(self.outcome("--csv", "out/", *books)[0], 22)
+        self.run_tool("--csv", "one/", SAMPLE)
+        made = {str(p.relative_to(self.folder / "out")): p.read_text() for p in (self.folder / "out").glob("*/*")}
+        self.assertEqual(sorted(made), ["sample/Measurements.csv", "sample/Readings 2024.csv", "small/My Data.csv"])
+        self.assertEqual(made["sample/Measurements.csv"], (self.folder / "one" / "Measurements.csv").read_text())
+        ranked = [(small, 0), (SAMPLE, 2), ("none.xlsx", 17), (bad, 22), (self.damaged("no styles"), 25),
+                  (self.damaged("no sheet"), 13), (self.damaged("checksum"), 1)]
+        for (better, _), (worse, code) in zip(ranked, ranked[1:]):
+            for pair in ([better, worse], [worse, better]):
+                self.assertEqual(self.outcome(*pair, "--sheet", "My Data")[0], code, pair)
+
+    def test_csv_files_of_a_workbook_take_their_places_together(self):
+        big = self.book({**rows(*(f'<c r="A{r}" t="s"><v>1</v></c>' for r in range(2, 9000))),
+                         STRINGS: PARTS[STRINGS].replace("Oslo", "o" * 80)}, "big.xlsx")
+        small = self.book(PARTS, "small.xlsx")
+
+        def limited():
+            resource.setrlimit(resource.RLIMIT_FSIZE, (600000, 600000))
+        code, _, errors = self.outcome("--csv", "out/", big, small, preexec_fn=limited, restore_signals=False)
+        self.assertEqual((code, errors[-1]), (3, "dpxlsx: 2 workbooks: 1 done, 1 failed (exit code 3: 1)"))
+        self.assertEqual([p.name for p in (self.folder / "out").glob("*/*")], ["My Data.csv"])
+
+    def test_an_interrupt_ends_a_call_between_workbooks(self):
+        book = self.many_rows()
+        child = subprocess.Popen([TOOL, "--json", book, book, book], stdout=subprocess.PIPE, stderr=subprocess.PIPE,
+                                 env=self.environment(), text=True)
+        child.stdout.read(1)
+        child.send_signal(signal.SIGTERM)
+        text, errors = child.communicate()
+        self.assertEqual((text.count("\n"), child.returncode), (1, 128 + signal.SIGTERM))
+        self.assertTrue(errors.endswith("dpxlsx: 1 of 3 workbooks: 1 done, 0 failed\n"), errors)
 
     def test_a_relative_name_and_any_letter_case_open(self):
         shutil.copy(SAMPLE, self.folder / "BOOK.XLSX")
@@ -903,7 +969,8 @@ class ToolTest(unittest.TestCase):
         scripts.mkdir()
         shutil.copy(SOURCE / "scripts" / "import", scripts)
         shutil.copytree(SOURCE / "samples", self.folder / "samples")
-        shutil.copy(SAMPLE, self.folder / "BOOK.xlsx")
+        for name in ("BOOK.xlsx", "OTHER.xlsx"):
+            shutil.copy(SAMPLE, self.folder / name)
         tool = self.folder / "build" / "release" / "bin" / "dpxlsx"
         tool.symlink_to(TOOL)
         for name in ("setup", "build"):  # this build stands in for what they would make

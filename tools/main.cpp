@@ -14,6 +14,7 @@
 #include "tools/views/csv.h"
 #include "tools/views/json_view.h"
 #include "tools/views/output.h"
+#include "tools/views/several.h"
 #include "tools/views/table_view.h"
 #include "tools/views/text.h"
 
@@ -31,62 +32,48 @@ void showNames(Workbook& workbook, Output& output) {
     for (const std::string& name : workbook.worksheetNames()) output.write(printable(name) + "\n");
 }
 
-void refuseToOverwrite(const Options& options) {
+void refuseToOverwrite(const std::string& book, const std::string& target) {
     std::error_code error;
-    if (!std::filesystem::equivalent(options.book, options.target, error)) return;
-    throw Failure(kUsage, options.target + ": is the workbook itself; name another file to write");
+    if (!std::filesystem::equivalent(book, target, error)) return;
+    throw Failure(kUsage, target + ": is the workbook itself; name another file to write");
 }
 
-void showPage(const Library& library, Workbook& workbook, const Options& options) {
-    Output output(options.target);
-    writePage(library, workbook, options, output);
-    output.finish();
-}
-
-void show(Workbook& workbook, const Options& options) {
+void show(Workbook& workbook, const Options& options, Output& output) {
     workbook.open();
-    if (options.view == View::Csv) return writeCsv(workbook, options);
-    Output output(options.target);
+    if (options.view == View::Csv) writeCsv(workbook, options);
     if (options.view == View::Json) writeJson(workbook, options, output);
     if (options.view == View::Tables) showTables(workbook, options, output);
-    output.finish();
 }
 
-// Prints what the user would not notice in the output.
-void printNotes(const Workbook& workbook, const Options& options) {
+// What the user would not notice in the output.
+std::vector<std::string> notesOn(const Workbook& workbook, const Options& options) {
+    std::vector<std::string> notes = workbook.notes();
     const std::string note = importNote(options, workbook.folder(), workbook.leftOut());
-    if (!note.empty()) printLine(note);
-    for (const std::string& more : workbook.notes()) printLine(more);
+    if (!note.empty()) notes.insert(notes.begin(), note);
+    return notes;
 }
 
-void importBook(const Library& library, const Options& options) {
+std::vector<std::string> importBook(const Library& library, const Options& options,
+                                    Output& output) {
     Workbook workbook(library, options);
+    if (options.view == View::Names) {
+        showNames(workbook, output);
+        return {};
+    }
     if (options.view == View::Page) {
-        showPage(library, workbook, options);
-        return printNotes(workbook, options);
+        writePage(library, workbook, options, output);
+    } else {
+        show(workbook, options, output);
     }
-    if (options.view != View::Names) {
-        show(workbook, options);
-        return printNotes(workbook, options);
-    }
-    Output output(options.target);
-    showNames(workbook, output);
-    output.finish();
-}
-
-void explainBook(const Library& library, const Options& options) {
-    Output output(options.target);
-    explain(library, options, output);
-    output.finish();
+    return notesOn(workbook, options);
 }
 
 // Turns exceptions of the library into failures that say what to do.
-void carryOut(const Options& options) {
-    refuseToOverwrite(options);
-    const Library library(options.library);
+std::vector<std::string> carryOut(const Library& library, const Options& options, Output& output) {
     try {
-        if (options.explain) return explainBook(library, options);
-        importBook(library, options);
+        if (!options.explain) return importBook(library, options, output);
+        explain(library, options, output);
+        return {};
     } catch (const ClosedPipe&) {
         throw;
     } catch (const Interrupted&) {
@@ -94,6 +81,24 @@ void carryOut(const Options& options) {
     } catch (...) {
         throw explained(currentFailure(options.book), options);
     }
+}
+
+int carryOut(const Request& request) {
+    const std::string& target = request.options.target;
+    for (const std::string& book : request.books) refuseToOverwrite(book, target);
+    const Library library(request.options.library);
+    const auto one = [&library](const Options& options, Output& output) {
+        return carryOut(library, options, output);
+    };
+    if (request.books.size() > 1) return carryOutEach(request, one);
+    Options options = request.options;
+    options.book = request.books.front();
+    // CSV has files of its own.
+    Output output = options.view == View::Csv ? Output::inMemory() : Output(target);
+    const std::vector<std::string> notes = one(options, output);
+    output.finish();
+    for (const std::string& note : notes) printLine(note);
+    return kSuccess;
 }
 
 int run(int count, const char* const* arguments) {
@@ -105,11 +110,8 @@ int run(int count, const char* const* arguments) {
     }
     try {
         const Request request = parseOptions(count, arguments);
-        if (request.answer.empty()) {
-            carryOut(request.options);
-        } else {
-            print(request.answer);
-        }
+        if (request.answer.empty()) return carryOut(request);
+        print(request.answer);
     } catch (const ClosedPipe&) {
         return kSuccess;
     } catch (const Interrupted& interrupt) {

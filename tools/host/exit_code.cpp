@@ -19,7 +19,7 @@ struct ResultText {
 };
 
 constexpr ResultText kResultTexts[] = {
-    {-17, kNoSuchFile, "there is no such file, or it is a folder; check the name"},
+    {-17, kNoSuchFile, "there is no such file; check the name"},
     {-18, kTemporaryDirectory,
      "cannot be copied into the temporary directory; check that you may read the file and that "
      "TMPDIR names a writable folder with free space"},
@@ -47,6 +47,10 @@ bool hasTemporaryDirectory() {
 }  // namespace
 
 Failure readFailure(const std::string& book, long result) {
+    std::error_code error;
+    if (result == -kNoSuchFile && std::filesystem::is_directory(book, error)) {
+        return {kNoSuchFile, book + ": is a folder; name the workbooks in it, as in FOLDER/*.xlsx"};
+    }
     for (const ResultText& entry : kResultTexts) {
         if (entry.result == result) return {entry.code, book + ": " + entry.text};
     }

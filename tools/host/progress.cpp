@@ -22,7 +22,7 @@ double now() {
 
 }  // namespace
 
-Progress::Progress() : terminal_(isatty(STDERR_FILENO) == 1) {}
+Progress::Progress(const std::string& turn) : turn_(turn), terminal_(isatty(STDERR_FILENO) == 1) {}
 
 Progress::~Progress() { erase(); }
 
@@ -48,7 +48,8 @@ void Progress::show(const std::string& text, const std::string& end) {
     // A line that wraps cannot be erased.
     const int width = terminalWidth(STDERR_FILENO).value_or(80) - 1;
     const int room = std::max(width - static_cast<int>(end.size()), 0);
-    std::fprintf(stderr, "\r\033[K%s%s", cutToWidth(printable(text), room).c_str(), end.c_str());
+    std::fprintf(stderr, "\r\033[K%s%s", cutToWidth(printable(turn_ + text), room).c_str(),
+                 end.c_str());
     shown_ = true;
     lastShown_ = now();
 }

@@ -9,7 +9,8 @@ namespace dp::tool {
 // done.
 class Progress {
   public:
-    Progress();
+    // `turn` precedes every line: the place of the workbook among several.
+    explicit Progress(const std::string& turn);
     ~Progress();
     Progress(const Progress&) = delete;
     Progress& operator=(const Progress&) = delete;
@@ -25,6 +26,7 @@ class Progress {
     // Text that does not fit is cut before `end`.
     void show(const std::string& text, const std::string& end = "");
 
+    std::string turn_;
     bool terminal_;
     bool shown_ = false;
     double lastShown_ = 0;  // seconds

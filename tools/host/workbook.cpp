@@ -31,6 +31,7 @@ std::vector<int> columnKeys(IVariableFinder& finder, int sheet) {
 Workbook::Workbook(const Library& library, const Options& options)
     : options_(options),
       provider_(library.createProvider(providerType(library, options.book))),
+      progress_(options.turn),
       losses_(options) {
     if (options.standard) library.readByStandard(*provider_);
     library.setProgress(

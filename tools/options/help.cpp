@@ -11,7 +11,7 @@ namespace dp::tool {
 namespace {
 
 constexpr const char* kIntroduction =
-    "Usage: dpxlsx [OPTIONS] BOOK.xlsx: import an Excel workbook as a host does\n";
+    "Usage: dpxlsx [OPTIONS] BOOK.xlsx ...: import Excel workbooks as a host does\n";
 
 constexpr const char* kExitCodes =
     R"(Options with ... may be repeated. Defaults are in parentheses.

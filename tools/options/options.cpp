@@ -17,7 +17,8 @@ void require(bool holds, const char* text) {
 }
 
 // Has the parser hand the values of an option to its row of the table.
-void add(CLI::App& app, const OptionRow& row, Options& options) {
+void add(CLI::App& app, const OptionRow& row, Request& request) {
+    Options& options = request.options;
     const std::string names = row.names;
     const auto take = [&row, &options](const std::string& value) {
         row.action.take(options, {row.names, value});
@@ -48,24 +49,18 @@ void add(CLI::App& app, const OptionRow& row, Options& options) {
     }
 }
 
-bool namesWorkbook(const std::string& text) {
-    const std::string extension = ".xlsx";
-    if (text.size() <= extension.size()) return false;
-    std::string end = text.substr(text.size() - extension.size());
-    return CLI::detail::to_lower(end) == extension;
-}
-
 // "--csv BOOK.xlsx" means the workbook, not a CSV file of that name.
-void takeBookFromTarget(Options& options) {
-    if (!options.book.empty() || !namesWorkbook(options.target)) return;
-    options.book = options.target;
-    options.target = "-";
+void takeBookFromTarget(Request& request) {
+    if (!namesWorkbook(request.options.target)) return;
+    request.books.insert(request.books.begin(), request.options.target);
+    request.options.target = "-";
 }
 
-void check(const Options& options) {
+void check(const Request& request) {
+    const Options& options = request.options;
     const ReadSettings& settings = options.settings;
     const bool given = settings.names.value_or(VNR_GIVEN) == VNR_GIVEN;
-    require(!options.book.empty(), "no workbook is given: dpxlsx BOOK.xlsx");
+    require(!request.books.empty(), "no workbook is given: dpxlsx BOOK.xlsx");
     require(settings.nameRow == 0 || given, "--name-row needs --names given");
     require(!settings.missingNumber || !settings.missingWord,
             "--missing-number and --missing-word share one replacement: give one of them");
@@ -76,6 +71,8 @@ void check(const Options& options) {
     require(!options.asShown || options.view == View::Csv, "--as-shown needs --csv");
     require(!options.explain || options.view == View::Tables || options.view == View::Json,
             kOneView);
+    require(options.view != View::Page || request.books.size() == 1,
+            "--page shows one workbook: give one, and call dpxlsx for each");
     require(options.view != View::Names || options.sheets.empty(),
             "--list names all worksheets: leave out either --list or --sheet");
     require(!options.explain || options.sheets.empty(),
@@ -96,14 +93,20 @@ std::string mismatchText(const std::string& words) {
 
 }  // namespace
 
+bool namesWorkbook(const std::string& text) {
+    const std::string extension = ".xlsx";
+    if (text.size() <= extension.size()) return false;
+    std::string end = text.substr(text.size() - extension.size());
+    return CLI::detail::to_lower(end) == extension;
+}
+
 Request parseOptions(int count, const char* const* arguments) {
     Request request;
-    Options& options = request.options;
     CLI::App app;
     for (const OptionGroup& group : optionGroups()) {
-        for (const OptionRow& row : group.rows) add(app, row, options);
+        for (const OptionRow& row : group.rows) add(app, row, request);
     }
-    app.add_option("BOOK", options.book);
+    app.add_option("BOOK", request.books);
     const CLI::Option* table = app.add_flag("--option-table");  // for scripts/make-option-pages
     try {
         app.parse(count, arguments);
@@ -117,8 +120,7 @@ Request parseOptions(int count, const char* const* arguments) {
         wrongUsage(mismatchText(error.what()));
     } catch (const CLI::ExtrasError& error) {
         const std::string words = firstLine(error.what());
-        wrongUsage(words.substr(words.rfind(": ") + 2) +
-                   ": there is no such option, and one workbook is read at a time");
+        wrongUsage(words.substr(words.rfind(": ") + 2) + ": there is no such option");
     } catch (const CLI::ParseError& error) {
         wrongUsage(firstLine(error.what()));
     }
@@ -126,8 +128,8 @@ Request parseOptions(int count, const char* const* arguments) {
         request.answer = optionTableText();
         return request;
     }
-    takeBookFromTarget(options);
-    check(options);
+    takeBookFromTarget(request);
+    check(request);
     return request;
 }
 

@@ -54,6 +54,7 @@ struct ReadSettings {
 
 struct Options {
     std::string book;
+    std::string turn;  // the book's place among several, such as "2 of 7: ", for the progress line
     std::string library;
     View view = View::Tables;
     std::string target = "-";         // file or folder of a CSV, JSON or page view
@@ -66,9 +67,13 @@ struct Options {
 };
 
 struct Request {
-    Options options;
+    std::vector<std::string> books;
+    Options options;     // for each of them
     std::string answer;  // the help or the version, to be printed instead of doing anything
 };
+
+// Whether the name ends in .xlsx, in any letter case.
+bool namesWorkbook(const std::string& text);
 
 // What the command line asks for. Throws a Failure with kUsage when it is wrong.
 Request parseOptions(int count, const char* const* arguments);

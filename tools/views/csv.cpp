@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <deque>
 #include <filesystem>
 #include <set>
 #include <system_error>
@@ -44,9 +45,7 @@ void writeLine(Output& output, const LoadedWorksheet& worksheet, TextOf textOf) 
     output.write(line.empty() ? "\"\"\n" : line + "\n");
 }
 
-void writeWorksheet(const LoadedWorksheet& worksheet, const Options& options,
-                    const std::string& path) {
-    Output output(path);
+void writeWorksheet(const LoadedWorksheet& worksheet, const Options& options, Output& output) {
     const size_t rows = std::min(worksheet.layout.rows, options.head.value_or(SIZE_MAX));
     writeLine(output, worksheet, nameOf);
     for (size_t row = 0; row < rows; ++row) {
@@ -55,7 +54,7 @@ void writeWorksheet(const LoadedWorksheet& worksheet, const Options& options,
             return options.asShown ? column.shown(row) : column.exact(row);
         });
     }
-    output.finish();
+    output.close();
 }
 
 // A file name made of the title: it does not lead out of the folder, and every file system accepts
@@ -80,20 +79,29 @@ void writeFolder(Workbook& workbook, const Options& options,
         throw Failure(kOutputFailure, options.target + ": the folder cannot be made (" +
                                           error.message() + "); name another one");
     }
+    std::deque<Output> files;
     std::set<std::string> taken;
     for (const SheetEntry& sheet : sheets) {
         std::string name = fileName(sheet.title);
         while (!taken.insert(name).second) name += "-" + std::to_string(sheet.key);
-        writeWorksheet(workbook.load(sheet), options, (folder / (name + ".csv")).string());
+        files.emplace_back((folder / (name + ".csv")).string());
+        writeWorksheet(workbook.load(sheet), options, files.back());
     }
-}
-
-bool meansFolder(const std::string& target) {
-    std::error_code error;
-    return target.back() == '/' || fs::is_directory(target, error);
+    for (Output& file : files) file.finish();
 }
 
 }  // namespace
+
+bool meansFolder(const std::string& target) {
+    std::error_code error;
+    return target.ends_with('/') || fs::is_directory(target, error);
+}
+
+std::string folderOf(const std::string& book, const std::string& target) {
+    fs::path name = fs::path(book).filename();
+    if (namesWorkbook(book)) name = name.stem();
+    return (fs::path(target) / fileName(name.string())).string() + "/";
+}
 
 void writeCsv(Workbook& workbook, const Options& options) {
     const std::vector<SheetEntry> sheets = workbook.worksheets();
@@ -107,7 +115,9 @@ void writeCsv(Workbook& workbook, const Options& options) {
                                   "; add --sheet and the name or number of one, or name a folder "
                                   "for all: --csv FOLDER/");
     }
-    writeWorksheet(workbook.load(sheets.front()), options, options.target);
+    Output output(options.target);
+    writeWorksheet(workbook.load(sheets.front()), options, output);
+    output.finish();
 }
 
 }  // namespace dp::tool

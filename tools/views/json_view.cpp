@@ -215,7 +215,7 @@ namespace {
 void writeWorksheet(const LoadedWorksheet& worksheet, size_t most, Output& output) {
     output.write(opened(worksheetJson(worksheet)) + ",\"columns\":[");
     for (const Column& column : worksheet.columns) {
-        output.write(&column == &worksheet.columns.front() ? "\n" : ",\n");
+        if (&column != &worksheet.columns.front()) output.write(",");
         output.write(dumped(columnJson(column, most)));
     }
     output.write("]}");
@@ -227,10 +227,17 @@ void writeJson(Workbook& workbook, const Options& options, Output& output) {
     const std::vector<SheetEntry> sheets = workbook.worksheets();
     output.write(opened(bookJson(workbook, options)) + ",\"worksheets\":[");
     for (size_t i = 0; i < sheets.size(); ++i) {
-        output.write(i == 0 ? "\n" : ",\n");
+        if (i > 0) output.write(",");
         writeWorksheet(workbook.load(sheets[i]), options.head.value_or(SIZE_MAX), output);
     }
     output.write("]}\n");
+}
+
+std::string failureJson(const std::string& book, const Failure& failure) {
+    const Json json = {
+        {"file", validUtf8(book)},
+        {"failure", {{"exitCode", failure.code()}, {"text", validUtf8(failure.what())}}}};
+    return dumped(json) + "\n";
 }
 
 }  // namespace dp::tool

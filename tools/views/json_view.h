@@ -2,6 +2,7 @@
 
 #include <nlohmann/json_fwd.hpp>
 
+#include "tools/host/exit_code.h"
 #include "tools/host/workbook.h"
 #include "tools/views/output.h"
 
@@ -14,9 +15,12 @@ nlohmann::ordered_json worksheetJson(const LoadedWorksheet& worksheet);
 // What a host can read of a column, with the first values, at most `most`.
 nlohmann::ordered_json columnJson(const Column& column, size_t most);
 
-// One JSON document with everything that a host can read of the workbook: a line per column.
-// Values are in full precision, date-times are serial day numbers with their ISO and displayed
-// texts beside them, missing values are null.
+// One JSON document, on one line, with everything that a host can read of the workbook. Values are
+// in full precision, date-times are serial day numbers with their ISO and displayed texts beside
+// them, missing values are null.
 void writeJson(Workbook& workbook, const Options& options, Output& output);
+
+// The line for one workbook of several that could not be read.
+std::string failureJson(const std::string& book, const Failure& failure);
 
 }  // namespace dp::tool

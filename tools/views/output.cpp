@@ -32,7 +32,7 @@ Output::Output(const std::string& path) : path_(path), descriptor_(open()) {
 }
 
 Output::~Output() {
-    if (descriptor_ >= 0 && descriptor_ != STDOUT_FILENO) close(descriptor_);
+    if (descriptor_ >= 0 && descriptor_ != STDOUT_FILENO) ::close(descriptor_);
     if (!aside_.empty()) unlink(aside_.c_str());
 }
 
@@ -65,15 +65,20 @@ int Output::openAside() {
 
 void Output::write(std::string_view text) {
     buffer_.append(text);
-    if (buffer_.size() >= kBufferSize) flush();
+    if (buffer_.size() >= kBufferSize && descriptor_ >= 0) flush();
 }
 
-void Output::finish() {
+void Output::close() {
+    if (descriptor_ < 0) return;
     flush();
     if (descriptor_ == STDOUT_FILENO) return;
     const int closing = descriptor_;
     descriptor_ = -1;
-    if (close(closing) != 0) fail(errno);
+    if (::close(closing) != 0) fail(errno);
+}
+
+void Output::finish() {
+    close();
     if (aside_.empty()) return;
     if (std::rename(aside_.c_str(), place_.c_str()) != 0) fail(errno);
     aside_.clear();

@@ -16,25 +16,33 @@ class Output {
   public:
     // "-" is standard output.
     explicit Output(const std::string& path);
+    // Keeps what is written in memory, for text().
+    static Output inMemory() { return {}; }
     ~Output();
     Output(const Output&) = delete;
     Output& operator=(const Output&) = delete;
 
     void write(std::string_view text);
-    // Writes what is still buffered and puts the file in its place. To be called at the end:
-    // otherwise the output is lost without an error.
+    // Writes what is still buffered.
+    void flush();
+    // Writes what is still buffered and closes the file, which is not in its place yet.
+    void close();
+    // Closes the file and puts it in its place. To be called at the end: otherwise the output is
+    // lost without an error.
     void finish();
+    // What has not been written yet.
+    const std::string& text() const { return buffer_; }
 
   private:
+    Output() = default;
     int open();
     int openAside();
-    void flush();
     [[noreturn]] void fail(int error) const;
 
     std::string path_;
     std::string place_;  // the file behind path_, when that is a symbolic link
     std::string aside_;  // where it is written; empty when it is written in place
-    int descriptor_;
+    int descriptor_ = -1;
     std::string buffer_;
 };
 
