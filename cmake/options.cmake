@@ -21,3 +21,10 @@ if(DPXLSX_SANITIZE)
         $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
     target_link_options(dpxlsx_options INTERFACE -fsanitize=${DPXLSX_SANITIZE})
 endif()
+
+# With sanitizers the optimiser takes minutes over tables of cases and of options, each step of which is checked.
+function(leave_unoptimized_when_sanitized target)
+    if(DPXLSX_SANITIZE)
+        target_compile_options(${target} PRIVATE -O0)
+    endif()
+endfunction()
