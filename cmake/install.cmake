@@ -29,6 +29,11 @@ if(DPXLSX_TOOL)
     install(TARGETS dpxlsx_tool RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
     install(FILES docs/dpxlsx.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
     install(FILES docs/tool.md docs/tool.schema.json DESTINATION ${docs_dir})
+    install(FILES tools/completions/dpxlsx.bash RENAME dpxlsx
+        DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions)
+    install(FILES tools/completions/_dpxlsx DESTINATION ${CMAKE_INSTALL_DATADIR}/zsh/site-functions)
+    install(FILES tools/completions/dpxlsx.fish
+        DESTINATION ${CMAKE_INSTALL_DATADIR}/fish/vendor_completions.d)
 endif()
 
 # The interfaces, and the headers of the classes and functions that a host may link to by name with

@@ -238,7 +238,7 @@ int main() {
     def test_tool_finds_its_library_and_its_page_names_every_option(self):
         tool = self.prefix / "bin" / "dpxlsx"
         self.assertIn("Measurements", run(tool, "--list", SAMPLE, env=self.environment))
-        version = run(tool, "--version").split()[-1]
+        version = run(tool, "--version").splitlines()[0].split()[-1]
         self.assertEqual(run("pkg-config", "--modversion", "dpxlsx", env=self.environment).strip(), version)
         self.assertTrue((self.libraries / f"libdpxlsx.so.{version}").is_file())
         page = next(self.prefix.glob("share/man/man1/dpxlsx.1*"))

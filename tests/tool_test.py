@@ -485,7 +485,7 @@ class ToolTest(unittest.TestCase):
                  [SAMPLE, "--explain", "--csv"], [SAMPLE, "--explain", "--list"], [SAMPLE, "--rows", "0"], [SAMPLE, "--missing", "nan"],
                  [SAMPLE, "--exclude", "Nowhere!A"], [SAMPLE, "--as-shown"],
                  [SAMPLE, "--missing-word", "a=1", "--missing-number", "1=2"],
-                 [SAMPLE, "--json", link], [SAMPLE, SAMPLE, "--json", link], [SAMPLE, "--max-text", "0"], [SAMPLE, "--list=no"],
+                 [SAMPLE, "--json", link], ["none", SAMPLE, "--json", link], [SAMPLE, "--max-text", "0"], [SAMPLE, "--list=no"],
                  [SAMPLE, "--type", "Measurements!Q=text"], [SAMPLE, "--position", "2!K=1"]]
         for arguments in cases:
             with self.subTest(arguments):
@@ -495,6 +495,8 @@ class ToolTest(unittest.TestCase):
                     (["--head"], "--head: its value is missing; see"),
                     (["--csv", "a", "--csv", "b"], "--csv: give it once, with one value; see"),
                     (["--bogus"], "--bogus: there is no such option; see"),
+                    (["--sheets", "1"], "--sheets: there is no such option; perhaps --sheet; see"),
+                    (["--skip"], "perhaps --skip-blank-rows; see"),
                     ([link.with_suffix(".xlsx"), "--csv", "x.csv"], "need a folder for their CSV files: --csv FOLDER/"),
                     ([SAMPLE.with_suffix(".XLSX"), "--csv", "no/"],
                      "sample.xlsx and .*sample.XLSX would both be written to no/sample/; nothing was written"),
@@ -607,12 +609,17 @@ class ToolTest(unittest.TestCase):
                 self.assertEqual(self.outcome(*pair, "--sheet", "My Data")[0], code, pair)
 
     def test_csv_files_of_a_workbook_take_their_places_together(self):
-        big = self.book({**rows(*(f'<c r="A{r}" t="s"><v>1</v></c>' for r in range(2, 9000))),
-                         STRINGS: PARTS[STRINGS].replace("Oslo", "o" * 80)}, "big.xlsx")
+        second = rows(*(f'<c r="A{r}" t="s"><v>1</v></c>' for r in range(2, 9000)))[SHEET]
+        big = self.book({**PARTS, STRINGS: PARTS[STRINGS].replace("Oslo", "o" * 80),
+                         WORKBOOK: PARTS[WORKBOOK].replace("</s", '<sheet name="Big" sheetId="2" r:id="b"/></s', 1),
+                         LINKS: PARTS[LINKS].replace("sheet1", "sheet2").replace('"a"', '"b"').replace(
+                             "</R", re.search("<Rel[^>]*/>", PARTS[LINKS])[0] + "</R"),
+                         "xl/worksheets/sheet2.xml": second}, "big.xlsx")
         small = self.book(PARTS, "small.xlsx")
 
         def limited():
             resource.setrlimit(resource.RLIMIT_FSIZE, (600000, 600000))
+        self.assertEqual(self.outcome("--list", big)[1], "My Data\nBig\n")
         code, _, errors = self.outcome("--csv", "out/", big, small, preexec_fn=limited, restore_signals=False)
         self.assertEqual((code, errors[-1]), (3, "dpxlsx: 2 workbooks: 1 done, 1 failed (exit code 3: 1)"))
         self.assertEqual([p.name for p in (self.folder / "out").glob("*/*")], ["My Data.csv"])
@@ -626,6 +633,23 @@ class ToolTest(unittest.TestCase):
         text, errors = child.communicate()
         self.assertEqual((text.count("\n"), child.returncode), (1, 128 + signal.SIGTERM))
         self.assertTrue(errors.endswith("dpxlsx: 1 of 3 workbooks: 1 done, 0 failed\n"), errors)
+
+    def test_bash_completes_options_values_and_workbooks(self):
+        for name in ("a b.xlsx", "B.XLSX", "c.txt"):
+            (self.folder / name).touch()
+        everything = ["a b.xlsx", "B.XLSX", "c.txt", "temporary"]
+        cases = [(["--na"], ["--name-row", "--names"]), (["--names", ""], ["given", "infer", "none"]),
+                 (["--names", "=", "i"], ["infer"]), (["--names", "="], ["given", "infer", "none"]),
+                 (["--head", ""], []), (["--library", ""], everything), (["--vers"], ["--version"]),
+                 ([""], ["a b.xlsx", "B.XLSX", "temporary"]), (["--csv", "a"], ["a b.xlsx"]),
+                 (["a b.xlsx", "--list", "t"], ["temporary"])]
+        for words, wanted in cases:
+            line = shlex.join(["dpxlsx", *words])
+            done = subprocess.run(["bash", "-c", f'. "$0"; COMP_WORDS=({line}) COMP_CWORD={len(words)}; _dpxlsx; '
+                                   'printf "%s\\n" "${COMPREPLY[@]}"', SOURCE / "tools/completions/dpxlsx.bash"],
+                                  cwd=self.folder, capture_output=True, text=True, check=False)
+            self.assertEqual((sorted(filter(None, done.stdout.split("\n")), key=str.lower), done.stderr),
+                             (wanted, ""), words)
 
     def test_a_relative_name_and_any_letter_case_open(self):
         shutil.copy(SAMPLE, self.folder / "BOOK.XLSX")
@@ -740,7 +764,12 @@ class ToolTest(unittest.TestCase):
         pages = subprocess.run([SOURCE / "scripts" / "make-option-pages", "--check", TOOL],
                                capture_output=True, check=False, text=True)
         self.assertEqual((pages.returncode, pages.stderr), (0, ""))
-        self.assertRegex(self.run_tool("--version"), r"^dpxlsx \d+\.\d+\.\d+\n$")
+        number = r"\d[\d.]*"
+        self.assertRegex(self.run_tool("--version"), rf"^dpxlsx {number}\nImport library: /.*/libdpxlsx\.so\.{number}\n"
+                         rf"Loaded: libxml2 {number}, ICU {number}, zlib {number}, "
+                         rf"xxHash {number}, .*libboost_filesystem\.so\.{number}.*\nCompiled in: CLI11 {number}, "
+                         rf"nlohmann-json {number}\n$")
+        self.assertIn("none.so: the import library cannot be loaded", self.run_tool("--library", "none.so", "--version"))
 
     def test_traits_are_explained(self):
         for key, content, text, code in TRAITS:

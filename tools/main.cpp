@@ -7,6 +7,7 @@
 #include "tools/host/exit_code.h"
 #include "tools/host/interrupt.h"
 #include "tools/host/library.h"
+#include "tools/host/version.h"
 #include "tools/host/workbook.h"
 #include "tools/options/help.h"
 #include "tools/options/options.h"
@@ -110,8 +111,13 @@ int run(int count, const char* const* arguments) {
     }
     try {
         const Request request = parseOptions(count, arguments);
-        if (request.answer.empty()) return carryOut(request);
-        print(request.answer);
+        if (request.version) {
+            print(versionText(request.options.library));
+        } else if (!request.answer.empty()) {
+            print(request.answer);
+        } else {
+            return carryOut(request);
+        }
     } catch (const ClosedPipe&) {
         return kSuccess;
     } catch (const Interrupted& interrupt) {

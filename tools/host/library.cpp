@@ -1,6 +1,7 @@
 #include "tools/host/library.h"
 
 #include <dlfcn.h>
+#include <link.h>
 
 #include <cstdlib>
 #include <filesystem>
@@ -38,6 +39,12 @@ Failure loadFailure(const std::string& library) {
                                  "); name the right file with --library"};
 }
 
+std::string realFile(const link_map& loaded) {
+    std::error_code error;
+    const fs::path file = fs::canonical(loaded.l_name, error);
+    return error ? loaded.l_name : file.string();
+}
+
 template <class Function>
 Function find(void* handle, const char* name, const std::string& library) {
     void* symbol = dlsym(handle, name);
@@ -49,12 +56,12 @@ Function find(void* handle, const char* name, const std::string& library) {
 
 Library::Library(const std::string& path) {
     const std::string library = wantedLibrary(path);
-    void* const handle = dlopen(library.c_str(), RTLD_NOW | RTLD_LOCAL);
-    if (handle == nullptr) throw loadFailure(library);
-    create_ = find<decltype(create_)>(handle, "CreateDataProvider", library);
-    type_ = find<decltype(type_)>(handle, "GetDataProviderFiletype", library);
-    rules_ = reinterpret_cast<decltype(rules_)>(dlsym(handle, "SetReadingRules"));
-    progress_ = reinterpret_cast<decltype(progress_)>(dlsym(handle, "SetProgress"));
+    handle_ = dlopen(library.c_str(), RTLD_NOW | RTLD_LOCAL);
+    if (handle_ == nullptr) throw loadFailure(library);
+    create_ = find<decltype(create_)>(handle_, "CreateDataProvider", library);
+    type_ = find<decltype(type_)>(handle_, "GetDataProviderFiletype", library);
+    rules_ = reinterpret_cast<decltype(rules_)>(symbol("SetReadingRules"));
+    progress_ = reinterpret_cast<decltype(progress_)>(symbol("SetProgress"));
 }
 
 std::string Library::fileType(const std::string& book) const { return type_(book.c_str()); }
@@ -82,5 +89,22 @@ void Library::setProgress(IDataProvider& provider, int (*report)(double done, vo
                           void* user) const {
     if (progress_ != nullptr) progress_(&provider, report, user);
 }
+
+std::string Library::file() const {
+    const link_map* loaded = nullptr;
+    dlinfo(handle_, RTLD_DI_LINKMAP, &loaded);
+    return realFile(*loaded);
+}
+
+std::vector<std::string> Library::loadedFiles() const {
+    std::vector<std::string> files;
+    const link_map* loaded = nullptr;
+    dlinfo(handle_, RTLD_DI_LINKMAP, &loaded);
+    while (loaded->l_prev != nullptr) loaded = loaded->l_prev;
+    for (; loaded != nullptr; loaded = loaded->l_next) files.push_back(realFile(*loaded));
+    return files;
+}
+
+void* Library::symbol(const char* name) const { return dlsym(handle_, name); }
 
 }  // namespace dp::tool

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include <dpxlsx/model/host/entry_points.h>
 #include <dpxlsx/model/host/i_data_provider.h>
@@ -27,7 +28,20 @@ class Library {
     void setProgress(IDataProvider& provider, int (*report)(double done, void* user),
                      void* user) const;
 
+    // The file that was loaded, with all links followed.
+    std::string file() const;
+    // The files of all libraries that are loaded now.
+    std::vector<std::string> loadedFiles() const;
+    // A function that the library, or one that it needs, exports; null when none does.
+    template <class Function>
+    Function* function(const char* name) const {
+        return reinterpret_cast<Function*>(symbol(name));
+    }
+
   private:
+    void* symbol(const char* name) const;
+
+    void* handle_;
     decltype(&CreateDataProvider) create_;
     decltype(&GetDataProviderFiletype) type_;
     decltype(&SetReadingRules) rules_;  // null when the library is too old for it

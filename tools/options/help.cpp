@@ -13,8 +13,8 @@ namespace {
 constexpr const char* kIntroduction =
     "Usage: dpxlsx [OPTIONS] BOOK.xlsx ...: import Excel workbooks as a host does\n";
 
-constexpr const char* kExitCodes =
-    R"(Options with ... may be repeated. Defaults are in parentheses.
+constexpr const char* kNotation = "Options with ... may be repeated. Defaults are in parentheses.";
+constexpr const char* kExitCodes = R"(
 Exit codes: 0 done, 1 damaged, 2 usage, 3 output, 4 library, 5 system, 13 bad
 part, 17 no file, 18 temporary folder, 22 no package, 25 no workbook, 128+signal
 )";
@@ -47,7 +47,7 @@ std::string groupText(const OptionGroup& group) {
 std::string helpText() {
     std::string text = kIntroduction;
     for (const OptionGroup& group : optionGroups()) text += groupText(group);
-    return text + kExitCodes;
+    return text + kNotation + kExitCodes;
 }
 
 std::string shortHelpText() {
@@ -61,11 +61,12 @@ std::string optionTableText() {
         for (const OptionRow& row : group.rows) {
             rows.push_back({{"names", row.names},
                             {"value", valueText(row)},
-                            {"meaning", std::string(row.summary) + row.more}});
+                            {"summary", row.summary},
+                            {"more", row.more}});
         }
         groups.push_back({{"title", group.title}, {"text", group.text}, {"options", rows}});
     }
-    return groups.dump(1) + "\n";
+    return nlohmann::json({{"notation", kNotation}, {"groups", groups}}).dump(1) + "\n";
 }
 
 }  // namespace dp::tool

@@ -142,7 +142,11 @@ constexpr OptionRow kProgram[] = {
     {"--library", "FILE", "the import library to load",
      "; else the one that `DPXLSX_LIBRARY` names", value<&Options::library, textValue>},
     {"-h, --help", "", "all options and exit codes", "", {Takes::Help, nullptr}},
-    {"--version", "", "the version of this program", "", {Takes::Version, nullptr}}};
+    {"--version",
+     "",
+     "versions of this program and of what it is built on",
+     "",
+     {Takes::Version, nullptr}}};
 
 constexpr OptionGroup kGroups[] = {
     {"What to show", "", "", kOutput},

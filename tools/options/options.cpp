@@ -7,6 +7,7 @@
 #include "tools/options/help.h"
 #include "tools/options/option_table.h"
 #include "tools/options/option_values.h"
+#include "tools/options/similar_option.h"
 
 namespace dp::tool {
 
@@ -44,7 +45,7 @@ void add(CLI::App& app, const OptionRow& row, Request& request) {
             app.set_help_flag(names);
             break;
         case Takes::Version:
-            app.set_version_flag(names, std::string("dpxlsx ") + DPXLSX_VERSION);
+            app.add_flag(names, request.version);
             break;
     }
 }
@@ -77,6 +78,11 @@ void check(const Request& request) {
             "--list names all worksheets: leave out either --list or --sheet");
     require(!options.explain || options.sheets.empty(),
             "--explain looks at the whole book: leave out either --explain or --sheet");
+}
+
+std::string unknownText(const std::string& words) {
+    const std::string meant = similarOption(words.substr(0, words.find(' ')));
+    return words + ": there is no such option" + (meant.empty() ? meant : "; perhaps " + meant);
 }
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\n')); }
@@ -113,14 +119,11 @@ Request parseOptions(int count, const char* const* arguments) {
     } catch (const CLI::CallForHelp&) {
         request.answer = helpText();
         return request;
-    } catch (const CLI::CallForVersion& version) {
-        request.answer = firstLine(version.what()) + "\n";
-        return request;
     } catch (const CLI::ArgumentMismatch& error) {
         wrongUsage(mismatchText(error.what()));
     } catch (const CLI::ExtrasError& error) {
         const std::string words = firstLine(error.what());
-        wrongUsage(words.substr(words.rfind(": ") + 2) + ": there is no such option");
+        wrongUsage(unknownText(words.substr(words.rfind(": ") + 2)));
     } catch (const CLI::ParseError& error) {
         wrongUsage(firstLine(error.what()));
     }
@@ -128,6 +131,7 @@ Request parseOptions(int count, const char* const* arguments) {
         request.answer = optionTableText();
         return request;
     }
+    if (request.version) return request;
     takeBookFromTarget(request);
     check(request);
     return request;

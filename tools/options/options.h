@@ -68,8 +68,9 @@ struct Options {
 
 struct Request {
     std::vector<std::string> books;
-    Options options;     // for each of them
-    std::string answer;  // the help or the version, to be printed instead of doing anything
+    Options options;       // for each of them
+    std::string answer;    // the help, to be printed instead of doing anything
+    bool version = false;  // to be printed instead of doing anything
 };
 
 // Whether the name ends in .xlsx, in any letter case.
