@@ -51,17 +51,19 @@ TEST(NumberFormatCodes, ShowWhatOtherProgramsShow) {
     for (const auto& row : table["codes"]) {
         const std::string code = row["code"];
         SCOPED_TRACE(row.dump());
-        EXPECT_EQ(kindOf(code), row["kind"]);
+        const std::string kind = row["kind"];
+        EXPECT_EQ(kindOf(code), kind);
         const auto format = createVariableFormat(parseNumberFormat(code));
-        const bool isNumber = row["kind"] == "number";
         for (std::size_t i = 0; i < row["shows"].size(); ++i)
-            EXPECT_EQ(shown(*format, isNumber ? table["number"] : table["values"][i]), row["shows"][i]);
+            EXPECT_EQ(shown(*format, kind == "number" ? table["number"] : table["values"][i]),
+                      row["shows"][i].get<std::string>());
     }
     ASSERT_GT(table["sectioned"].size(), 90u);
     for (const auto& row : table["sectioned"]) {
         const auto format = createVariableFormat(parseNumberFormat(row["code"].get<std::string>()));
         for (std::size_t i = 0; i < table["numbers"].size(); ++i)
-            EXPECT_EQ(shown(*format, table["numbers"][i]), row["shows"][i]) << row << table["numbers"][i];
+            EXPECT_EQ(shown(*format, table["numbers"][i]), row["shows"][i].get<std::string>())
+                << row << table["numbers"][i];
     }
 }
 
