@@ -1,7 +1,12 @@
 #include "dpxlsx/readers/standard/package_parts.h"
 
+#include <dirent.h>
+
 #include <algorithm>
-#include <cstddef>
+#include <cerrno>
+#include <memory>
+#include <sys/stat.h>
+#include <utility>
 
 #include <boost/filesystem.hpp>
 
@@ -12,21 +17,49 @@ namespace dp::standard {
 
 namespace {
 
-namespace fs = boost::filesystem;
-
 constexpr const char* kUsualWorkbook = "xl/workbook.xml";
+
+[[noreturn]] void throwError(const std::string& path) {
+    throw boost::filesystem::filesystem_error("cannot list the parts", path,
+                                              {errno, boost::system::system_category()});
+}
+
+// The paths of all files below the directory, relative to it. Not by Boost's iterator (1.83) nor by
+// that of the standard library (g++ 12), which end the process when memory runs out.
+std::vector<std::string> listFiles(const std::string& directory) {
+    const std::string root = directory.ends_with('/') ? directory : directory + '/';
+    std::vector<std::string> files;
+    std::vector<std::string> folders = {""};
+    while (!folders.empty()) {
+        const std::string folder = std::move(folders.back());
+        folders.pop_back();
+        const std::unique_ptr<DIR, int (*)(DIR*)> list(::opendir((root + folder).c_str()),
+                                                       ::closedir);
+        if (!list) throwError(root + folder);
+        for (;;) {
+            errno = 0;
+            const dirent* entry = ::readdir(list.get());
+            if (entry == nullptr && errno == 0) break;
+            if (entry == nullptr) throwError(root + folder);
+            const std::string_view name = entry->d_name;
+            if (name == "." || name == "..") continue;
+            std::string path = folder;
+            path.append(name);
+            struct stat status {};
+            if (::stat((root + path).c_str(), &status) != 0) throwError(root + path);
+            if (S_ISDIR(status.st_mode)) folders.push_back(path + '/');
+            if (S_ISREG(status.st_mode)) files.push_back(std::move(path));
+        }
+    }
+    return files;
+}
 
 std::string lastSegment(const std::string& type) { return type.substr(type.rfind('/') + 1); }
 
 }  // namespace
 
 PackageParts::PackageParts(const std::string& directory) {
-    // Not by Boost's lexically_relative, which ends the process when memory runs out.
-    const std::size_t prefix = directory.size() + (directory.ends_with('/') ? 0 : 1);
-    std::vector<std::string> files;
-    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(directory))
-        if (fs::is_regular_file(entry.path()))
-            files.push_back(entry.path().native().substr(prefix));
+    std::vector<std::string> files = listFiles(directory);
     std::sort(files.begin(), files.end());  // directories are listed in any order
     for (const std::string& file : files) {
         const std::string name = resolvePartName({}, file);
