@@ -100,8 +100,8 @@ struct Claims {
 // Whether programs give such a name to the parts of a workbook that the library reads. Others,
 // pictures and pivot caches for example, are only unpacked. A wrong guess makes progress uneven.
 bool isNameOfReadPart(const char* name) {
-    constexpr const char* kWords[] = {"sheet", "sharedStrings", "styles", "workbook"};
-    return std::any_of(std::begin(kWords), std::end(kWords),
+    constexpr const char* kWordsOfNames[] = {"sheet", "sharedStrings", "styles", "workbook"};
+    return std::any_of(std::begin(kWordsOfNames), std::end(kWordsOfNames),
                        [name](const char* word) { return ::strcasestr(name, word) != nullptr; });
 }
 

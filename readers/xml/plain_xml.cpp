@@ -32,8 +32,8 @@ constexpr unsigned char kOrdinaryValue = 16;  // in an attribute value stands fo
 
 constexpr std::array<unsigned char, 256> classify() {
     std::array<unsigned char, 256> classes{};
-    const auto add = [&classes](std::string_view characters, unsigned char flags) {
-        for (const char c : characters) classes[static_cast<unsigned char>(c)] |= flags;
+    const auto add = [&classes](std::string_view members, unsigned char flags) {
+        for (const char c : members) classes[static_cast<unsigned char>(c)] |= flags;
     };
     for (std::size_t c = 0x20; c < 0x80; ++c) classes[c] = kOrdinaryText | kOrdinaryValue;
     for (const char c : std::string_view("<&]"))

@@ -30,7 +30,7 @@ bool endsInXlsx(const std::string& book) {
 
 std::string lastStep(const std::string& type) { return type.substr(type.rfind('/') + 1); }
 
-std::string folderOf(const std::string& part) { return part.substr(0, part.rfind('/') + 1); }
+std::string folderOfPart(const std::string& part) { return part.substr(0, part.rfind('/') + 1); }
 
 // The name of the part that a relationship of a part in `folder` leads to.
 std::string resolved(const std::string& folder, const std::string& target) {
@@ -109,7 +109,7 @@ class Inspector {
             findings_.kind = FileKind::OtherArchive;
             return;
         }
-        const std::string folder = folderOf(workbook);
+        const std::string folder = folderOfPart(workbook);
         const std::string links = folder + "_rels/" + workbook.substr(folder.size()) + ".rels";
         if (!readRelationships(package_.has(links) ? links : package_.similarTo(links), folder)) {
             findings_.broken.push_back(links);
