@@ -90,31 +90,36 @@ bool isShownBesideDates(Kind kind) {
            kind == Kind::Percent || kind == Kind::FractionBar;
 }
 
-// Collects the patterns between the counts of elapsed times, and the pattern of it all.
+// How counts of elapsed times are translated.
+enum class Counts { AsFields, AsMarks };
+
 class Translation {
   public:
-    explicit Translation(const FormatSection& section) : tokens_(section.tokens) {
+    Translation(const FormatSection& section, Counts counts)
+        : tokens_(section.tokens), marksCounts_(counts == Counts::AsMarks) {
         halfDays_ = std::any_of(tokens_.begin(), tokens_.end(), [](const FormatToken& token) {
             return token.kind == Kind::DayHalf;
         });
         for (std::size_t i = 0; i < tokens_.size(); ++i) translate(i);
-        endPattern();
     }
 
-    std::vector<ElapsedTimePart> takeParts() { return std::move(parts_); }
-    std::string takePattern() { return std::move(whole_); }
+    std::string pattern() const { return pattern_ + quoted(literal_); }
+    ElapsedTimeLayout layout() const {
+        if (pattern_.empty()) return {literal_, false, counts_};
+        return {pattern(), true, counts_};
+    }
 
   private:
     void translate(std::size_t i) {
         const FormatToken& token = tokens_[i];
-        if (elapsedUnit(token.kind))
+        if (marksCounts_ && elapsedUnit(token.kind))
             count(token);
         else if (isDateOrTime(token.kind))
             field(fieldPattern(token, halfDays_));
         else if (isFraction(i))
             field(std::string(token.text.size(), 'S'));
         else if (isShownBesideDates(token.kind))
-            literal_ += token.text;
+            literal(token.text);
     }
 
     // Whether it is the digits behind the point of the seconds.
@@ -131,25 +136,22 @@ class Translation {
         if (!letters.empty()) pattern_ += quoted(std::exchange(literal_, {})) + letters;
     }
 
-    void count(const FormatToken& token) {
-        endPattern();
-        whole_ += fieldPattern(token, halfDays_);
-        parts_.push_back({elapsedUnit(token.kind), token.text.size(), {}});
+    void literal(std::string text) {
+        std::erase(text, ElapsedTimeLayout::kMark);
+        literal_ += text;
     }
 
-    void endPattern() {
-        pattern_ += quoted(std::exchange(literal_, {}));
-        if (pattern_.empty()) return;
-        whole_ += pattern_;
-        parts_.push_back({0, 0, std::exchange(pattern_, {})});
+    void count(const FormatToken& token) {
+        literal_ += ElapsedTimeLayout::kMark;
+        counts_.push_back({elapsedUnit(token.kind), token.text.size()});
     }
 
     const std::vector<FormatToken>& tokens_;
+    bool marksCounts_;
     bool halfDays_ = false;  // hours count to twelve
     std::string literal_;    // since the last field
-    std::string pattern_;    // since the last count
-    std::string whole_;
-    std::vector<ElapsedTimePart> parts_;
+    std::string pattern_;    // up to it
+    std::vector<ElapsedCount> counts_;
 };
 
 }  // namespace
@@ -170,16 +172,16 @@ EXCEL_FORMAT_TYPE dateTimeType(const FormatSection& section) {
 }
 
 std::string toIcuPattern(const FormatSection& section) {
-    return Translation(section).takePattern();
+    return Translation(section, Counts::AsFields).pattern();
 }
 
 std::unique_ptr<IDateTimeVariableFormat> createDateTimeFormat(const FormatSection& section) {
-    Translation translation(section);
-    const std::string pattern = translation.takePattern();
+    const std::string pattern = toIcuPattern(section);
     if (std::none_of(section.tokens.begin(), section.tokens.end(),
                      [](const FormatToken& token) { return elapsedUnit(token.kind) != 0; }))
         return std::make_unique<DateTimeVariableFormat>(pattern);
-    return std::make_unique<ElapsedTimeVariableFormat>(pattern, translation.takeParts());
+    return std::make_unique<ElapsedTimeVariableFormat>(
+        pattern, Translation(section, Counts::AsMarks).layout());
 }
 
 }  // namespace dp

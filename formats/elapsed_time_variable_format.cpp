@@ -1,6 +1,7 @@
 #include "dpxlsx/formats/elapsed_time_variable_format.h"
 
 #include <cmath>
+#include <memory>
 #include <utility>
 
 #include "dpxlsx/formats/number_text.h"
@@ -20,25 +21,25 @@ std::string countText(double count, std::size_t digits) {
 }  // namespace
 
 ElapsedTimeVariableFormat::ElapsedTimeVariableFormat(const std::string& icuPattern,
-                                                     const std::vector<ElapsedTimePart>& parts)
-    : DateTimeVariableFormat(icuPattern) {
-    for (const ElapsedTimePart& part : parts)
-        parts_.push_back(
-            {part.unit, part.digits,
-             part.unit ? nullptr : std::make_unique<DateTimeVariableFormat>(part.pattern)});
-}
+                                                     ElapsedTimeLayout layout)
+    : DateTimeVariableFormat(icuPattern), layout_(std::move(layout)), rest_(layout_.text) {}
 
 IString* ElapsedTimeVariableFormat::FormatValue(double value, bool fullPrecision) const {
     const double milliseconds = std::floor(std::fabs(value) * kMillisecondsOfDay + 0.5);
-    // The patterns get the rounded value, or their minutes could disagree with the counted hours.
+    // The pattern gets the rounded value, or its minutes could disagree with the counted hours.
     const double rounded = milliseconds / kMillisecondsOfDay;
+    std::string rest = layout_.text;
+    if (layout_.isPattern)
+        rest = std::unique_ptr<IString>(rest_.FormatValue(rounded, fullPrecision))->database_str();
+
     std::string text = value < 0 && milliseconds > 0 ? "-" : "";
-    for (const Part& part : parts_) {
-        if (part.format) {
-            const std::unique_ptr<IString> shown(part.format->FormatValue(rounded, fullPrecision));
-            text += shown->database_str();
-        } else {
-            text += countText(std::floor(milliseconds / part.unit), part.digits);
+    auto count = layout_.counts.begin();
+    for (const char c : rest) {
+        if (c != ElapsedTimeLayout::kMark) {
+            text += c;
+        } else if (count != layout_.counts.end()) {
+            text += countText(std::floor(milliseconds / count->unit), count->digits);
+            ++count;
         }
     }
     return new String(std::move(text));

@@ -109,9 +109,10 @@ class CodeParser {
     explicit CodeParser(std::string_view code) : rest_(code) {}
 
     NumberFormatCode run() {
+        constexpr std::size_t kMostSections = 4;
         NumberFormatCode code;
         do code.sections.push_back(section());
-        while (consume(';'));
+        while (code.sections.size() < kMostSections && consume(';'));
         return code;
     }
 

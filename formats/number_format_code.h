@@ -56,7 +56,7 @@ struct FormatSection {
     std::optional<FormatCondition> condition;  // the last one written
 };
 
-// One section at least, possibly empty.
+// One section at least, possibly empty; four at most, what follows them shows nothing.
 struct NumberFormatCode {
     std::vector<FormatSection> sections;
 };

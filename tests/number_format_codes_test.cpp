@@ -17,6 +17,7 @@
 #include "dpxlsx/formats/sectioned_format.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/model/host/i_string.h"
+#include "testkit/allocated_bytes.h"
 #include "tests/paths.h"
 
 namespace dp {
@@ -156,6 +157,7 @@ TEST(NumberFormatCodes, Grammar) {
     const char* const cases[][2] = {
         {"", ""},
         {";;", ";;"},
+        {";;0;;0;0", ";;01;"},
         {"0;\";\"\\;_;*;[;];@", "01;';; ';@1"},
         {"\"open; y", "'open; y'"},
         {"0[$-409; y", "01"},
@@ -202,8 +204,17 @@ TEST(NumberFormatCodes, ElapsedTimes) {
                  {"[h] AM/PM", 0.75, "18 PM"},
                  // Less than half a millisecond below the hour is the hour.
                  {"[h]:mm:ss", 36 / 24.0 - 4e-9, "36:00:00"},
+                 {"[h]'a[mm]\x01\"b\"s", 1.0625, "25'a1530b0"},
                  {"[h]", kNaN, "nan"}};
     for (const auto& c : cases) EXPECT_EQ(shown(c.code, c.value), c.expected) << c.code << ' ' << c.value;
+    // However many fields a format has, it keeps one formatter of ICU.
+    std::string many;
+    for (int i = 0; i < 200; ++i) many += i % 2 ? "[h]d" : "[h]m";
+    const auto format = createVariableFormat(parseNumberFormat(many));
+    shown(*createVariableFormat(parseNumberFormat("[h] d")), 1.5);  // what ICU keeps for all
+    const std::size_t before = testkit::allocatedBytes();
+    shown(*format, 1.5);
+    EXPECT_LT(testkit::allocatedBytes(), before + 1'000'000);
     // Half a millisecond before the hour, counts and patterns must round alike.
     for (int hour = 1; hour < 2000; ++hour) {
         const double value = (hour * 3600000.0 - 0.5) / 86400000;
