@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "dpxlsx/formats/automatic_format.h"
+#include "dpxlsx/formats/beyond_pattern.h"
 #include "dpxlsx/formats/date_time_translation.h"
 #include "dpxlsx/formats/date_time_variable_format.h"
 #include "dpxlsx/formats/number_display.h"
@@ -113,7 +114,7 @@ class SectionedDisplay {
 
 // A format of the class `Base`, for hosts, that renders by sections.
 template <class Base>
-class SectionedFormat final : public Base {
+class SectionedFormat final : public Base, public BeyondPattern {
   public:
     template <class Like>
     SectionedFormat(const Like& first, const NumberFormatCode& code)

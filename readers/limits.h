@@ -45,6 +45,12 @@ inline constexpr std::size_t kTargetSize = 4096;
 // characters; every decimal place of a code is a character of each text rendered with it.
 inline constexpr std::size_t kFormatCodeSize = 1024;
 
+// Bytes of all number-format codes of a workbook that is read by the standard, where each counts as
+// kLeastFormatCode bytes at least; further codes are ignored. Spreadsheet programs have at most
+// 65,490 cell formats.
+inline constexpr std::size_t kFormatCodes = 4 << 20;
+inline constexpr std::size_t kLeastFormatCode = 64;
+
 // --- The texts, while they are copied into the store ---
 
 // Bytes copied per byte unpacked. A shared string counts for every cell that shows it: honest

@@ -2,6 +2,7 @@
 
 #include <cstdio>
 
+#include "dpxlsx/formats/beyond_pattern.h"
 #include "dpxlsx/model/string.h"
 #include "dpxlsx/store/date_time_recognition.h"
 #include "dpxlsx/store/number_recognition.h"
@@ -101,11 +102,15 @@ ExternalDataRecordCell CellContent::toCell() const {
     return cell;
 }
 
-const IVariableFormat& FormatCache::formatOf(const CellContent& cell) {
+const FormatCache::Format& FormatCache::formatOf(const CellContent& cell) {
     if (!recent_ || cell.formatIndex != recentIndex_) {
-        std::unique_ptr<IVariableFormat>& format = formats_[cell.formatIndex];
-        if (!format) format = source_.create(cell);
-        recent_ = format.get();
+        Format& format = formats_[cell.formatIndex];
+        if (!format.made) {
+            format.made = source_.create(cell);
+            format.isForHelper = format.made->GetType() == IVariableFormat::FormatType::DateTime &&
+                                 !dynamic_cast<const BeyondPattern*>(format.made.get());
+        }
+        recent_ = &format;
         recentIndex_ = cell.formatIndex;
     }
     return *recent_;
@@ -123,14 +128,13 @@ double cellToNumber(const CellContent& cell, bool asDateTime, const IString* dat
 
 std::string numericCellToText(const CellContent& cell, const ConversionSettings& settings,
                               FormatCache& formats) {
-    const IVariableFormat& format = formats.formatOf(cell);
+    const FormatCache::Format& format = formats.formatOf(cell);
     if (cell.numValue == settings.missingValue) return std::string(settings.missingValueText);
 
-    const IVariableFormat* shown = &format;
-    if (cell.type == CELL_DATETIME && settings.dateTimeHelper &&
-        format.GetType() == IVariableFormat::FormatType::DateTime) {
+    const IVariableFormat* shown = format.made.get();
+    if (cell.type == CELL_DATETIME && settings.dateTimeHelper && format.isForHelper) {
         settings.dateTimeHelper->SetDateTimeParameters(
-            static_cast<const IDateTimeVariableFormat*>(&format));
+            static_cast<const IDateTimeVariableFormat*>(shown));
         shown = settings.dateTimeHelper;
     }
     const std::unique_ptr<IString> text(shown->FormatValue(cell.numValue, false));

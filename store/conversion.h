@@ -69,16 +69,21 @@ class CellFormats {
 // costs twenty times what the next ones do.
 class FormatCache {
   public:
+    struct Format {
+        std::unique_ptr<IVariableFormat> made;
+        bool isForHelper = false;  // a host's helper shows date-times by its pattern
+    };
+
     explicit FormatCache(const CellFormats& source) : source_(source) {}
 
     // Valid as long as the cache.
-    const IVariableFormat& formatOf(const CellContent& cell);
+    const Format& formatOf(const CellContent& cell);
 
   private:
     const CellFormats& source_;
-    std::map<std::int32_t, std::unique_ptr<IVariableFormat>> formats_;
+    std::map<std::int32_t, Format> formats_;
     std::int32_t recentIndex_ = 0;
-    const IVariableFormat* recent_ = nullptr;
+    const Format* recent_ = nullptr;
 };
 
 // `value` if it is in the host's range; otherwise the missing value, with `converted` set.

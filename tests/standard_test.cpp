@@ -3,6 +3,7 @@
 #include <regex>
 
 #include "dpxlsx/model/host/entry_points.h"
+#include "dpxlsx/readers/limits.h"
 #include "dpxlsx/readers/standard/cell_position.h"
 #include "dpxlsx/readers/standard/cell_values.h"
 #include "dpxlsx/readers/standard/part_name.h"
@@ -149,6 +150,62 @@ TEST_F(Standard, NumbersAmongTexts) {
     provider.CloseFile();
 }
 
+// A host's helper shows date-times by their pattern, but for formats that show more than it says.
+TEST_F(Standard, DatesAmongTexts) {
+    const char* const cases[][2] = {{"yyyy", "by helper yyyy 2.500000"},
+                                    {"h:mm;@", "by helper H:mm 2.500000"},
+                                    {"[h]:mm", "60:00"},
+                                    {"[mm]:ss", "3600:00"},
+                                    {"[h]:mm;-[h]:mm", "60:00"},
+                                    {"h:mm;[h]:mm", "12:00"},
+                                    {"[&lt;1]h:mm;dd.mm.yyyy", "02.01.1900"}};
+    std::string rows = "<row/><row><c t='str'><v>a</v></c></row>";
+    std::string codes;
+    std::string styles = "<xf/>";
+    std::string expected = "'a'";
+    for (std::size_t i = 0; i < std::size(cases); ++i) {
+        const std::string style = std::to_string(i + 1);
+        const std::string id = std::to_string(200 + i);
+        rows += "<row><c s='" + style + "'><v>2.5</v></c></row>";
+        codes += "<numFmt numFmtId='" + id + "' formatCode='" + cases[i][0] + "'/>";
+        styles += "<xf numFmtId='" + id + "'/>";
+        expected += " '" + std::string(cases[i][1]) + "'";
+    }
+    // A duration without a format of its own
+    rows += "<row><c t='d'><v>PT36H</v></c></row>";
+    expected += " '36:00:00'";
+    const auto package = PackageBuilder::of({rows}).set(
+        "xl/styles.xml", "<styleSheet><numFmts>" + codes + "</numFmts><cellXfs>" + styles + "</cellXfs></styleSheet>");
+    const testkit::KeptSettings kept;
+    RecordingProvider provider;
+    provider.SetDateTimeVariableFormatHelper(new dp::HandHelper);
+    EXPECT_EQ(open(provider, package, kStandard), 0);
+    provider.GetWorksheetPrimeKeys();
+    EXPECT_EQ(dp::factsOf(provider, 1).rows(), expected);
+    provider.CloseFile();
+}
+
+// Codes beyond the limit do not count; equal codes are one format.
+TEST_F(Standard, ManyNumberFormats) {
+    constexpr std::size_t kFitting = dp::kFormatCodes / dp::kFormatCodeSize;
+    std::string codes = "<numFmt numFmtId='1' formatCode='0;0;0'/>";
+    for (std::size_t i = 2; i <= kFitting + 1; ++i) {
+        const std::string name = std::to_string(i / 2);
+        codes += "<numFmt numFmtId='" + std::to_string(i) + "' formatCode='&quot;" + name +
+                 std::string(dp::kFormatCodeSize - name.size() - 3, 'x') + "&quot;y'/>";
+    }
+    std::string styles;
+    std::string rows;
+    for (const std::size_t id : {std::size_t{1}, std::size_t{2}, std::size_t{3}, kFitting, kFitting + 1}) {
+        rows += "<c s='" + std::to_string(std::count(rows.begin(), rows.end(), 'c') / 2) + "'><v>1</v></c>";
+        styles += "<xf numFmtId='" + std::to_string(id) + "'/>";
+    }
+    const auto package = PackageBuilder::of({"<row>" + rows + "</row>"})
+                             .set("xl/styles.xml", "<styleSheet><numFmts>" + codes + "</numFmts><cellXfs>" + styles +
+                                                       "</cellXfs></styleSheet>");
+    EXPECT_EQ(read(package, kStandard), "0,0=1#0 0,1=d1#1 0,2=d1#1 0,3=d1#2 0,4=1");
+}
+
 TEST(StandardTexts, EndAtWholeCharacters) {
     struct Case {
         const char* name;
@@ -202,6 +259,7 @@ TEST(StandardValues, IsoDateTimes) {
                           {"2024-01-05T06:00", 45296.25, both},
                           {"2024-01-05 06:00:00.0Z", 45296.25, both},
                           {"2024-01-05T06:00:00+14:00", 45296.25, both},
+                          {"06:30-13:59", 6.5 / 24, time},
                           {"2024-01-05T24:00:00", 45297, both},
                           {"1899-12-30T18:00:00", 0.75, both},
                           {"18:00", 0.75, time},
@@ -219,6 +277,9 @@ TEST(StandardValues, IsoDateTimes) {
                           {"2024-01-05T25:00", -1, date},
                           {"2024-01-05T06:60", -1, date},
                           {"2024-01-05T06:00x", -1, date},
+                          {"2024-01-05+14:01", -1, date},
+                          {"06:30-15:00", -1, date},
+                          {"06:30+01:60", -1, date},
                           {"T", -1, date},
                           {"P", -1, date},
                           {"P1M", -1, date},

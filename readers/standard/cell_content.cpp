@@ -62,7 +62,7 @@ ExternalDataRecordCell dateTimeCell(const std::string& written, int style,
     int formatIndex = references.formats.ofCell(style);
     const NumberFormats::Format* format = references.formats.at(formatIndex);
     if (!format || format->type == EXCEL_FORMAT_NONE)
-        formatIndex = references.formats.ofDateTime(value->type);
+        formatIndex = references.formats.ofDateTime(value->type, value->isDuration);
     return number(CELL_DATETIME, value->dayNumber, formatIndex);
 }
 

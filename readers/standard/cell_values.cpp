@@ -102,7 +102,9 @@ bool takeZone(Scanner& scanner) {
     int minutes = 0;
     if (scanner.take('Z')) return true;
     if (!scanner.takeOneOf("+-")) return true;
-    return scanner.takeField(2, hours) && scanner.take(':') && scanner.takeField(2, minutes);
+    constexpr int kMost = 14 * 60;  // minutes, as in XML Schema
+    return scanner.takeField(2, hours) && scanner.take(':') && scanner.takeField(2, minutes) &&
+           minutes < 60 && hours * 60 + minutes <= kMost;
 }
 
 // The part of a day; 24:00 is its end.
@@ -185,7 +187,7 @@ std::optional<IsoDateTime> parseIsoDateTime(std::string_view text) {
     IsoDateTime result{0.0, EXCEL_FORMAT_TIME};
     if (scanner.take('P')) {
         const std::optional<double> days = takeDuration(scanner);
-        return days ? std::optional(IsoDateTime{*days, EXCEL_FORMAT_TIME}) : std::nullopt;
+        return days ? std::optional(IsoDateTime{*days, EXCEL_FORMAT_TIME, true}) : std::nullopt;
     }
     if (value.find('-') == 4) {
         const std::optional<double> date = takeDate(scanner);

@@ -21,6 +21,7 @@ std::optional<int> parseIndex(std::string_view text);
 struct IsoDateTime {
     double dayNumber;        // serial, of the 1900 system
     EXCEL_FORMAT_TYPE type;  // what the text gives: EXCEL_FORMAT_DATE, _TIME or _DATETIME
+    bool isDuration = false;
 };
 
 // "2024-01-05", "06:30" or both with "T" between them; a time may begin with the "T" and have

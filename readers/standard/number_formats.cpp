@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "dpxlsx/formats/automatic_format.h"
+#include "dpxlsx/formats/number_format_code.h"
 #include "dpxlsx/formats/sectioned_format.h"
 #include "dpxlsx/formats/standard_formats.h"
 #include "dpxlsx/readers/limits.h"
@@ -18,6 +19,7 @@ namespace {
 constexpr int kDate = 14;
 constexpr int kTime = 21;
 constexpr int kDateTime = 22;
+constexpr int kElapsedTime = 46;
 
 bool showsElapsedTime(const NumberFormatCode& code) {
     using Kind = FormatToken::Kind;
@@ -43,8 +45,7 @@ void NumberFormats::read(const std::string& path) {
             const std::optional<int> id = idOf(walker);
             if (list == "cellXfs" && entry == "xf") ids.push_back(id.value_or(0));
             if (list != "numFmts" || entry != "numFmt" || !id) return;
-            std::string code = walker.attribute("formatCode").value_or("");
-            if (!code.empty() && code.size() <= kFormatCodeSize) codeById_[*id] = std::move(code);
+            addCode(*id, walker.attribute("formatCode").value_or(""));
         });
     });
     walker.finish();
@@ -56,8 +57,9 @@ int NumberFormats::ofCell(int style) const {
     return style >= 0 && position < ofCells_.size() ? ofCells_[position] : -1;
 }
 
-int NumberFormats::ofDateTime(EXCEL_FORMAT_TYPE type) {
-    return indexOf(type == EXCEL_FORMAT_DATE   ? kDate
+int NumberFormats::ofDateTime(EXCEL_FORMAT_TYPE type, bool elapsed) {
+    return indexOf(elapsed                     ? kElapsedTime
+                   : type == EXCEL_FORMAT_DATE ? kDate
                    : type == EXCEL_FORMAT_TIME ? kTime
                                                : kDateTime);
 }
@@ -68,20 +70,25 @@ const NumberFormats::Format* NumberFormats::at(int index) const {
 }
 
 std::unique_ptr<IVariableFormat> NumberFormats::create(int index) const {
-    if (const Format* format = at(index)) return createVariableFormat(format->code);
+    if (const Format* format = at(index))
+        return createVariableFormat(parseNumberFormat(format->code));
     return createAutomaticFormat();
+}
+
+void NumberFormats::addCode(int id, std::string code) {
+    if (code.empty() || code.size() > kFormatCodeSize) return;
+    codesSize_ += std::max(code.size(), kLeastFormatCode);
+    if (codesSize_ <= kFormatCodes) codeById_[id] = std::move(code);
 }
 
 int NumberFormats::indexOf(int id) {
     const auto own = codeById_.find(id);
     const std::string_view text = own == codeById_.end() ? builtInFormatCode(id) : own->second;
     if (text == "General") return -1;  // as without a format
-    const auto [place, isNew] = indexById_.try_emplace(id, static_cast<int>(formats_.size()));
+    const auto [place, isNew] = indexByCode_.try_emplace(text, static_cast<int>(formats_.size()));
     if (isNew) {
-        NumberFormatCode code = parseNumberFormat(text);
-        const EXCEL_FORMAT_TYPE type = formatType(code);
-        const bool elapsed = showsElapsedTime(code);
-        formats_.push_back({std::move(code), type, elapsed});
+        const NumberFormatCode code = parseNumberFormat(text);
+        formats_.push_back({text, formatType(code), showsElapsedTime(code)});
     }
     return place->second;
 }
