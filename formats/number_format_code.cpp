@@ -208,10 +208,7 @@ class CodeParser {
     void add(Kind kind, std::string_view text) { tokens_.push_back({kind, lowered(text)}); }
 
     void literal(std::string_view text) {
-        if (text.empty()) return;
-        if (tokens_.empty() || tokens_.back().kind != Kind::Literal)
-            tokens_.push_back({Kind::Literal, {}});
-        tokens_.back().text += text;
+        if (!text.empty()) tokens_.push_back({Kind::Literal, std::string(text)});
     }
 
     bool consume(char c) {

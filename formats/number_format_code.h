@@ -35,7 +35,8 @@ struct FormatToken {
     };
 
     Kind kind;
-    // What a literal shows; otherwise as in the code, letters in lower case and without brackets.
+    // What a literal shows, each quotation and each character being one; otherwise as in the code,
+    // letters in lower case and without brackets.
     std::string text;
 };
 

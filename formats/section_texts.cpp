@@ -29,24 +29,59 @@ std::string joined(Tokens::const_iterator begin, Tokens::const_iterator end) {
     return text;
 }
 
+bool isOfWord(char c) {
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c & '\x80') != 0;
+}
+
+bool hasMinus(const std::string& text) {
+    if (text.find("\u2212") != text.npos) return true;
+    for (std::size_t i = text.find('-'); i != text.npos; i = text.find('-', i + 1)) {
+        const bool isHyphen =
+            i > 0 && i + 1 < text.size() && isOfWord(text[i - 1]) && isOfWord(text[i + 1]);
+        if (!isHyphen) return true;
+    }
+    return false;
+}
+
 void trimLeft(std::string& text) { text.erase(0, text.find_first_not_of(' ')); }
 
 void trimRight(std::string& text) { text.resize(text.find_last_not_of(' ') + 1); }
 
-// With the spaces between them and the number.
-SectionTexts textsAround(const FormatSection& section) {
+// The literals around what the section shows.
+struct Literals {
+    Tokens before;
+    Tokens behind;
+};
+
+Literals literalsAround(const FormatSection& section) {
     const Tokens& tokens = section.tokens;
     const auto first = firstShown(tokens);
-    SectionTexts texts{joined(tokens.begin(), first), {}};
-    if (first != tokens.end()) texts.behind = joined(behindLastShown(tokens), tokens.end());
+    Literals literals{{tokens.begin(), first}, {}};
+    if (first != tokens.end()) literals.behind.assign(behindLastShown(tokens), tokens.end());
+    return literals;
+}
+
+// With the spaces between them and the number.
+SectionTexts textsOf(const Literals& literals) {
+    SectionTexts texts{joined(literals.before.begin(), literals.before.end()),
+                       joined(literals.behind.begin(), literals.behind.end())};
     trimLeft(texts.before);
     trimRight(texts.behind);
     return texts;
 }
 
-void remove(std::string& text, const std::string& unit) {
-    if (const std::size_t found = text.find(unit); found != text.npos)
-        text.erase(found, unit.size());
+// Whole literals that make up the unit together.
+void remove(Tokens& literals, const std::string& unit) {
+    if (unit.empty()) return;
+    for (auto begin = literals.begin(); begin != literals.end(); ++begin) {
+        std::string text;
+        for (auto end = begin; end != literals.end() && text.size() < unit.size();) {
+            text += (end++)->text;
+            if (text != unit) continue;
+            literals.erase(begin, end);
+            return;
+        }
+    }
 }
 
 }  // namespace
@@ -64,17 +99,23 @@ bool hasTextWithin(const FormatSection& section) {
            });
 }
 
+bool showMinus(const SectionTexts& texts) {
+    const auto has = [](const std::string& text, char c) { return text.find(c) != text.npos; };
+    return hasMinus(texts.before) || hasMinus(texts.behind) ||
+           (has(texts.before, '(') && has(texts.behind, ')'));
+}
+
 SectionTexts textsOf(const NumberFormatCode& code, std::size_t position) {
     const FormatSection& first = code.sections.front();
     const FormatSection& section = code.sections[position];
-    SectionTexts texts = textsAround(section);
-    if (position > 0 && !isTextAlone(first)) {
-        const SectionTexts units = textsAround(first);
-        remove(texts.before, units.before);
-        remove(texts.behind, units.behind);
+    Literals literals = literalsAround(section);
+    if (position > 0 && !isTextAlone(first) && !isTextAlone(section)) {
+        const SectionTexts units = textsOf(literalsAround(first));
+        remove(literals.before, units.before);
+        remove(literals.behind, units.behind);
     }
-    trimLeft(texts.before);
-    trimRight(isTextAlone(section) ? texts.before : texts.behind);
+    SectionTexts texts = textsOf(literals);
+    if (isTextAlone(section)) trimRight(texts.before);
     return texts;
 }
 

@@ -21,8 +21,13 @@ bool isTextAlone(const FormatSection& section);
 // Whether literals other than spaces stand among the digits: "(000) 000-0000".
 bool hasTextWithin(const FormatSection& section);
 
+// Whether the texts say that the number between them is negative: by parentheses around it or by a
+// minus sign, which is not the hyphen of a word.
+bool showMinus(const SectionTexts& texts);
+
 // The texts of the section `position`; of one of nothing but literals, all are before. Texts around
-// the values of the first section are units ("0.0 kg") and removed from the others.
+// the values of the first section are units ("0.0 kg") and removed from those around the values of
+// the others, but never from within a text.
 SectionTexts textsOf(const NumberFormatCode& code, std::size_t position);
 
 }  // namespace dp

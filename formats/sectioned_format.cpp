@@ -34,6 +34,7 @@ struct Display {
     Sign sign = Sign::OfFormat;
     SectionTexts texts = {};
     bool zeroHasDigits = true;
+    bool textsAreForZero = false;  // they would give other numbers a wrong sign
 };
 
 bool isDateTime(const FormatSection& section) { return dateTimeType(section) != EXCEL_FORMAT_NONE; }
@@ -49,7 +50,8 @@ std::string shown(const IVariableFormat& format, double value, bool fullPrecisio
 }
 
 std::string shown(const Display& display, double value, bool fullPrecision) {
-    const auto& [format, sign, texts, zeroHasDigits] = display;
+    const auto& [format, sign, texts, zeroHasDigits, textsAreForZero] = display;
+    if (textsAreForZero && value != 0) return shown(*format, value, fullPrecision);
     std::string text = sign == Sign::BeforeTexts && value < 0 ? "-" : "";
     text += texts.before;
     if (format && (value != 0 || zeroHasDigits))
@@ -95,14 +97,17 @@ class SectionedDisplay {
         if (isDateTime(section) && !isDateTime(code.sections.front()))
             return {createAutomaticFormat()};
         Display display{createFormat(section)};
-        if (position == 0 || texts.empty()) return display;
-        const bool replacesMinus = choice_.isForNegativesOnly(position);
+        if (position == 0) return display;
+        const bool isForNegatives = choice_.isForNegativesOnly(position);
+        const bool hasMinus = showMinus(texts);
+        const Sign sign = isForNegatives && hasMinus ? Sign::None : Sign::BeforeTexts;
         if (isDateTime(section)) {  // its format shows the texts
-            if (replacesMinus) display.sign = Sign::None;
-        } else if (isShownAsMeant(section)) {
-            display.sign = replacesMinus ? Sign::None : Sign::BeforeTexts;
+            if (isForNegatives) display.sign = sign;
+        } else if (!texts.empty() && isShownAsMeant(section)) {
+            display.sign = sign;
             display.texts = std::move(texts);
             display.zeroHasDigits = hasZeroDigit(section);
+            display.textsAreForZero = hasMinus && !isForNegatives;
         }
         return display;
     }

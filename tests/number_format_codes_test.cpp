@@ -115,7 +115,7 @@ TEST(NumberFormatCodes, SectionedFormatsForHosts) {
     }
     const auto dates = createVariableFormat(parseNumberFormat("yyyy-mm;[Red]\"before \"0"));
     EXPECT_STREQ(dynamic_cast<IDateTimeVariableFormat&>(*dates).GetFormatString()->database_str(), "yyyy-MM");
-    EXPECT_EQ(shown(*dates, -2), "before 2");
+    EXPECT_EQ(shown(*dates, -2), "-before 2");
 }
 
 TEST(NumberFormatCodes, SectionsAndTheirTexts) {
@@ -129,11 +129,35 @@ TEST(NumberFormatCodes, SectionsAndTheirTexts) {
                  {"h:mm;-h:mm", -0.25, "-6:00"},
                  {"[h]:mm;([h]:mm)", -1.5, "(36:00)"},
                  {"[h]:mm;[Red][h]:mm", -1.5, "-36:00"},
+                 {"h:mm;[Red]h:mm", -0.25, "-6:00"},
+                 {"h:mm;\"below \"h:mm", -0.25, "-below 6:00"},
                  {"[>1]yyyy;[h]\"x\"", -1.5, "-36x"},
                  // With the minus, for the section shows zero or some positive numbers too
                  {"[>0]0;\"~\"0", -5, "-~5"},
                  {"[>=1]0;[=0]0;\"~\"0", -5, "-~5"},
-                 {"\"x\";\"x\"0", -5, "x5"},
+                 {"\"x\";\"x\"0", -5, "-x5"},
+                 // In a section for negative numbers alone, without a minus of its own
+                 {"0.0 \"kg\";0.0\"kg\"", -5, "-5.0kg"},
+                 {"0;[Red]0", -5, "-5"},
+                 {"$0;[$€-407]0", -5, "-€5"},
+                 {"0;\"non-cash \"0", -5, "-non-cash 5"},
+                 {"0;\"(\"0", -5, "-(5"},
+                 {"0;\"−\"0", -5, "−5"},
+                 {"0;\"a-\"0", -5, "a-5"},
+                 // 5 and -5 do not look alike.
+                 {"-0;+0", 5, "5"},
+                 {"-0;+0", -5, "-+5"},
+                 {"-0;-0", -5, "-5"},
+                 {"(0);(0)", -5, "-5"},
+                 {"-h;-h", -0.25, "--6"},
+                 {"[<0]0;-0", 5, "5"},
+                 {"[>0]0;-0", -5, "-5"},
+                 {"[>9]0;(0)", 5, "5"},
+                 // Units are texts of their own.
+                 {"\"a\"0;-0;\"n/a\"", 0, "n/a"},
+                 {"\"a\"0;-0;\"a\"", 0, "a"},
+                 {"0\"d\";-0\"bad\"", -5, "-5bad"},
+                 {"0\" kg\";-0\\ k\\g\\!", -5, "-5!"},
                  {"0;(000) 000-000", -5, "-5"},
                  {"0;(# ##0)", -5, "(5)"}};
     for (const auto& c : cases) EXPECT_EQ(shown(c.code, c.value), c.expected) << c.code;
@@ -158,23 +182,23 @@ TEST(NumberFormatCodes, Grammar) {
         {"", ""},
         {";;", ";;"},
         {";;0;;0;0", ";;01;"},
-        {"0;\";\"\\;_;*;[;];@", "01;';; ';@1"},
+        {"0;\";\"\\;_;*;[;];@", "01;';'';'' ';@1"},
         {"\"open; y", "'open; y'"},
         {"0[$-409; y", "01"},
         {"\\", ""},
         {"d_", "d1' '"},
         {"d*", "d1"},
-        {"\\年_年y*年m", "'年 'y1M1"},
+        {"\\年_年y*年m", "'年'' 'y1M1"},
         {"[$kr-41D][$-x][$][][q]", "'kr'"},
         {"[HhH][mM][s][hm][ h]", "H3N2S1"},
-        {"xGENERAL l", "'x'*7' l'"},
-        {"AM/PMam/pm上午/下午A/p A/M", "a5a5a13a3' A/'M1"},
+        {"xGENERAL l", "'x'*7' ''l'"},
+        {"AM/PMam/pm上午/下午A/p A/M", "a5a5a13a3' ''A''/'M1"},
         {"#?0,0.0%", "03,101.101%1"},
         {"0E+0e-0 E+", "01E201E201' 'y1'+'"},
-        {"# ?/8 /", "01' '01/1'8 /'"},
+        {"# ?/8 /", "01' '01/1'8'' ''/'"},
         {"B2yb1bBB", "y1y3"},
         {"h m;m s", "h1' 'm1;m1' 's1"},
-        {"hmm[$-409]\"x\":ssmmm", "h1m2'x:'s2M3"},
+        {"hmm[$-409]\"x\":ssmmm", "h1m2'x'':'s2M3"},
     };
     for (const auto& [code, expected] : cases) EXPECT_EQ(outline(code), expected) << code;
 }

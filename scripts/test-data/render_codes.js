@@ -179,7 +179,7 @@ const sectioned = [
     ['"$"#,##0.00_);[Red]\\("$"#,##0.00\\)', '0.00;(0.00)'], ['"$"#,##0;-"$"#,##0', '0;-0'],
     ['#,##0.00\\ "€";[Red]\\-#,##0.00\\ "€"', '0.00;-0.00'], ['[$€-2]\\ #,##0.00;\\-[$€-2]\\ #,##0.00', '0.00;-0.00'],
     ['_(* #,##0.00_);_(* \\(#,##0.00\\);_(* "-"??_);_(@_)', '0.00;(0.00);"-"'],
-    ['_("$"* #,##0_);_("$"* \\(#,##0\\);_("$"* "-"_);_(@_)', '0;(0);"-"'],
+    ['_("$"* #,##0_);_("$"* \\(#,##0\\);_("$"* "-"_);_(@_)', '0;(0);"$-"'],
     ['_-* #,##0.00\\ "zł"_-;\\-* #,##0.00\\ "zł"_-;_-* "-"??\\ "zł"_-;_-@_-', '0.00;-0.00;"-"'],
     ['0.0" kg";-0.0" kg"', '0.0;-0.0'], ['0.0" kg";0.0" kg"', '0.0'], ['0.00 %;-0.00 %', '0.00%;-0.00%'],
     ['"$"0.0_);("$"0.0)', '0.0;(0.0)'], ['0.0" m"_);(0.0" m")', '0.0;(0.0)'], ['0.0;000-000', '0.0;-0'],
@@ -198,13 +198,18 @@ const sectioned = [
 ];
 
 // For these codes the one that shows the value, where programs disagree, hide it or lose its sign.
-const dropped = 'the minus is left out only for a text in a section for negative numbers alone';
+const dropped = 'the minus is left out only in a section for negative numbers alone that shows one of its own';
 const chosen = [
     {
         codes: ['General;(General)', '0.0E+00;-0.0E+00', '0.00E+00;(0.00E+00)', '0.00;-0.0E+00', 'General;-General;"nil"'],
         why: 'SheetJS has no sections for General and shows exponents with a minus of their own',
     },
     {codes: ['0.0;0.0', '0.0;[Red]0.0', '"above";0.0'], code: (x, code) => (x < 0 ? '0.0' : code), why: dropped},
+    {
+        codes: ['0.0;"minus "0.0', '[>0]0.0;[<0]"minus "0.0;"zero"'],
+        code: (x, code) => (x < 0 ? '0.0;-"minus "0.0' : code), why: dropped,
+    },
+    {codes: ['0.0;0.0" below"'], code: (x, code) => (x < 0 ? '0.0" below"' : code), why: dropped},
     {
         codes: ['0.0;', '0.0;;', ';-0.0', ';;0.0', '0;-0;;@', '0.0;-0.0;#'],
         code: (x, code) => (ssf(code, x) === '' ? 'General' : code),
