@@ -118,6 +118,19 @@ PackageBuilder manyStyles(unsigned count) {
                                   repeat(count, style) + "</cellXfs></styleSheet>");
 }
 
+// Number formats of as many sections as a code can have, which no cell uses.
+PackageBuilder manySections(unsigned count) {
+    const std::string sections(dp::kFormatCodeSize, ';');
+    const auto code = [&](const std::string& i) {
+        return "<numFmt numFmtId='" + i + "' formatCode='" + sections + "'/>";
+    };
+    const auto style = [](const std::string& i) { return "<xf numFmtId='" + i + "'/>"; };
+    return PackageBuilder::of({kNamedValue})
+        .set("xl/styles.xml", "<styleSheet><numFmts>" + repeat(count, code) +
+                                  "</numFmts><cellXfs>" + repeat(count, style) +
+                                  "</cellXfs></styleSheet>");
+}
+
 // A text column of numbers, whose format has as many decimals as a code can have.
 PackageBuilder longFormat(unsigned rows) {
     const auto cell = [](const std::string& i) {
@@ -187,6 +200,7 @@ constexpr Case kCases[] = {
     {"10,000 relationships and sheets", manyRelationships, 10000, 2, one},
     {"the same by the standard", manyRelationships, 10000, 2, one, ReadingRules::Standard},
     {"65,000 styles", manyStyles, 65000, 2, butFirst},
+    {"20,000 formats of 1,024 sections", manySections, 20000, 2, one, ReadingRules::Standard},
     {"100,000 strings", manyStrings, 100000, 2, butFirst},
     {"1,000 decimals in 100,000 cells", longFormat, 100000, 2, andOne},
     {"10,000 bytes in 5,000 cells", longText, 5000, 2, butFirst},
