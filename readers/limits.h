@@ -51,6 +51,11 @@ inline constexpr std::size_t kFormatCodeSize = 1024;
 inline constexpr std::size_t kFormatCodes = 4 << 20;
 inline constexpr std::size_t kLeastFormatCode = 64;
 
+// Different number formats of its own in such a workbook; cells in further ones have no format. A
+// column of texts keeps a formatter of ICU, some 55 KB, for each date format. Spreadsheet programs
+// have about 250.
+inline constexpr std::size_t kNumberFormats = 4096;
+
 // --- The texts, while they are copied into the store ---
 
 // Bytes copied per byte unpacked. A shared string counts for every cell that shows it: honest

@@ -206,6 +206,25 @@ TEST_F(Standard, ManyNumberFormats) {
     EXPECT_EQ(read(package, kStandard), "0,0=1#0 0,1=d1#1 0,2=d1#1 0,3=d1#2 0,4=1");
 }
 
+// Formats beyond the limit do not count, unless they are built in.
+TEST_F(Standard, ManyDifferentNumberFormats) {
+    std::string codes;
+    std::string styles;
+    for (std::size_t i = 0; i <= dp::kNumberFormats; ++i) {
+        const std::string id = std::to_string(1000 + i);
+        codes += "<numFmt numFmtId='" + id + "' formatCode='y&quot;" + id + "&quot;'/>";
+        styles += "<xf numFmtId='" + id + "'/>";
+    }
+    styles += "<xf numFmtId='1000'/><xf numFmtId='14'/>";
+    std::string cells;
+    for (std::size_t style = dp::kNumberFormats - 1; style < dp::kNumberFormats + 3; ++style)
+        cells += "<c s='" + std::to_string(style) + "'><v>1</v></c>";
+    const auto package = PackageBuilder::of({"<row>" + cells + "</row>"})
+                             .set("xl/styles.xml", "<styleSheet><numFmts>" + codes + "</numFmts><cellXfs>" + styles +
+                                                       "</cellXfs></styleSheet>");
+    EXPECT_EQ(read(package, kStandard), "0,0=d1#4095 0,1=1 0,2=d1#0 0,3=d1#4096");
+}
+
 TEST(StandardTexts, EndAtWholeCharacters) {
     struct Case {
         const char* name;

@@ -85,6 +85,8 @@ int NumberFormats::indexOf(int id) {
     const auto own = codeById_.find(id);
     const std::string_view text = own == codeById_.end() ? builtInFormatCode(id) : own->second;
     if (text == "General") return -1;  // as without a format
+    const bool isOwn = own != codeById_.end();
+    if (isOwn && formats_.size() >= kNumberFormats && !indexByCode_.contains(text)) return -1;
     const auto [place, isNew] = indexByCode_.try_emplace(text, static_cast<int>(formats_.size()));
     if (isNew) {
         const NumberFormatCode code = parseNumberFormat(text);
