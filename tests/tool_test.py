@@ -452,6 +452,25 @@ class ToolTest(unittest.TestCase):
         column = json.loads(self.run_tool(book, "--json", "--standard"))["worksheets"][0]["columns"][0]
         self.assertEqual((column["values"], column["convertedMissing"], self.notes), ([1, None], 0, []))
 
+    def test_what_no_option_keeps_is_to_be_corrected(self):
+        book = self.book(rows("<c r='A2'><v>1</v></c>", "<c r='A3'><v>1x</v></c>",
+                              "<c r='A4' t='b'><v>yes</v></c>", "<c r='A5' t='d'><v>2024-02-30</v></c>",
+                              "<c r='A6' t='str'><v>n/a</v></c>"))
+        unreadable = r": 3 cells are missing because .*: 3 in My Data!A \(.*\); to keep it, correct them in the workbook$"
+        kept = ": 1 cell became missing on conversion: .*--type 'My Data!A=text'$"
+        for options, wanted in (([], [kept]), (["--standard"], [kept, unreadable]),
+                                (["--standard", "--type", "A=text"], [])):
+            with self.subTest(options):
+                self.run_tool(book, *options)
+                notes = [note for note in self.notes if "to keep" in note]
+                self.assertEqual(len(notes), len(wanted), notes)
+                for note, text in zip(notes, wanted):
+                    self.assertRegex(note, text)
+        traits = json.loads(self.run_tool(book, "--explain", "--json", "--standard"))["traits"]
+        advice = {t["trait"]: t["advice"] for t in traits}
+        self.assertEqual(advice["unreadable-cells"], "to keep the content, correct it in the workbook")
+        self.assertIn("My Data!A=text", advice["lost-on-conversion"])
+
     def test_worksheet_names_are_cleaned_on_demand(self):
         book = self.book(changed(WORKBOOK, "My Data", "a?b:c"))
         for options, wanted in (([], "a?b:c"), (["--clean-sheet-names"], "a_b_c")):

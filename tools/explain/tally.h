@@ -35,8 +35,9 @@ class Tally {
 
 // What an import lost of the columns that it loaded.
 struct Lost {
-    Tally cells;     // cells that became missing because they did not fit the kind of their column
-    Tally cutTexts;  // texts and names of columns beyond the limit of --max-text
+    Tally cells;  // cells that became missing because they did not fit the kind of their column
+    Tally unreadable;  // cells whose content is not what their type says, when told from the others
+    Tally cutTexts;    // texts and names of columns beyond the limit of --max-text
     size_t longest = 0;  // of those, in bytes
     Tally shown;  // numbers and dates in columns of texts, whose displayed form shows only a part
 };

@@ -338,6 +338,17 @@ Found lostCells(const Findings& findings) {
                    places, cure);
 }
 
+Found unreadableCells(const Findings& findings) {
+    const Tally& cells = findings.lost.unreadable;
+    if (cells.empty()) return std::nullopt;
+    return located(
+        {"unreadable-cells",
+         counted(cells.total(), "cell") + (cells.total() == 1 ? " holds" : " hold") +
+             " something else than the type of the cell says: " + cells.text(cells.columns()),
+         "a missing value arrives", "to keep the content, correct it in the workbook"},
+        placesOf(cells));
+}
+
 Found longTexts(const Findings& findings) {
     const Tally& texts = findings.lost.cutTexts;
     if (texts.empty()) return std::nullopt;
@@ -412,8 +423,8 @@ std::vector<Trait> underRules(std::vector<Trait> traits, bool standard) {
 
 std::vector<Trait> traitsOf(const Findings& findings, const StyleAnswers& answers) {
     std::vector<Trait> traits = quickTraitsOf(findings);
-    addAll(traits, findings, noStyleSheet, movedParts, lostCells, longTexts, shownInTexts,
-           kFormulas, kNumbersAsNames);
+    addAll(traits, findings, noStyleSheet, movedParts, lostCells, unreadableCells, longTexts,
+           shownInTexts, kFormulas, kNumbersAsNames);
     if (!findings.stylesPrefixed) {  // otherwise the prefix explains what happens to the formats
         for (Trait& trait : misjudgedFormats(findings, answers)) add(traits, std::move(trait));
         for (const auto trait : {mixedDates, defaultDateStyle})

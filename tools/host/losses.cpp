@@ -55,6 +55,15 @@ size_t lostBesideNumbers(IDataProvider& provider, const Column& column, const Op
     return static_cast<size_t>(unmarked.convertedMissing());
 }
 
+// How many of the lost cells have no text either: by the standard, content that is not what the
+// cell's type says is missing in every kind of column.
+size_t unreadableCells(IDataProvider& provider, const Column& column, const Options& options,
+                       size_t lost) {
+    if (lost == 0 || column.kind() == Kind::Text) return 0;
+    const std::optional<Column> texts = loadedAsTexts(provider, column, options.settings.preview);
+    return texts ? lost - std::min(lost, lostRows(column, *texts, {})) : 0;
+}
+
 // The number that a displayed text shows; none for dates and other texts.
 std::optional<double> readBack(std::string text, char decimal) {
     std::replace(text.begin(), text.end(), decimal, '.');
@@ -106,7 +115,10 @@ void Losses::noteCells(IDataProvider& provider, const std::string& place, const 
     } else if (count > 0 && (settings.missingNumber || settings.range)) {
         count = lostBesideNumbers(provider, column, options_);
     }
-    if (count > 0) lost_.cells.add({place, column.name(), count});
+    const size_t unreadable =
+        options_.standard ? unreadableCells(provider, column, options_, count) : 0;
+    if (unreadable > 0) lost_.unreadable.add({place, column.name(), unreadable});
+    if (count > unreadable) lost_.cells.add({place, column.name(), count - unreadable});
 }
 
 void Losses::noteTexts(IDataProvider& provider, const std::string& place, const Column& column) {
@@ -156,6 +168,16 @@ std::string Losses::cellsNote() const {
            " became missing on conversion: " + cells.text(kColumnsInNotes) +
            "; to keep the content as displayed: " + cells.textTypes(kColumnsInNotes) +
            (all ? "" : "; --explain names all columns");
+}
+
+std::string Losses::unreadableNote() const {
+    const Tally& cells = lost_.unreadable;
+    if (cells.empty()) return {};
+    const bool one = cells.total() == 1;
+    return options_.book + ": " + counted(cells.total(), "cell") + (one ? " is" : " are") +
+           " missing because the content is not what the cell's type says: " +
+           cells.text(kColumnsInNotes) + "; to keep it, correct " + (one ? "it" : "them") +
+           " in the workbook";
 }
 
 std::string Losses::textsNote() const {

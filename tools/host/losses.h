@@ -26,9 +26,10 @@ class Losses {
     void noteShown(IDataProvider& provider, const std::string& place, const Column& column);
 
     const Lost& lost() const { return lost_; }
-    // One line about lost cells, another about cut texts: how many, where, and which options keep
-    // them; empty when there are none.
+    // One line about lost cells, one about unreadable cells, another about cut texts: how many,
+    // where, and what keeps them; empty when there are none.
     std::string cellsNote() const;
+    std::string unreadableNote() const;
     std::string textsNote() const;
 
   private:

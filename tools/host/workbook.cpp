@@ -165,7 +165,8 @@ void Workbook::noteShown(const LoadedWorksheet& worksheet) {
 std::vector<std::string> Workbook::notes() const {
     std::vector<std::string> notes;
     for (const std::string& note : plan_.notes) notes.push_back(options_.book + ": " + note);
-    for (const std::string& note : {losses_.cellsNote(), losses_.textsNote()}) {
+    for (const std::string& note :
+         {losses_.cellsNote(), losses_.unreadableNote(), losses_.textsNote()}) {
         if (!note.empty()) notes.push_back(note);
     }
     return notes;
