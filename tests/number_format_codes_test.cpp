@@ -228,7 +228,7 @@ TEST(NumberFormatCodes, ElapsedTimes) {
                  {"[h] AM/PM", 0.75, "18 PM"},
                  // Less than half a millisecond below the hour is the hour.
                  {"[h]:mm:ss", 36 / 24.0 - 4e-9, "36:00:00"},
-                 {"[h]'a[mm]\x01\"b\"s", 1.0625, "25'a1530b0"},
+                 {"\x01[h]'a[mm]\"b\"s", 1.0625, "25'a1530b0"},
                  {"[h]", kNaN, "nan"}};
     for (const auto& c : cases) EXPECT_EQ(shown(c.code, c.value), c.expected) << c.code << ' ' << c.value;
     // However many fields a format has, it keeps one formatter of ICU.

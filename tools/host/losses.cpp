@@ -57,8 +57,8 @@ size_t lostBesideNumbers(IDataProvider& provider, const Column& column, const Op
 
 // How many of the lost cells have no text either: by the standard, content that is not what the
 // cell's type says is missing in every kind of column.
-size_t unreadableCells(IDataProvider& provider, const Column& column, const Options& options,
-                       size_t lost) {
+size_t countWithoutTexts(IDataProvider& provider, const Column& column, const Options& options,
+                         size_t lost) {
     if (lost == 0 || column.kind() == Kind::Text) return 0;
     const std::optional<Column> texts = loadedAsTexts(provider, column, options.settings.preview);
     return texts ? lost - std::min(lost, lostRows(column, *texts, {})) : 0;
@@ -116,7 +116,7 @@ void Losses::noteCells(IDataProvider& provider, const std::string& place, const 
         count = lostBesideNumbers(provider, column, options_);
     }
     const size_t unreadable =
-        options_.standard ? unreadableCells(provider, column, options_, count) : 0;
+        options_.standard ? countWithoutTexts(provider, column, options_, count) : 0;
     if (unreadable > 0) lost_.unreadable.add({place, column.name(), unreadable});
     if (count > unreadable) lost_.cells.add({place, column.name(), count - unreadable});
 }
