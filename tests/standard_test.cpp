@@ -218,7 +218,7 @@ TEST_F(Standard, ManyDifferentNumberFormats) {
     styles += "<xf numFmtId='1000'/><xf numFmtId='14'/>";
     std::string cells;
     for (std::size_t style = dp::kNumberFormats - 1; style < dp::kNumberFormats + 3; ++style)
-        cells += "<c s='" + std::to_string(style) + "'><v>1</v></c>";
+        cells.append("<c s='").append(std::to_string(style)).append("'><v>1</v></c>");
     const auto package = PackageBuilder::of({"<row>" + cells + "</row>"})
                              .set("xl/styles.xml", "<styleSheet><numFmts>" + codes + "</numFmts><cellXfs>" + styles +
                                                        "</cellXfs></styleSheet>");
