@@ -212,7 +212,8 @@ TEST_F(Standard, ManyDifferentNumberFormats) {
     std::string styles;
     for (std::size_t i = 0; i <= dp::kNumberFormats; ++i) {
         const std::string id = std::to_string(1000 + i);
-        codes += "<numFmt numFmtId='" + id + "' formatCode='y&quot;" + id + "&quot;'/>";
+        codes += "<numFmt numFmtId='" + id + "'";
+        codes += " formatCode='y&quot;" + id + "&quot;'/>";
         styles += "<xf numFmtId='" + id + "'/>";
     }
     styles += "<xf numFmtId='1000'/><xf numFmtId='14'/>";
