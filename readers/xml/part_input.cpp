@@ -17,6 +17,7 @@
 #include "dpxlsx/readers/xml/markup_marks.h"
 #include "dpxlsx/readers/xml/part_text.h"
 #include "dpxlsx/readers/xml/progress.h"
+#include "dpxlsx/readers/xml/silence.h"
 
 namespace dp {
 
@@ -174,6 +175,9 @@ xmlTextReaderPtr openDocument(const std::string& path) {
         xmlReaderForIO(readPart, closePart, input.release(), nullptr, nullptr, options);
     if (!reader) return nullptr;
     watching->watch(reader);
+    // Between the reads, which silence libxml2 themselves, calls for names report a lack of memory
+    // (2.15).
+    xmlTextReaderSetStructuredErrorHandler(reader, SilentLibxml2::ignore, nullptr);
     return reader;
 }
 
