@@ -28,7 +28,7 @@ if(DPXLSX_TOOL)
     set_target_properties(dpxlsx_tool PROPERTIES INSTALL_RPATH "$ORIGIN/${tool_to_library}")
     install(TARGETS dpxlsx_tool RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
     install(FILES docs/dpxlsx.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
-    install(FILES docs/tool.md docs/tool.schema.json DESTINATION ${docs_dir})
+    install(FILES docs/tool.md docs/tool.schema.json docs/many-workbooks.md DESTINATION ${docs_dir})
     install(FILES tools/completions/dpxlsx.bash RENAME dpxlsx
         DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions)
     install(FILES tools/completions/_dpxlsx DESTINATION ${CMAKE_INSTALL_DATADIR}/zsh/site-functions)
